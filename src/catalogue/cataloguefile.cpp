@@ -1,0 +1,162 @@
+#include "catalogue/cataloguefile.h"
+
+#include "platform/ado/recordset.h"
+#include "platform/ado/sqlfunctions.h"
+#include "platform/text/collation.h"
+#include "shell/services/messages.h"
+
+#include <QFile>
+#include <QFileInfo>
+#include <QtEndian>
+#include <sqlite3.h>
+
+namespace cataloguefile
+{
+
+namespace
+{
+
+// Text columns carry the collation, so that each comparison and each index of theirs goes by it.
+// CD_Type is one of two letters and is compared without. Indexes stand on every column that
+// statements search or join by.
+constexpr char schema[] = R"sql(
+create table Artiesten(ID integer primary key, Naam text collate SONGCASE);
+create table Tracks(ID integer primary key, Artiest_ID integer, Titel text collate SONGCASE,
+                    Genre text collate SONGCASE, Hitjaar integer);
+create table CDTitels(ID integer primary key, Titel text collate SONGCASE, Artiest_ID integer,
+                      CD_Type text collate NOCASE, Genre text collate SONGCASE, Hitjaar integer);
+create table CompactDiscs(ID integer primary key, CDTitels_ID integer, DiskNo integer,
+                          TrackNo integer, Track_ID integer, Opmerking text collate SONGCASE);
+create table MP3Collections(ID integer primary key, Map text collate SONGCASE,
+                            Album text collate SONGCASE);
+create table MP3Files(ID integer primary key, Volgnummer integer, FileName text collate SONGCASE,
+                      CollectionId integer);
+create index ArtiestenNaam on Artiesten(Naam);
+create index TracksArtiest on Tracks(Artiest_ID, Titel);
+create index CDTitelsArtiest on CDTitels(Artiest_ID);
+create index CDTitelsTitel on CDTitels(Titel);
+create index CompactDiscsTitel on CompactDiscs(CDTitels_ID, DiskNo, TrackNo);
+create index CompactDiscsTrack on CompactDiscs(Track_ID);
+create index MP3FilesCollection on MP3Files(CollectionId, Volgnummer);
+)sql";
+
+constexpr const char *tables[] = {"Artiesten",    "Tracks",         "CDTitels",
+                                  "CompactDiscs", "MP3Collections", "MP3Files"};
+
+// A catalogue of this size is checked through in a few milliseconds, so each start does it.
+constexpr qint64 quicklyChecked = 8 << 20;
+
+constexpr qsizetype headerSize = 100;
+constexpr qsizetype versionOffset = 60, applicationOffset = 68;
+
+int currentVersion()
+{
+    return formatVersion << 24 | int(text::Collation::root().version() & 0xFFFFFF);
+}
+
+QByteArray pragma(const char *name, int value)
+{
+    return QByteArray("PRAGMA ") + name + '=' + QByteArray::number(value);
+}
+
+[[noreturn]] void refuse(ADODB::ErrorNumber number, const char *key)
+{
+    throw ADODB::Error(number, QStringLiteral("Songcase"), GetMessage(key));
+}
+
+bool mayBeWritten(const QFileInfo &file)
+{
+    // The rights are looked at as well: for some users the system ignores them.
+    constexpr auto anyWrite =
+        QFile::WriteOwner | QFile::WriteUser | QFile::WriteGroup | QFile::WriteOther;
+    const QFileInfo folder(file.absolutePath());
+    return file.isWritable() && (file.permissions() & anyWrite) && folder.isWritable() &&
+           (folder.permissions() & anyWrite);
+}
+
+} // namespace
+
+void create(const QString &file)
+{
+    sqlite3 *db = nullptr;
+    int code = SQLITE_CANTOPEN;
+    if (!QFile::exists(file))
+        code = sqlite3_open(file.toUtf8().constData(), &db);
+    if (code == SQLITE_OK)
+        code = ADODB::registerFunctions(db);
+    const auto run = [&](const char *sql) {
+        if (code == SQLITE_OK)
+            code = sqlite3_exec(db, sql, nullptr, nullptr, nullptr);
+    };
+    run(pragma("application_id", applicationId).constData());
+    run(pragma("user_version", currentVersion()).constData());
+    run("begin");
+    run(schema);
+    run("commit");
+    sqlite3_close(db);
+    if (code != SQLITE_OK)
+        throw ADODB::engineError(code, file);
+}
+
+void inspect(const QString &name)
+{
+    const QFileInfo info(name);
+    QFile file(name);
+    if (info.isDir() || !file.open(QIODevice::ReadOnly))
+        refuse(ADODB::errCannotUse, "xNotACatalogue");
+    const QByteArray header = file.read(headerSize);
+    const bool database = header.size() == headerSize && header.startsWith("SQLite format 3");
+    if (!database ||
+        qFromBigEndian<qint32>(header.constData() + applicationOffset) != applicationId)
+        refuse(ADODB::errCannotUse, "xNotACatalogue");
+    if (qFromBigEndian<quint32>(header.constData() + versionOffset) >> 24 > quint32(formatVersion))
+        refuse(ADODB::errCannotUse, "xNewerCatalogue");
+    if (!mayBeWritten(info))
+        refuse(ADODB::errReadOnly, "xReadOnly");
+}
+
+namespace
+{
+
+void requireTables(ADODB::Connection &connection)
+{
+    ADODB::Recordset names;
+    names.Open(QStringLiteral("select name as Name from sqlite_schema where type='table'"),
+               connection);
+    QStringList found;
+    for (; !names.isEOF(); names.MoveNext())
+        found.append(names.Fields(0).Value().toText().toLower());
+    for (const char *table : tables) {
+        if (!found.contains(QLatin1String(table).toString().toLower()))
+            refuse(ADODB::errCannotUse, "xTablesMissing");
+    }
+}
+
+void keepSortOrder(ADODB::Connection &connection)
+{
+    if (connection.housekeeping("PRAGMA user_version").toInt() == currentVersion())
+        return;
+    ADODB::Transaction transaction(connection);
+    connection.housekeeping("REINDEX SONGCASE");
+    connection.housekeeping(pragma("user_version", currentVersion()).constData());
+    transaction.CommitTrans();
+}
+
+} // namespace
+
+void verify(ADODB::Connection &connection, bool thorough)
+{
+    // Fails here and not at the first change if another program holds the file.
+    {
+        ADODB::Transaction probe(connection);
+        probe.RollbackTrans();
+    }
+    requireTables(connection);
+    const QFileInfo file(ADODB::Connection::dataSource(connection.ConnectionString));
+    const bool check = thorough || file.size() <= quicklyChecked;
+    if (check && connection.housekeeping("PRAGMA quick_check(1)") != QLatin1String("ok"))
+        refuse(ADODB::errCannotUse, "xDamaged");
+    keepSortOrder(connection);
+}
+
+} // namespace cataloguefile

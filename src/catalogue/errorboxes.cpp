@@ -1,0 +1,15 @@
+#include "catalogue/errorboxes.h"
+
+#include "platform/ado/connection.h"
+#include "platform/desktop/desktop.h"
+#include "shell/services/globals.h"
+
+void showDatabaseErrors(const ADODB::Error &error, const QString &title)
+{
+    errorBox(error.numbered(), title);
+    if (!gConnection)
+        return;
+    const auto entries = gConnection->Errors;
+    for (const ADODB::Error &entry : entries)
+        errorBox(entry.numbered());
+}

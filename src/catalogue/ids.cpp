@@ -1,0 +1,12 @@
+#include "catalogue/ids.h"
+
+#include "platform/ado/recordset.h"
+#include "shell/services/globals.h"
+
+qint64 nextId(const QString &statement, QLatin1String field)
+{
+    ADODB::Recordset answer;
+    answer.Open(statement, *gConnection);
+    const ADODB::Value id = answer.Fields(QString(field)).Value();
+    return id.isNull() ? 1 : id.toLong();
+}

@@ -1,0 +1,350 @@
+#include "platform/ado/connection.h"
+
+#include "platform/ado/dialect.h"
+#include "platform/ado/recordset.h"
+#include "platform/ado/sqlfunctions.h"
+
+#include <QStringList>
+#include <algorithm>
+#include <sqlite3.h>
+#include <unordered_map>
+
+namespace ADODB
+{
+
+namespace
+{
+
+constexpr std::size_t preparedAtMost = 200;
+
+struct Finalize {
+    void operator()(sqlite3_stmt *s) const { sqlite3_finalize(s); }
+};
+
+struct Prepared {
+    std::unique_ptr<sqlite3_stmt, Finalize> statement;
+    std::shared_ptr<const FieldList> fields;
+    bool readOnly = false;
+};
+
+// A statement goes back to its start on every way out, so that it holds no lock and no value.
+class Running
+{
+public:
+    explicit Running(sqlite3_stmt *s) : mStatement(s) {}
+    ~Running()
+    {
+        sqlite3_reset(mStatement);
+        sqlite3_clear_bindings(mStatement);
+    }
+
+private:
+    sqlite3_stmt *mStatement;
+};
+
+std::shared_ptr<const FieldList> fieldsOf(sqlite3_stmt *s)
+{
+    auto fields = std::make_shared<FieldList>();
+    for (int i = 0; i < sqlite3_column_count(s); ++i)
+        fields->push_back({QString::fromUtf8(sqlite3_column_name(s, i)), adVarWChar, 0});
+    return fields;
+}
+
+int bind(sqlite3_stmt *s, const Dialect &dialect)
+{
+    int code = SQLITE_OK, place = 0;
+    for (const auto &l : dialect.literals()) {
+        ++place;
+        const auto text = dialect.text(l);
+        if (l.kind == Dialect::Literal::Text)
+            code =
+                sqlite3_bind_text64(s, place, text.data(), text.size(), SQLITE_STATIC, SQLITE_UTF8);
+        else if (l.kind == Dialect::Literal::Integer)
+            code = sqlite3_bind_int64(s, place, l.integer);
+        else
+            code = sqlite3_bind_double(s, place, l.real);
+        if (code != SQLITE_OK)
+            break;
+    }
+    return code;
+}
+
+void readRow(sqlite3_stmt *s, Rows &rows)
+{
+    const auto row = rows.addRow();
+    for (int i = 0; i < rows.columnCount(); ++i) {
+        switch (sqlite3_column_type(s, i)) {
+        case SQLITE_INTEGER:
+            rows.setInteger(row, i, sqlite3_column_int64(s, i));
+            break;
+        case SQLITE_FLOAT:
+            rows.setReal(row, i, sqlite3_column_double(s, i));
+            break;
+        case SQLITE_NULL:
+            break;
+        default: {
+            const auto *bytes = reinterpret_cast<const char *>(sqlite3_column_text(s, i));
+            rows.setUtf8(row, i, {bytes ? bytes : "", std::size_t(sqlite3_column_bytes(s, i))});
+        }
+        }
+    }
+}
+
+} // namespace
+
+struct Connection::Engine {
+    sqlite3 *db = nullptr;
+    Dialect dialect;
+    std::unordered_map<std::string, Prepared> prepared;
+
+    // The transaction: who has it, and whether its routine has ended without closing it.
+    std::vector<Transaction *> routines;
+    bool transactionOpen = false;
+
+    ~Engine()
+    {
+        prepared.clear();
+        sqlite3_close(db);
+    }
+
+    bool abandoned() const { return transactionOpen && routines.empty(); }
+    int exec(const char *sql) const { return sqlite3_exec(db, sql, nullptr, nullptr, nullptr); }
+    Prepared &prepare(const std::string &sql, int &code);
+};
+
+Prepared &Connection::Engine::prepare(const std::string &sql, int &code)
+{
+    code = SQLITE_OK;
+    if (const auto it = prepared.find(sql); it != prepared.end())
+        return it->second;
+    if (prepared.size() >= preparedAtMost)
+        prepared.clear();
+    sqlite3_stmt *s = nullptr;
+    code =
+        sqlite3_prepare_v3(db, sql.data(), int(sql.size()), SQLITE_PREPARE_PERSISTENT, &s, nullptr);
+    if (code != SQLITE_OK) {
+        static Prepared none;
+        return none;
+    }
+    Prepared p;
+    p.statement.reset(s);
+    p.fields = fieldsOf(s);
+    p.readOnly = sqlite3_stmt_readonly(s);
+    return prepared.emplace(sql, std::move(p)).first->second;
+}
+
+Connection::Connection() = default;
+Connection::~Connection() = default;
+
+QString Connection::dataSource(const QString &connectionString)
+{
+    const QString key = QStringLiteral("Data Source=");
+    const auto from = connectionString.indexOf(key, 0, Qt::CaseInsensitive);
+    if (from < 0)
+        return {};
+    // A file name may hold semicolons; the one that ends the entry has a blank or nothing behind
+    // it.
+    QString file = connectionString.sliced(from + key.size());
+    if (const auto end = file.lastIndexOf(QLatin1String("; ")); end >= 0)
+        file.truncate(end);
+    else if (file.endsWith(QLatin1Char(';')))
+        file.chop(1);
+    return file;
+}
+
+void Connection::fail(int code)
+{
+    const QString message = QString::fromUtf8(sqlite3_errmsg(mEngine->db));
+    const Error error = engineError(code, message);
+    Errors.assign(1, error);
+    throw error;
+}
+
+void Connection::check(int code)
+{
+    if (code != SQLITE_OK && code != SQLITE_DONE && code != SQLITE_ROW)
+        fail(code);
+}
+
+void Connection::requireOpen() const
+{
+    if (!mEngine)
+        throw makeError(errObjectClosed);
+}
+
+ObjectStateEnum Connection::State() const
+{
+    return mEngine ? adStateOpen : adStateClosed;
+}
+
+void Connection::Open(const QString &, const QString &, const QString &connectionString, int)
+{
+    if (mEngine)
+        throw makeError(errNotPermitted);
+    if (!connectionString.isEmpty())
+        ConnectionString = connectionString;
+    mEngine = std::make_unique<Engine>();
+    try {
+        const QByteArray file = dataSource(ConnectionString).toUtf8();
+        const int access = Mode == adModeRead ? SQLITE_OPEN_READONLY : SQLITE_OPEN_READWRITE;
+        check(sqlite3_open_v2(file.constData(), &mEngine->db, access | SQLITE_OPEN_EXRESCODE,
+                              nullptr));
+        // Another program's short lock is waited for; a longer wait would freeze the screen.
+        sqlite3_busy_timeout(mEngine->db, std::min(ConnectionTimeout, 1) * 1000);
+        sqlite3_db_config(mEngine->db, SQLITE_DBCONFIG_DEFENSIVE, 1, nullptr);
+        sqlite3_db_config(mEngine->db, SQLITE_DBCONFIG_TRUSTED_SCHEMA, 0, nullptr);
+        sqlite3_db_config(mEngine->db, SQLITE_DBCONFIG_DQS_DML, 0, nullptr);
+        check(registerFunctions(mEngine->db));
+        check(mEngine->exec("PRAGMA synchronous=FULL; PRAGMA temp_store=MEMORY; "
+                            "PRAGMA cache_size=-16000; PRAGMA cell_size_check=ON;"));
+    } catch (const Error &) {
+        mEngine.reset();
+        throw;
+    }
+}
+
+void Connection::Close()
+{
+    requireOpen();
+    for (Transaction *routine : mEngine->routines)
+        routine->mRunning = false;
+    mEngine.reset();
+}
+
+Recordset Connection::Execute(const QString &statement, int)
+{
+    Recordset answer;
+    auto rows = run(statement);
+    if (rows->columnCount() > 0)
+        answer.adopt(std::move(rows));
+    return answer;
+}
+
+std::shared_ptr<const Rows> Connection::run(const QString &statement)
+{
+    requireOpen();
+    try {
+        mEngine->dialect.translate(statement);
+    } catch (const Error &error) {
+        Errors.assign(1, error);
+        throw;
+    }
+    int code = SQLITE_OK;
+    Prepared &prepared = mEngine->prepare(mEngine->dialect.sql(), code);
+    check(code);
+    settleBefore(prepared.readOnly);
+    sqlite3_stmt *s = prepared.statement.get();
+    const Running running(s);
+    check(bind(s, mEngine->dialect));
+    auto rows = std::make_shared<Rows>(prepared.fields);
+    while ((code = sqlite3_step(s)) == SQLITE_ROW)
+        readRow(s, *rows);
+    check(code);
+    return rows;
+}
+
+// An open transaction whose routine has gone is rolled back before anything new is written, so that
+// nothing new goes down with it. One that the engine took back by itself must not be written on in.
+void Connection::settleBefore(bool readOnly)
+{
+    if (readOnly || !mEngine->transactionOpen)
+        return;
+    if (mEngine->abandoned())
+        RollbackTrans();
+    else if (sqlite3_get_autocommit(mEngine->db))
+        throw makeError(errNotPermitted);
+}
+
+QString Connection::housekeeping(const char *command)
+{
+    requireOpen();
+    QString first;
+    const auto take = [](void *to, int columns, char **values, char **) {
+        auto *text = static_cast<QString *>(to);
+        if (columns > 0 && text->isNull())
+            *text = QString::fromUtf8(values[0] ? values[0] : "");
+        return 0;
+    };
+    check(sqlite3_exec(mEngine->db, command, take, &first, nullptr));
+    return first;
+}
+
+void Connection::begin(Transaction *owner)
+{
+    requireOpen();
+    if (mEngine->abandoned())
+        RollbackTrans();
+    owner->mJoined = mEngine->transactionOpen;
+    check(mEngine->exec(owner->mJoined ? "SAVEPOINT joined" : "BEGIN IMMEDIATE"));
+    mEngine->transactionOpen = true;
+    mEngine->routines.push_back(owner);
+    owner->mRunning = true;
+}
+
+void Connection::finish(Transaction *owner, bool commit)
+{
+    requireOpen();
+    const bool stillOpen = !sqlite3_get_autocommit(mEngine->db);
+    if (!stillOpen && commit)
+        throw makeError(errNotPermitted);
+    if (stillOpen) {
+        if (owner->mJoined)
+            check(mEngine->exec(commit ? "RELEASE joined" : "ROLLBACK TO joined; RELEASE joined"));
+        else
+            check(mEngine->exec(commit ? "COMMIT" : "ROLLBACK"));
+    }
+    std::erase(mEngine->routines, owner);
+    owner->mRunning = false;
+    mEngine->transactionOpen = owner->mJoined && stillOpen;
+}
+
+void Connection::leave(Transaction *owner)
+{
+    if (owner->mJoined) {
+        finish(owner, false);
+        return;
+    }
+    std::erase(mEngine->routines, owner);
+    owner->mRunning = false;
+}
+
+void Connection::RollbackTrans()
+{
+    requireOpen();
+    if (!mEngine->routines.empty())
+        return;
+    if (!sqlite3_get_autocommit(mEngine->db))
+        check(mEngine->exec("ROLLBACK"));
+    mEngine->transactionOpen = false;
+}
+
+Transaction::Transaction(Connection &connection) : mConnection(connection)
+{
+    connection.begin(this);
+}
+
+Transaction::~Transaction()
+{
+    if (!mRunning)
+        return;
+    try {
+        mConnection.leave(this);
+    } catch (const Error &) {
+        mRunning = false; // the engine has taken it back already
+    }
+}
+
+void Transaction::CommitTrans()
+{
+    if (!mRunning)
+        throw makeError(errNotPermitted);
+    mConnection.finish(this, true);
+}
+
+void Transaction::RollbackTrans()
+{
+    if (mRunning)
+        mConnection.finish(this, false);
+}
+
+} // namespace ADODB

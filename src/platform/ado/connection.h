@@ -1,0 +1,106 @@
+#pragma once
+
+#include "platform/ado/error.h"
+
+#include <QString>
+#include <memory>
+#include <vector>
+
+namespace ADODB
+{
+
+class Recordset;
+class Rows;
+
+enum CursorLocationEnum { adUseServer = 2, adUseClient = 3 };
+enum IsolationLevelEnum { adXactChaos = 16, adXactReadCommitted = 4096 };
+enum ConnectModeEnum { adModeRead = 1, adModeReadWrite = 3 };
+enum CursorTypeEnum { adOpenForwardOnly = 0, adOpenStatic = 3 };
+enum LockTypeEnum { adLockReadOnly = 1, adLockOptimistic = 3 };
+enum ObjectStateEnum { adStateClosed = 0, adStateOpen = 1 };
+inline constexpr int adConnectUnspecified = -1;
+inline constexpr int adOptionUnspecified = -1;
+
+/// The one connection to a catalogue: an SQLite file behind the attributes and operations that the
+/// screens use. All failures are thrown as Error; those of the engine stand in Errors as well.
+///
+/// A transaction belongs to the routine that began it, see Transaction. What comes in while that
+/// routine still runs joins it.
+class Connection
+{
+public:
+    Connection();
+    ~Connection();
+    Connection(const Connection &) = delete;
+    Connection &operator=(const Connection &) = delete;
+
+    // Attributes, to be set before Open().
+    QString ConnectionString; // "...;Data Source=<file>; "
+    int CommandTimeout = 30;  // seconds
+    int ConnectionTimeout = 15;
+    CursorLocationEnum CursorLocation = adUseServer;
+    IsolationLevelEnum IsolationLevel = adXactReadCommitted;
+    ConnectModeEnum Mode = adModeRead;
+
+    /// The last failure of the engine, none before the first.
+    std::vector<Error> Errors;
+
+    void Open(const QString &user = {}, const QString &password = {},
+              const QString &connectionString = {}, int options = adConnectUnspecified);
+    void Close(); // rolls back what is open
+    ObjectStateEnum State() const;
+
+    /// Runs a statement and gives its rows, all of them read; of a change a closed recordset.
+    Recordset Execute(const QString &statement, int options = adOptionUnspecified);
+
+    /// For the handler of a failed routine: closes the transaction that it has left open. With none
+    /// open nothing happens, and a transaction of a routine that still runs is not touched.
+    void RollbackTrans();
+
+    /// The file named by a connection string, empty if none is.
+    static QString dataSource(const QString &connectionString);
+
+    /// Commands of the program's own housekeeping (PRAGMA, REINDEX), never of a screen: taken
+    /// as they stand. Gives the first value of the first row as text.
+    QString housekeeping(const char *command);
+
+private:
+    friend class Recordset;
+    friend class Transaction;
+    struct Engine;
+
+    std::shared_ptr<const Rows> run(const QString &statement);
+    [[noreturn]] void fail(int code);
+    void check(int code);
+    void requireOpen() const;
+    void settleBefore(bool readOnly);
+    void begin(class Transaction *owner);
+    void finish(class Transaction *owner, bool commit);
+    void leave(class Transaction *owner);
+
+    std::unique_ptr<Engine> mEngine;
+};
+
+/// The share of a routine in a transaction of its connection: made where the routine begins one,
+/// gone when the routine ends. One that began while another routine's is running joins it, and
+/// takes back its own changes alone. A routine that ends without CommitTrans or RollbackTrans
+/// leaves its transaction open; the next one to begin, or to write, rolls it back first.
+class Transaction
+{
+public:
+    explicit Transaction(Connection &connection); // BeginTrans
+    ~Transaction();
+    Transaction(const Transaction &) = delete;
+    Transaction &operator=(const Transaction &) = delete;
+
+    void CommitTrans();
+    void RollbackTrans();
+
+private:
+    friend class Connection;
+    Connection &mConnection;
+    bool mRunning = false;
+    bool mJoined = false;
+};
+
+} // namespace ADODB

@@ -1,0 +1,160 @@
+#include "platform/ado/rows.h"
+
+#include <cstring>
+
+namespace ADODB
+{
+
+namespace
+{
+
+// A cell: its kind in the low two bits; above them a whole number, or the place of the bytes in the
+// heap (chunk above, offset below). What does not fit 62 bits goes to the heap as eight bytes.
+constexpr int kindBits = 2;
+constexpr int offsetBits = 28;
+constexpr std::size_t chunkSize = std::size_t(1) << 20;
+constexpr std::size_t firstChunkSize = 256;
+constexpr qint64 smallest = -(qint64(1) << 61), largest = (qint64(1) << 61) - 1;
+
+} // namespace
+
+Rows::Rows(std::shared_ptr<const FieldList> fields)
+    : mFields(std::move(fields)), mColumns(int(mFields->size()))
+{
+}
+
+Rows::Kind Rows::kind(qsizetype row, int column) const
+{
+    const Cell c = cell(row, column);
+    const auto kind = Kind(c & 3);
+    return kind == Kind::Real && (c >> 63) ? Kind::Integer : kind;
+}
+
+qint64 Rows::integer(qsizetype row, int column) const
+{
+    const Cell c = cell(row, column);
+    if (Kind(c & 3) == Kind::Integer)
+        return qint64(c) >> kindBits;
+    qint64 v;
+    std::memcpy(&v, stored(c), sizeof v);
+    return v;
+}
+
+std::string_view Rows::utf8(qsizetype row, int column) const
+{
+    const char *p = stored(cell(row, column));
+    std::uint32_t size;
+    std::memcpy(&size, p, sizeof size);
+    return {p + sizeof size, size};
+}
+
+Value Rows::value(qsizetype row, int column) const
+{
+    switch (kind(row, column)) {
+    case Kind::Null:
+        return {};
+    case Kind::Integer:
+        return integer(row, column);
+    case Kind::Text:
+        return text(row, column);
+    case Kind::Real:
+        break;
+    }
+    double v;
+    std::memcpy(&v, stored(cell(row, column)), sizeof v);
+    return v;
+}
+
+QString Rows::text(qsizetype row, int column) const
+{
+    if (kind(row, column) != Kind::Text)
+        return value(row, column).toText();
+    const auto bytes = utf8(row, column);
+    return QString::fromUtf8(bytes.data(), qsizetype(bytes.size()));
+}
+
+qsizetype Rows::addRow()
+{
+    mCells.resize(mCells.size() + std::size_t(mColumns), Cell(Kind::Null));
+    return rowCount() - 1;
+}
+
+void Rows::removeRow(qsizetype row)
+{
+    const auto from = mCells.begin() + row * mColumns;
+    mCells.erase(from, from + mColumns);
+}
+
+std::shared_ptr<Rows> Rows::clone() const
+{
+    auto copy = std::make_shared<Rows>(*this);
+    copy->mOwnsChunk = false;
+    return copy;
+}
+
+void Rows::setNull(qsizetype row, int column)
+{
+    cell(row, column) = Cell(Kind::Null);
+}
+
+void Rows::setInteger(qsizetype row, int column, qint64 v)
+{
+    if (v >= smallest && v <= largest)
+        cell(row, column) = Cell(v) << kindBits | Cell(Kind::Integer);
+    else
+        cell(row, column) = store(&v, sizeof v, Kind::Real) | Cell(1) << 63;
+}
+
+void Rows::setReal(qsizetype row, int column, double v)
+{
+    cell(row, column) = store(&v, sizeof v, Kind::Real);
+}
+
+void Rows::setUtf8(qsizetype row, int column, std::string_view v)
+{
+    cell(row, column) = store(v.data(), v.size(), Kind::Text);
+}
+
+void Rows::setValue(qsizetype row, int column, const Value &v)
+{
+    if (const auto *whole = std::get_if<qint64>(&v.variant())) {
+        setInteger(row, column, *whole);
+    } else if (const auto *fraction = std::get_if<double>(&v.variant())) {
+        setReal(row, column, *fraction);
+    } else if (const auto *words = std::get_if<QString>(&v.variant())) {
+        const QByteArray bytes = words->toUtf8();
+        setUtf8(row, column, {bytes.constData(), std::size_t(bytes.size())});
+    } else {
+        setNull(row, column);
+    }
+}
+
+Rows::Cell Rows::store(const void *bytes, std::size_t size, Kind kind)
+{
+    const std::size_t head = kind == Kind::Text ? sizeof(std::uint32_t) : 0;
+    const std::size_t need = head + size;
+    if (!mOwnsChunk || mChunkUsed + need > mChunkSize) {
+        mChunkSize = std::max(need, mChunks.empty() ? firstChunkSize : chunkSize);
+        mChunks.emplace_back(new char[mChunkSize]);
+        mChunkUsed = 0;
+        mOwnsChunk = true;
+    }
+    char *to = mChunks.back().get() + mChunkUsed;
+    if (head) {
+        const auto length = std::uint32_t(size);
+        std::memcpy(to, &length, head);
+    }
+    if (size)
+        std::memcpy(to + head, bytes, size);
+    const Cell place = Cell(mChunks.size() - 1) << offsetBits | mChunkUsed;
+    mChunkUsed += need;
+    return place << kindBits | Cell(kind);
+}
+
+const char *Rows::stored(Cell c) const
+{
+    const Cell place = (c & ~(Cell(1) << 63)) >> kindBits;
+    return mChunks[place >> offsetBits].get() + (place & ((Cell(1) << offsetBits) - 1));
+}
+
+} // namespace ADODB

@@ -1,0 +1,73 @@
+#pragma once
+
+#include "platform/ado/value.h"
+
+#include <cstdint>
+#include <memory>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace ADODB
+{
+
+enum DataTypeEnum { adInteger = 3, adDouble = 5, adBigInt = 20, adVarWChar = 202 };
+
+/// Name and declared type of a column; size in characters, 0 where it does not matter.
+struct FieldInfo {
+    QString name;
+    DataTypeEnum type = adVarWChar;
+    int size = 0;
+};
+using FieldList = std::vector<FieldInfo>;
+
+/// The rows behind a recordset or a list: eight bytes a cell, and each text once in a heap of
+/// UTF-8. A million rows take tens of megabytes and no object each. Rows are shared as
+/// shared_ptr<const Rows>; who wants to change shared ones clones them first.
+class Rows
+{
+public:
+    explicit Rows(std::shared_ptr<const FieldList> fields);
+
+    const FieldList &fields() const { return *mFields; }
+    int columnCount() const { return mColumns; }
+    qsizetype rowCount() const { return mColumns ? qsizetype(mCells.size()) / mColumns : 0; }
+
+    enum class Kind { Null, Integer, Text, Real };
+    Kind kind(qsizetype row, int column) const;
+    qint64 integer(qsizetype row, int column) const;        // of a cell of kind Integer
+    std::string_view utf8(qsizetype row, int column) const; // of a cell of kind Text
+    Value value(qsizetype row, int column) const;
+
+    /// The cell as text, NULL as the empty text.
+    QString text(qsizetype row, int column) const;
+
+    /// Appends a row of NULLs and gives its number.
+    qsizetype addRow();
+    void removeRow(qsizetype row);
+    void setNull(qsizetype row, int column);
+    void setInteger(qsizetype row, int column, qint64 v);
+    void setReal(qsizetype row, int column, double v);
+    void setUtf8(qsizetype row, int column, std::string_view v);
+    void setValue(qsizetype row, int column, const Value &v);
+
+    std::shared_ptr<Rows> clone() const;
+
+private:
+    using Cell = std::uint64_t;
+    const Cell &cell(qsizetype row, int column) const { return mCells[row * mColumns + column]; }
+    Cell &cell(qsizetype row, int column) { return mCells[row * mColumns + column]; }
+    Cell store(const void *bytes, std::size_t size, Kind kind);
+    const char *stored(Cell c) const;
+
+    std::shared_ptr<const FieldList> mFields;
+    int mColumns;
+    std::vector<Cell> mCells;
+
+    // Full chunks are shared between clones; each one writes to chunks of its own.
+    std::vector<std::shared_ptr<char[]>> mChunks;
+    std::size_t mChunkUsed = 0, mChunkSize = 0;
+    bool mOwnsChunk = false;
+};
+
+} // namespace ADODB

@@ -1,0 +1,150 @@
+#include "platform/desktop/form.h"
+
+#include "platform/desktop/desktop.h"
+
+#include <QApplication>
+#include <QCloseEvent>
+#include <QKeyEvent>
+#include <QPushButton>
+
+namespace
+{
+
+QList<Form *> gOpenForms;
+Form::Host *gHost = nullptr;
+
+} // namespace
+
+/// Tells forms when they become the active one, however that came about: by window, by MDI child or
+/// by the focus alone (there may be no window manager).
+class FormActivation : public QObject
+{
+public:
+    static void watch() { static FormActivation watcher; }
+
+private:
+    FormActivation()
+    {
+        connect(qApp, &QApplication::focusChanged, this, [this](QWidget *, QWidget *now) {
+            Form *form = formOf(now);
+            if (!form || form == mActive)
+                return;
+            mActive = form;
+            form->Form_Activate();
+            emit form->activated();
+        });
+    }
+
+    static Form *formOf(QWidget *widget)
+    {
+        while (widget && !qobject_cast<Form *>(widget))
+            widget = widget->parentWidget();
+        return static_cast<Form *>(widget);
+    }
+
+    QPointer<Form> mActive;
+};
+
+Form::Form(const QString &name)
+{
+    setObjectName(name);
+    gOpenForms.append(this);
+    FormActivation::watch();
+}
+
+Form::~Form()
+{
+    gOpenForms.removeOne(this);
+}
+
+const QList<Form *> &Form::openForms()
+{
+    return gOpenForms;
+}
+
+void Form::setHost(Host *host)
+{
+    gHost = host;
+}
+
+void Form::Load()
+{
+    if (mLoaded)
+        return;
+    mLoaded = true;
+    Form_Load();
+}
+
+void Form::Show()
+{
+    const bool first = !isVisible();
+    Load();
+    if (gHost && first)
+        gHost->adopt(this);
+    else if (gHost)
+        gHost->bringUp(this);
+    else
+        show();
+}
+
+void Form::ShowModal()
+{
+    Load();
+    Desktop::current().showModal(*this);
+}
+
+bool Form::Unload()
+{
+    if (mUnloaded)
+        return true;
+    if (!QueryUnload())
+        return false;
+    finishUnload();
+    return true;
+}
+
+// The widget itself lives until the event loop comes round: its own handlers may still be running.
+void Form::finishUnload()
+{
+    mUnloaded = true;
+    gOpenForms.removeOne(this);
+    Form_Unload();
+    hide();
+    if (QWidget *host = parentWidget(); host && host->inherits("QMdiSubWindow"))
+        host->deleteLater();
+    emit unloaded();
+    deleteLater();
+}
+
+void Form::closeEvent(QCloseEvent *event)
+{
+    event->setAccepted(Unload());
+}
+
+void Form::setDefaultButton(QPushButton *button)
+{
+    mDefault = button;
+    button->setDefault(true);
+}
+
+void Form::setCancelButton(QPushButton *button)
+{
+    mCancel = button;
+}
+
+void Form::keyPressEvent(QKeyEvent *event)
+{
+    const bool enter = event->key() == Qt::Key_Return || event->key() == Qt::Key_Enter;
+    const bool escape = event->key() == Qt::Key_Escape;
+    QPushButton *button = nullptr;
+    if (enter)
+        button = qobject_cast<QPushButton *>(focusWidget());
+    if (enter && !button)
+        button = mDefault;
+    if (escape)
+        button = mCancel;
+    if (button && button->isVisible() && button->isEnabled())
+        button->click();
+    else
+        QWidget::keyPressEvent(event);
+}

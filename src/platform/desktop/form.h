@@ -1,0 +1,77 @@
+#pragma once
+
+#include <QPointer>
+#include <QWidget>
+
+class QPushButton;
+
+/// What every screen is: a widget with a name, a load, an unload that may be refused, and default
+/// (Enter) and cancel (Esc) buttons of its own. It stands in the frame, or by itself, or modal; it
+/// is deleted when it has been unloaded.
+///
+/// Order of life: constructor (controls, texts), Show() or ShowModal() (Form_Load once, then on the
+/// screen), Form_Activate at each activation, Unload() (QueryUnload, then Form_Unload, then gone).
+class Form : public QWidget
+{
+    Q_OBJECT
+
+public:
+    explicit Form(const QString &name);
+    ~Form() override;
+
+    QString Name() const { return objectName(); }
+
+    /// Runs Form_Load if it has not run yet; the form stays hidden.
+    void Load();
+    void Show(); // modeless; brings it up if it is shown already
+    void ShowModal();
+
+    /// False if the form refuses.
+    bool Unload();
+    bool isUnloaded() const { return mUnloaded; }
+
+    /// All loaded forms, in the order in which they were made.
+    static const QList<Form *> &openForms();
+
+    /// Hosts modeless forms, as the frame does; without one they are windows of their own.
+    class Host
+    {
+    public:
+        virtual ~Host() = default;
+        virtual void adopt(Form *form) = 0;   // puts it into the frame and shows it
+        virtual void bringUp(Form *form) = 0; // to the front, with the focus
+    };
+    static void setHost(Host *host);
+
+signals:
+    void unloaded();
+    void activated();
+
+protected:
+    virtual void Form_Load() {}
+    virtual void Form_Activate() {}
+    virtual bool QueryUnload() { return true; } // false: the form stays
+    virtual void Form_Unload() {}
+
+    void setDefaultButton(QPushButton *button); // Enter
+    void setCancelButton(QPushButton *button);  // Esc
+    void closeEvent(QCloseEvent *event) override;
+    void keyPressEvent(QKeyEvent *event) override;
+
+private:
+    friend class FormActivation;
+    void finishUnload();
+
+    QPointer<QPushButton> mDefault, mCancel;
+    bool mLoaded = false, mUnloaded = false;
+};
+
+/// The single default instance of a screen: made when it is first asked for, and again after it was
+/// unloaded.
+template <typename Screen> Screen &defaultInstance()
+{
+    static QPointer<Screen> instance;
+    if (!instance || instance->isUnloaded())
+        instance = new Screen;
+    return *instance;
+}

@@ -1,0 +1,25 @@
+#include "platform/desktop/programfolder.h"
+
+#include <QCoreApplication>
+#include <QDir>
+#include <QStandardPaths>
+
+namespace programfolder
+{
+
+QString userFolder()
+{
+    return QStandardPaths::writableLocation(QStandardPaths::AppDataLocation);
+}
+
+QString find()
+{
+    if (const QString told = qEnvironmentVariable("SONGCASE_FOLDER"); !told.isEmpty())
+        return QDir::cleanPath(QDir(told).absolutePath());
+    const QDir own(QCoreApplication::applicationDirPath());
+    if (!own.entryList({QStringLiteral("Compact*.orv")}, QDir::Files).isEmpty())
+        return own.absolutePath();
+    return userFolder();
+}
+
+} // namespace programfolder

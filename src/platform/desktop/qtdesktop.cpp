@@ -1,0 +1,201 @@
+#include "platform/desktop/qtdesktop.h"
+
+#include "platform/desktop/drawingfreeze.h"
+#include "platform/desktop/form.h"
+#include "platform/desktop/programfolder.h"
+#include "platform/text/textrules.h"
+
+#include <QApplication>
+#include <QDesktopServices>
+#include <QEventLoop>
+#include <QFileDialog>
+#include <QKeyEvent>
+#include <QKeySequence>
+#include <QMessageBox>
+#include <QStandardPaths>
+#include <QUrl>
+
+namespace
+{
+
+/// A question that only its buttons answer: Esc and the close button would be taken for one of
+/// them.
+class QuestionBox : public QMessageBox
+{
+public:
+    using QMessageBox::QMessageBox;
+
+    void onlyButtons() { mOnlyButtons = true; }
+
+protected:
+    void closeEvent(QCloseEvent *event) override
+    {
+        if (mOnlyButtons)
+            event->ignore();
+        else
+            QMessageBox::closeEvent(event);
+    }
+    void keyPressEvent(QKeyEvent *event) override
+    {
+        if (!mOnlyButtons || event->key() != Qt::Key_Escape)
+            QMessageBox::keyPressEvent(event);
+    }
+
+private:
+    bool mOnlyButtons = false;
+};
+
+QMessageBox::StandardButtons buttonsOf(BoxButtons buttons)
+{
+    switch (buttons) {
+    case BoxButtons::YesNo:
+        return QMessageBox::Yes | QMessageBox::No;
+    case BoxButtons::YesNoCancel:
+        return QMessageBox::Yes | QMessageBox::No | QMessageBox::Cancel;
+    case BoxButtons::Ok:
+        break;
+    }
+    return QMessageBox::Ok;
+}
+
+QMessageBox::Icon iconOf(BoxKind kind)
+{
+    if (kind == BoxKind::Error)
+        return QMessageBox::Critical;
+    return kind == BoxKind::Question ? QMessageBox::Question : QMessageBox::Information;
+}
+
+BoxAnswer answerOf(int pressed)
+{
+    switch (pressed) {
+    case QMessageBox::Yes:
+        return vbYes;
+    case QMessageBox::No:
+        return vbNo;
+    case QMessageBox::Cancel:
+        return vbCancel;
+    default:
+        return vbOK;
+    }
+}
+
+QString chosen(QFileDialog &dialog)
+{
+    return dialog.exec() == QDialog::Accepted ? dialog.selectedFiles().value(0) : QString();
+}
+
+void prepare(QFileDialog &dialog, const FileQuestion &question)
+{
+    dialog.setWindowTitle(question.title);
+    if (!question.folder.isEmpty())
+        dialog.setDirectory(question.folder);
+    if (!question.patterns.isEmpty())
+        dialog.setNameFilter(question.patterns);
+    dialog.setDefaultSuffix(question.suffix);
+}
+
+} // namespace
+
+BoxAnswer QtDesktop::messageBox(BoxKind kind, BoxButtons buttons, const QString &text,
+                                const QString &title)
+{
+    QuestionBox box(iconOf(kind), title, text::withLineFeeds(text), buttonsOf(buttons),
+                    QApplication::activeWindow());
+    box.setTextFormat(Qt::PlainText);
+    if (buttons == BoxButtons::YesNo)
+        box.onlyButtons();
+    box.setDefaultButton(buttons == BoxButtons::Ok ? QMessageBox::Ok : QMessageBox::Yes);
+    return answerOf(box.exec());
+}
+
+void QtDesktop::showModal(Form &form)
+{
+    form.setWindowFlags(Qt::Dialog | Qt::CustomizeWindowHint | Qt::WindowTitleHint |
+                        Qt::WindowSystemMenuHint | Qt::WindowCloseButtonHint);
+    form.setWindowModality(Qt::ApplicationModal);
+    QEventLoop loop;
+    QObject::connect(&form, &Form::unloaded, &loop, &QEventLoop::quit);
+    form.show();
+    form.activateWindow();
+    loop.exec();
+}
+
+QString QtDesktop::openFileName(const FileQuestion &question)
+{
+    QFileDialog dialog(QApplication::activeWindow());
+    prepare(dialog, question);
+    dialog.setFileMode(QFileDialog::ExistingFile);
+    return chosen(dialog);
+}
+
+QString QtDesktop::saveFileName(const FileQuestion &question)
+{
+    QFileDialog dialog(QApplication::activeWindow());
+    prepare(dialog, question);
+    dialog.setAcceptMode(QFileDialog::AcceptSave);
+    return chosen(dialog);
+}
+
+QString QtDesktop::folderName(const FileQuestion &question)
+{
+    QFileDialog dialog(QApplication::activeWindow());
+    prepare(dialog, question);
+    dialog.setFileMode(QFileDialog::Directory);
+    dialog.setOption(QFileDialog::ShowDirsOnly);
+    return chosen(dialog);
+}
+
+QDateTime QtDesktop::now()
+{
+    return QDateTime::currentDateTime();
+}
+
+void QtDesktop::setPointer(QWidget *window, PointerShape shape)
+{
+    if (shape == vbDefault)
+        window->unsetCursor();
+    else
+        window->setCursor(shape == vbHourglass ? Qt::WaitCursor : Qt::PointingHandCursor);
+}
+
+void QtDesktop::freeze(QWidget *window)
+{
+    drawingfreeze::freeze(window);
+}
+
+void QtDesktop::pump()
+{
+    const drawingfreeze::Pumping pumping;
+    QApplication::processEvents();
+}
+
+void QtDesktop::sendKeys(const QString &keys)
+{
+    QWidget *to = QApplication::focusWidget();
+    if (!to)
+        to = QApplication::activeWindow();
+    const QKeySequence sequence(keys);
+    for (int i = 0; to && i < sequence.count(); ++i) {
+        const QKeyCombination key = sequence[uint(i)];
+        QKeyEvent press(QEvent::KeyPress, key.key(), key.keyboardModifiers());
+        QApplication::sendEvent(to, &press);
+        QKeyEvent release(QEvent::KeyRelease, key.key(), key.keyboardModifiers());
+        QApplication::sendEvent(to, &release);
+    }
+}
+
+bool QtDesktop::openAddress(const QString &url)
+{
+    return QDesktopServices::openUrl(QUrl(url));
+}
+
+QString QtDesktop::settingsFile()
+{
+    return QStandardPaths::writableLocation(QStandardPaths::AppConfigLocation) +
+           QStringLiteral("/settings.json");
+}
+
+QString QtDesktop::programFolder()
+{
+    return programfolder::find();
+}

@@ -1,0 +1,49 @@
+#pragma once
+
+#include <array>
+#include <cstdint>
+#include <string_view>
+#include <vector>
+
+struct UCollator;
+
+namespace text
+{
+
+/// The one order of texts in the program and its catalogue: the root order of ICU, secondary
+/// strength. Case does not count, accents do; "Édith" stands beside "Edith". All texts are UTF-8.
+/// Needs ICU only, so that other programs can load it too.
+class Collation
+{
+public:
+    static const Collation &root();
+
+    /// Below, equal to or above 0, as a sorts before, with or after b. ASCII texts take a short way
+    /// that gives the same answer.
+    int compare(std::string_view a, std::string_view b) const;
+
+    /// A number that sorts as the start of the text does, for sorting long lists: different numbers
+    /// decide, equal ones leave it to compare(). False if the text has no such number.
+    bool sortPrefix(std::string_view s, std::uint64_t &prefix) const;
+
+    /// The version of the order's tables, 24 bits. Indexes made under another one are not usable.
+    std::uint32_t version() const { return mVersion; }
+
+    Collation(const Collation &) = delete;
+    Collation &operator=(const Collation &) = delete;
+
+private:
+    Collation();
+    ~Collation();
+    void rankCharacters();
+    void rankAccented();
+
+    static constexpr unsigned latinEnd = 0x250;
+
+    UCollator *mCollator = nullptr;
+    std::uint32_t mVersion = 0;
+    std::array<std::uint8_t, 128> mRank{}; // primary order of ASCII; 0: takes the long way
+    std::vector<std::uint8_t> mLatinRank;  // the same, letters with accents included
+};
+
+} // namespace text

@@ -1,0 +1,5 @@
+#include "shell/program.h"
+int runProgram(int, char **)
+{
+    return 0;
+}

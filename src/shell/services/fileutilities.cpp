@@ -1,0 +1,142 @@
+#include "shell/services/fileutilities.h"
+
+#include "platform/desktop/desktop.h"
+
+#include <QDir>
+#include <QDirIterator>
+#include <QRegularExpression>
+#include <cstdio>
+
+QStringList gFoundFiles;
+QString gBrowseInitialFolder;
+
+namespace
+{
+
+// Only * and ? are wild: "Album [Disc 1].mp3" is a plain name.
+bool isPattern(const QString &name)
+{
+    return name.contains(QLatin1Char('*')) || name.contains(QLatin1Char('?'));
+}
+
+QRegularExpression wildcards(const QString &pattern)
+{
+    QString expression;
+    for (const QChar c : pattern) {
+        if (c == QLatin1Char('*'))
+            expression += QLatin1String(".*");
+        else if (c == QLatin1Char('?'))
+            expression += QLatin1Char('.');
+        else
+            expression += QRegularExpression::escape(QString(c));
+    }
+    return QRegularExpression(QRegularExpression::anchoredPattern(expression),
+                              QRegularExpression::CaseInsensitiveOption |
+                                  QRegularExpression::DotMatchesEverythingOption);
+}
+
+QString withSeparator(QString path)
+{
+    if (!path.endsWith(QDir::separator()))
+        path += QDir::separator();
+    return path;
+}
+
+} // namespace
+
+QString systemPath(const QString &stored)
+{
+    if (QDir::separator() == QLatin1Char('\\') || QFileInfo::exists(stored))
+        return stored;
+    return QString(stored).replace(QLatin1Char('\\'), QDir::separator());
+}
+
+bool FileExists(const QString &path)
+{
+    if (path.isEmpty())
+        return false;
+    if (QFileInfo::exists(systemPath(path)))
+        return true;
+    const QFileInfo info(path);
+    if (!isPattern(info.fileName()))
+        return false;
+    const auto pattern = wildcards(info.fileName());
+    QDirIterator it(info.path(),
+                    QDir::AllEntries | QDir::NoDotAndDotDot | QDir::Hidden | QDir::System);
+    while (it.hasNext()) {
+        it.next();
+        if (pattern.match(it.fileName()).hasMatch())
+            return true;
+    }
+    return false;
+}
+
+bool DirExists(QString path)
+{
+    path = path.trimmed();
+    const bool root = IsDriveRoot(path);
+    if (path.endsWith(QDir::separator()))
+        path.chop(1);
+    return root || IsDriveRoot(path) || (!path.isEmpty() && QFileInfo(systemPath(path)).isDir());
+}
+
+bool IsDriveRoot(const QString &text)
+{
+    if (text.isEmpty())
+        return false;
+    for (const QFileInfo &drive : QDir::drives()) {
+        if (drive.absoluteFilePath().contains(text, Qt::CaseInsensitive))
+            return true;
+    }
+    return false;
+}
+
+QString StripAtNull(QString &s)
+{
+    if (const auto end = s.indexOf(QChar(0)); end >= 0)
+        s.truncate(end);
+    return s;
+}
+
+QStringList FindFilesInTree(const QString &path, const QString &pattern, int)
+{
+    gFoundFiles.clear();
+    ScanFolderTree(path, pattern, 0, 0);
+    return gFoundFiles;
+}
+
+double ScanFolderTree(QString path, const QString &pattern, int fileCount, int folderCount)
+{
+    path = withSeparator(path);
+    QStringList folders;
+    double size = 0;
+    const auto fits = wildcards(pattern);
+    QDirIterator it(path, QDir::Dirs | QDir::Files | QDir::NoDotAndDotDot | QDir::Hidden);
+    while (it.hasNext()) {
+        it.next();
+        const QFileInfo entry = it.fileInfo();
+        const QString full = path + entry.fileName();
+        // A linked folder may lead back to where the walk has been.
+        if (entry.isDir() && !entry.isSymLink() && !full.contains(QLatin1String("Processed")))
+            folders.append(full);
+        if (!entry.isFile() || !fits.match(entry.fileName()).hasMatch())
+            continue;
+        size += double(entry.size());
+        if (!full.contains(QLatin1String("SYSTEM FILES")))
+            gFoundFiles.append(full);
+    }
+    for (const QString &folder : folders)
+        size += ScanFolderTree(folder, pattern, fileCount, folderCount);
+    return size;
+}
+
+bool MoveFileReplace(const QString &from, const QString &to)
+{
+    return std::rename(QFile::encodeName(from).constData(), QFile::encodeName(to).constData()) != 0;
+}
+
+QString BrowseForFolderDialog(const QString &title, const QString &initialFolder)
+{
+    gBrowseInitialFolder = initialFolder;
+    return Desktop::current().folderName({title, initialFolder, {}, {}});
+}

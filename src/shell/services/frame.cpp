@@ -1,0 +1,54 @@
+#include "shell/services/frame.h"
+
+#include <QWidget>
+
+namespace
+{
+
+Frame *gFrame = nullptr;
+
+} // namespace
+
+Frame *Frame::current()
+{
+    return gFrame;
+}
+
+void Frame::setCurrent(Frame *frame)
+{
+    gFrame = frame;
+}
+
+void setImportEnabled(bool enabled)
+{
+    if (gFrame)
+        gFrame->setImportEnabled(enabled);
+}
+
+void setFramePointer(PointerShape shape)
+{
+    if (gFrame)
+        Desktop::current().setPointer(gFrame->window(), shape);
+}
+
+void freezeFrame()
+{
+    if (gFrame)
+        Desktop::current().freeze(gFrame->window());
+}
+
+void releaseFrame()
+{
+    Desktop::current().freeze(nullptr);
+}
+
+void placeInFrame(QWidget *form, double shareOfWidth, double shareOfHeight)
+{
+    if (!gFrame)
+        return;
+    const QSize frame = gFrame->size();
+    QPoint corner(int(frame.width() * shareOfWidth), int(frame.height() * shareOfHeight));
+    if (form->isWindow())
+        corner += gFrame->window()->pos();
+    form->move(corner);
+}

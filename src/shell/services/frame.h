@@ -1,0 +1,30 @@
+#pragma once
+
+#include "platform/desktop/desktop.h"
+
+#include <QSize>
+
+class QWidget;
+
+/// What the screens may do with the frame that they stand in. There is none in a test of one
+/// screen.
+class Frame
+{
+public:
+    virtual ~Frame() = default;
+    virtual QWidget *window() = 0;
+    virtual QSize size() const = 0; // in pixels
+    virtual void setImportEnabled(bool enabled) = 0;
+
+    static Frame *current();
+    static void setCurrent(Frame *frame);
+};
+
+// The same, harmless without a frame.
+void setImportEnabled(bool enabled);
+void setFramePointer(PointerShape shape);
+void freezeFrame();
+void releaseFrame();
+
+/// Places a form at a share of the frame's size.
+void placeInFrame(QWidget *form, double shareOfWidth, double shareOfHeight);

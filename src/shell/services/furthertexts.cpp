@@ -1,0 +1,30 @@
+#include "shell/services/messagetable.h"
+
+#include <iterator>
+
+// Texts for what the fixed table does not know: names for screen readers, messages about files and
+// second starts. Keys begin with a small "x", so that none can be taken for a fixed one.
+
+namespace messagetable
+{
+
+// clang-format off
+const Message furtherTexts[] = {
+    {"xInUse", "This catalogue is in use by another program or another user.", "Deze database is in gebruik bij een ander programma of een andere gebruiker."},
+    {"xNotACatalogue", "The file is not a catalogue of this program.", "Het bestand is geen database van dit programma."},
+    {"xTablesMissing", "The file is not a complete catalogue: a table is missing.", "Het bestand is geen volledige database: er ontbreekt een tabel."},
+    {"xDamaged", "The catalogue is damaged. Please put back your last copy of it.", "De database is beschadigd. Zet uw laatste kopie ervan terug."},
+    {"xReadOnly", "The catalogue or its folder is read-only.", "De database of de map ervan is alleen-lezen."},
+    {"xNewerCatalogue", "The catalogue was made by a newer version of this program.", "De database is gemaakt met een nieuwere versie van dit programma."},
+    {"xCannotMakeCatalogue", "The folder for the catalogue cannot be made: ", "De map voor de database kan niet worden gemaakt: "},
+    {"xTextFiles", "Text files (*.txt);;All files (*)", "Tekstbestanden (*.txt);;Alle bestanden (*)"},
+    {"xProgress", "Progress", "Voortgang"},
+    {"xTracksRead", "Tracks to be imported", "Te importeren tracks"},
+    {"xToolbar", "Toolbar", "Werkbalk"},
+    {"xPrint", "Print list", "Lijst afdrukken"},
+};
+// clang-format on
+
+const std::size_t furtherTextCount = std::size(furtherTexts);
+
+} // namespace messagetable

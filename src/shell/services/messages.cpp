@@ -1,0 +1,38 @@
+#include "shell/services/messages.h"
+
+#include "shell/services/globals.h"
+#include "shell/services/messagetable.h"
+
+#include <string_view>
+#include <unordered_map>
+
+namespace
+{
+
+using Table = std::unordered_map<std::string_view, const messagetable::Message *>;
+
+const Table &table()
+{
+    static const Table byKey = [] {
+        Table t;
+        for (std::size_t i = 0; i < messagetable::fixedTextCount; ++i)
+            t.emplace(messagetable::fixedTexts[i].key, &messagetable::fixedTexts[i]);
+        for (std::size_t i = 0; i < messagetable::furtherTextCount; ++i)
+            t.emplace(messagetable::furtherTexts[i].key, &messagetable::furtherTexts[i]);
+        return t;
+    }();
+    return byKey;
+}
+
+} // namespace
+
+QString GetMessage(QLatin1String key)
+{
+    if (gLanguage != languageEnglish && gLanguage != languageDutch)
+        return {};
+    const bool dutch = gLanguage == languageDutch;
+    const auto it = table().find(std::string_view(key.data(), std::size_t(key.size())));
+    if (it == table().end())
+        return dutch ? QStringLiteral("Onbekend") : QStringLiteral("Unknown");
+    return QString::fromUtf8(dutch ? it->second->dutch : it->second->english);
+}

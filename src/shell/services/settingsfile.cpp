@@ -1,0 +1,162 @@
+#include "shell/services/settingsfile.h"
+
+#include <QDateTime>
+#include <QDir>
+#include <QFileInfo>
+#include <QJsonDocument>
+#include <QJsonObject>
+#include <QLockFile>
+#include <QSaveFile>
+
+namespace
+{
+
+QString normalKey(QString key)
+{
+    while (key.endsWith(QLatin1Char('\\')))
+        key.chop(1);
+    return key.toLower();
+}
+
+QVariant fromJson(const QJsonObject &o)
+{
+    const QString type = o.value(QLatin1String("type")).toString();
+    const QJsonValue v = o.value(QLatin1String("value"));
+    if (type == QLatin1String("text"))
+        return v.toString();
+    if (type == QLatin1String("number"))
+        return v.toInt();
+    return QByteArray::fromBase64(v.toString().toLatin1());
+}
+
+QJsonObject toJson(const QVariant &v)
+{
+    const auto object = [](const char *type, const QJsonValue &value) {
+        return QJsonObject{{QStringLiteral("type"), QLatin1String(type)},
+                           {QStringLiteral("value"), value}};
+    };
+    switch (v.typeId()) {
+    case QMetaType::QString:
+        return object("text", v.toString());
+    case QMetaType::Int:
+        return object("number", v.toInt());
+    default:
+        return object("binary", QString::fromLatin1(v.toByteArray().toBase64()));
+    }
+}
+
+void setAside(const QString &file)
+{
+    const QString stamp = QDateTime::currentDateTime().toString(QStringLiteral("yyyyMMdd-hhmmss"));
+    QString aside = file + QStringLiteral(".damaged-") + stamp;
+    while (QFile::exists(aside))
+        aside += QLatin1Char('x');
+    QFile::rename(file, aside);
+}
+
+} // namespace
+
+SettingsFile::SettingsFile(QString file) : mFile(std::move(file)) {}
+
+SettingsFile::Tree SettingsFile::read() const
+{
+    QFile file(mFile);
+    if (!file.open(QIODevice::ReadOnly))
+        return {};
+    QJsonParseError error;
+    const QJsonDocument document = QJsonDocument::fromJson(file.readAll(), &error);
+    file.close();
+    if (!document.isObject()) {
+        setAside(mFile);
+        return {};
+    }
+    Tree tree;
+    const QJsonObject keys = document.object();
+    for (auto key = keys.begin(); key != keys.end(); ++key) {
+        Values &values = tree[normalKey(key.key())];
+        const QJsonObject named = key.value().toObject();
+        for (auto v = named.begin(); v != named.end(); ++v)
+            values[v.key().toLower()] = fromJson(v.value().toObject());
+    }
+    return tree;
+}
+
+template <typename Change> SettingsFile::Code SettingsFile::change(Change change)
+{
+    if (!QDir().mkpath(QFileInfo(mFile).absolutePath()))
+        return AccessDenied;
+    QLockFile lock(mFile + QStringLiteral(".lock"));
+    if (!lock.tryLock(2000))
+        return AccessDenied;
+    Tree tree = read();
+    if (const Code code = change(tree); code != Success)
+        return code;
+    QJsonObject keys;
+    for (auto key = tree.cbegin(); key != tree.cend(); ++key) {
+        QJsonObject named;
+        for (auto v = key->cbegin(); v != key->cend(); ++v)
+            named.insert(v.key(), toJson(v.value()));
+        keys.insert(key.key(), named);
+    }
+    QSaveFile file(mFile);
+    if (!file.open(QIODevice::WriteOnly))
+        return AccessDenied;
+    file.write(QJsonDocument(keys).toJson());
+    return file.commit() ? Success : AccessDenied;
+}
+
+bool SettingsFile::hasKey(const QString &key) const
+{
+    return read().contains(normalKey(key));
+}
+
+SettingsFile::Code SettingsFile::createKey(const QString &key)
+{
+    return change([&](Tree &tree) {
+        tree[normalKey(key)];
+        return Success;
+    });
+}
+
+SettingsFile::Code SettingsFile::deleteKey(const QString &key)
+{
+    return change([&](Tree &tree) {
+        const QString normal = normalKey(key), below = normal + QLatin1Char('\\');
+        const auto removed = tree.removeIf(
+            [&](Tree::iterator it) { return it.key() == normal || it.key().startsWith(below); });
+        return removed > 0 ? Success : NotFound;
+    });
+}
+
+SettingsFile::Code SettingsFile::value(const QString &key, const QString &name,
+                                       QVariant &value) const
+{
+    const Tree tree = read();
+    const auto it = tree.constFind(normalKey(key));
+    if (it == tree.cend() || !it->contains(name.toLower()))
+        return NotFound;
+    value = it->value(name.toLower());
+    return Success;
+}
+
+SettingsFile::Code SettingsFile::setValue(const QString &key, const QString &name,
+                                          const QVariant &value)
+{
+    return change([&](Tree &tree) {
+        const auto it = tree.find(normalKey(key));
+        if (it == tree.end())
+            return NotFound;
+        it->insert(name.toLower(), value);
+        return Success;
+    });
+}
+
+SettingsFile::Code SettingsFile::deleteValue(const QString &key, const QString &name)
+{
+    return change([&](Tree &tree) {
+        const auto it = tree.find(normalKey(key));
+        if (it == tree.end() || it->remove(name.toLower()) == 0)
+            return NotFound;
+        return Success;
+    });
+}
