@@ -1,5 +1,53 @@
 #include "shell/program.h"
-int runProgram(int, char **)
+
+#include "platform/desktop/qtdesktop.h"
+#include "shell/MainScreen.h"
+#include "shell/application.h"
+#include "shell/endsignals.h"
+#include "shell/services/globals.h"
+#include "shell/services/messages.h"
+#include "shell/singleinstance.h"
+#include "shell/startup.h"
+
+namespace
 {
-    return 0;
+
+void sayInUse()
+{
+    gLanguage = startup::storedLanguage();
+    errorBox(GetMessage("xInUse"), GetMessage("MainScreen.Caption"));
+}
+
+} // namespace
+
+int runProgram(int argc, char **argv)
+{
+    nameApplication();
+    Application application(argc, argv);
+    QtDesktop desktop;
+    Desktop::setCurrent(&desktop);
+    application.setQuitOnLastWindowClosed(false);
+
+    // Before any setting is written.
+    SingleInstance instance(desktop.programFolder());
+    const auto outcome = instance.take();
+    if (outcome == SingleInstance::Outcome::Raised)
+        return 0;
+    if (outcome == SingleInstance::Outcome::InUse) {
+        sayInUse();
+        return 1;
+    }
+
+    MainScreen mainScreen(instance.lastRunBroken());
+    QObject::connect(&mainScreen, &MainScreen::unloaded, &application, &QCoreApplication::quit,
+                     Qt::QueuedConnection);
+    QObject::connect(&instance, &SingleInstance::raiseRequested, &mainScreen,
+                     &MainScreen::bringToFront);
+    QObject::connect(&mainScreen, &MainScreen::languageKnown, &application,
+                     &Application::translateQt);
+    EndSignals endSignals;
+    QObject::connect(&endSignals, &EndSignals::endRequested, &mainScreen, &MainScreen::Unload);
+    if (!mainScreen.Load())
+        return 1;
+    return application.exec();
 }

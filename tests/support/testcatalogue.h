@@ -1,6 +1,6 @@
 #pragma once
 
-#include <QString>
+#include <QStringList>
 #include <QTemporaryDir>
 
 struct sqlite3;
@@ -30,6 +30,13 @@ private:
 
 /// A connection to this file with the attributes that the program gives its own, opened.
 void openConnection(const QString &file);
+
+/// A list of texts, given as UTF-8.
+template <typename... Text>
+QStringList texts(Text... text)
+{
+    return {QString::fromUtf8(text)...};
+}
 
 /// A file with this content in a folder; gives its full name.
 QString writeFile(const QString &name, const QByteArray &content);

@@ -310,8 +310,7 @@ void Connection::leave(Transaction *owner)
 
 void Connection::RollbackTrans()
 {
-    requireOpen();
-    if (!mEngine->routines.empty())
+    if (!mEngine || !mEngine->routines.empty())
         return;
     if (!sqlite3_get_autocommit(mEngine->db))
         check(mEngine->exec("ROLLBACK"));

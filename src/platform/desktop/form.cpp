@@ -90,6 +90,8 @@ void Form::Show()
 void Form::ShowModal()
 {
     Load();
+    if (gHost && mPlace)
+        move(gHost->origin() + *mPlace);
     Desktop::current().showModal(*this);
 }
 

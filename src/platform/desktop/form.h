@@ -2,6 +2,7 @@
 
 #include <QPointer>
 #include <QWidget>
+#include <optional>
 
 class QPushButton;
 
@@ -30,6 +31,10 @@ public:
     bool Unload();
     bool isUnloaded() const { return mUnloaded; }
 
+    /// Where the form wants to stand, from the corner of its host; to be set in its load.
+    void setPlace(QPoint corner) { mPlace = corner; }
+    std::optional<QPoint> place() const { return mPlace; }
+
     /// All loaded forms, in the order in which they were made.
     static const QList<Form *> &openForms();
 
@@ -40,6 +45,7 @@ public:
         virtual ~Host() = default;
         virtual void adopt(Form *form) = 0;   // puts it into the frame and shows it
         virtual void bringUp(Form *form) = 0; // to the front, with the focus
+        virtual QPoint origin() const = 0;    // of the places of forms, on the screen
     };
     static void setHost(Host *host);
 
@@ -63,6 +69,7 @@ private:
     void finishUnload();
 
     QPointer<QPushButton> mDefault, mCancel;
+    std::optional<QPoint> mPlace;
     bool mLoaded = false, mUnloaded = false;
 };
 

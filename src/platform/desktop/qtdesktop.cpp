@@ -110,8 +110,8 @@ BoxAnswer QtDesktop::messageBox(BoxKind kind, BoxButtons buttons, const QString 
 
 void QtDesktop::showModal(Form &form)
 {
-    form.setWindowFlags(Qt::Dialog | Qt::CustomizeWindowHint | Qt::WindowTitleHint |
-                        Qt::WindowSystemMenuHint | Qt::WindowCloseButtonHint);
+    const auto frameless = form.windowFlags() & Qt::FramelessWindowHint;
+    form.setWindowFlags(Qt::Dialog | frameless);
     form.setWindowModality(Qt::ApplicationModal);
     QEventLoop loop;
     QObject::connect(&form, &Form::unloaded, &loop, &QEventLoop::quit);

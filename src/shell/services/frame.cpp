@@ -1,6 +1,7 @@
 #include "shell/services/frame.h"
 
-#include <QWidget>
+#include "platform/desktop/form.h"
+
 
 namespace
 {
@@ -42,13 +43,10 @@ void releaseFrame()
     Desktop::current().freeze(nullptr);
 }
 
-void placeInFrame(QWidget *form, double shareOfWidth, double shareOfHeight)
+void placeInFrame(Form *form, double shareOfWidth, double shareOfHeight)
 {
     if (!gFrame)
         return;
     const QSize frame = gFrame->size();
-    QPoint corner(int(frame.width() * shareOfWidth), int(frame.height() * shareOfHeight));
-    if (form->isWindow())
-        corner += gFrame->window()->pos();
-    form->move(corner);
+    form->setPlace({int(frame.width() * shareOfWidth), int(frame.height() * shareOfHeight)});
 }

@@ -4,6 +4,7 @@
 
 #include <QSize>
 
+class Form;
 class QWidget;
 
 /// What the screens may do with the frame that they stand in. There is none in a test of one
@@ -26,5 +27,5 @@ void setFramePointer(PointerShape shape);
 void freezeFrame();
 void releaseFrame();
 
-/// Places a form at a share of the frame's size.
-void placeInFrame(QWidget *form, double shareOfWidth, double shareOfHeight);
+/// For the load of a form: it will stand at this share of the frame's size.
+void placeInFrame(Form *form, double shareOfWidth, double shareOfHeight);

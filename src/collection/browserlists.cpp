@@ -1,0 +1,93 @@
+#include "collection/browserlists.h"
+
+#include "shell/services/globals.h"
+
+namespace browserlists
+{
+
+namespace
+{
+
+const auto selectCompilations =
+    QStringLiteral(" select cdt.id as Id, cdt.titel as Titel from cdtitels as cdt"
+                   " where cdt.cd_type='V' order by cdt.titel asc ");
+
+const auto selectAlbums = QStringLiteral(
+    " select cdt.id as Id, art.naam as Artiest, cdt.titel as Titel from cdtitels as cdt, artiesten as art"
+    " where cdt.cd_type='E' and cdt.artiest_id=art.id order by cdt.titel asc ");
+
+const auto selectMP3Collections =
+    QStringLiteral(" select mcs.id as Id, mcs.map as Map, mcs.album as Album from mp3collections as mcs"
+                   " order by mcs.album asc ");
+
+const auto countTracks = QStringLiteral("SELECT COUNT(*) AS AANTAL FROM TRACKS");
+
+QString deleteDiscsOf(qint64 title)
+{
+    return QStringLiteral(" delete from compactdiscs where cdtitels_id = ") + QString::number(title);
+}
+
+QString deleteTitleRow(qint64 title)
+{
+    return QStringLiteral(" delete from cdtitels where id = ") + QString::number(title);
+}
+
+QString deleteFilesOf(qint64 collection)
+{
+    return QStringLiteral(" delete from mp3files where collectionid = ") + QString::number(collection);
+}
+
+QString deleteCollectionRow(qint64 collection)
+{
+    return QStringLiteral(" delete from mp3collections where id = ") + QString::number(collection);
+}
+
+ADODB::RecordsetPtr open(const QString &statement)
+{
+    auto rows = std::make_shared<ADODB::Recordset>();
+    rows->Open(statement, *gConnection, ADODB::adOpenForwardOnly, ADODB::adLockReadOnly);
+    return rows;
+}
+
+// Children first.
+void executeBoth(const QString &children, const QString &parent)
+{
+    ADODB::Transaction transaction(*gConnection);
+    gConnection->Execute(children);
+    gConnection->Execute(parent);
+    transaction.CommitTrans();
+}
+
+} // namespace
+
+ADODB::RecordsetPtr compilations()
+{
+    return open(selectCompilations);
+}
+
+ADODB::RecordsetPtr albums()
+{
+    return open(selectAlbums);
+}
+
+ADODB::RecordsetPtr mp3Collections()
+{
+    return open(selectMP3Collections);
+}
+
+qint64 trackCount()
+{
+    return open(countTracks)->Fields(u"Aantal").Value().toLong();
+}
+
+void deleteTitle(qint64 id)
+{
+    executeBoth(deleteDiscsOf(id), deleteTitleRow(id));
+}
+
+void deleteMP3Collection(qint64 id)
+{
+    executeBoth(deleteFilesOf(id), deleteCollectionRow(id));
+}
+
+} // namespace browserlists

@@ -1,0 +1,77 @@
+#pragma once
+
+#include "platform/ado/recordset.h"
+#include "platform/desktop/form.h"
+#include "shell/services/browser.h"
+
+#include <array>
+#include <memory>
+#include <vector>
+
+class DBListViewCTL;
+class ListItem;
+namespace Ui
+{
+class frmCDList;
+}
+
+/// The browser of the whole collection: compilations, albums, records and MP3 collections, a page each.
+/// It shows the key fields only; its own changes to the catalogue are the deletions.
+class frmCDList : public Form, public Browser
+{
+    Q_OBJECT
+
+public:
+    frmCDList();
+    ~frmCDList() override;
+
+    /// Reads all pages anew; column widths and the remembered rows are kept.
+    void RefreshLists() override;
+
+protected:
+    void Form_Load() override;
+    void Form_Activate() override;
+
+private:
+    enum PageIndex { Compilations, Albums, Records, MP3Collections };
+
+    /// What the three pages with a list have alike.
+    struct ListPage {
+        PageIndex page;
+        DBListViewCTL *list;
+        ADODB::RecordsetPtr (*read)();
+        std::vector<const char *> headers; // keys of the columns behind Id
+        const char *countKey;
+        std::vector<int> widths; // kept over a reload
+        qsizetype count = 0;
+        int index = 1; // of the remembered row, from 1
+    };
+
+    void connectControls();
+    void connectList(ListPage &page);
+    void setCaptions();
+    void setFirstWidths();
+    void LoadLists();
+    void loadPage(ListPage &page);
+    void SaveColumnWidths();
+    void CDTab_Click();
+    void showPage();
+    void setTabStops();
+    void showCount();
+    void focusList();
+    void RestoreSelection(ListPage &page);
+    void rememberSelection(ListPage &page);
+    void list_KeyDown(int keyCode);
+    void list_ColumnClick(ListPage &page, int column);
+    void cmdDelete_Click();
+    void DeleteCD();
+    void DeleteMP3Collection();
+    void deleteSelected(ListPage &page, void (*remove)(qint64));
+    ListPage *current(); // nothing on the page of the tree
+
+    std::unique_ptr<Ui::frmCDList> mUi;
+    std::array<ListPage, 3> mPages;
+    qint64 mTrackCount = 0;
+    bool mColFocusDone = false; // the remembered row of ColList was restored on this focus
+    bool mLoading = true;
+};

@@ -1,0 +1,308 @@
+#include "shell/MainScreen.h"
+
+#include "catalogue/cleanorphans.h"
+#include "catalogue/provision.h"
+#include "collection/frmCDList.h"
+#include "platform/ado/connection.h"
+#include "shell/frmHelp.h"
+#include "shell/frmSplash.h"
+#include "shell/services/captions.h"
+#include "shell/services/clsRegistry.h"
+#include "shell/services/fileutilities.h"
+#include "shell/services/globals.h"
+#include "shell/services/messages.h"
+#include "textimport/frmImportWizard.h"
+#include "ui_MainScreen.h"
+
+#include <QCloseEvent>
+#include <QDir>
+#include <QMdiSubWindow>
+#include <QTimer>
+#include <QToolButton>
+
+namespace
+{
+
+constexpr int splashTime = 3000; // milliseconds
+constexpr QRect placeAtStart(7, 7, 1000, 667); // 100, 100, 15000, 10000 twips
+
+} // namespace
+
+MainScreen::MainScreen(bool lastRunBroken)
+    : mUi(std::make_unique<Ui::MainScreen>())
+    , mTimer1(new QTimer(this))
+    , mLastRunBroken(lastRunBroken)
+{
+    mTimer1->setObjectName(QStringLiteral("Timer1"));
+    mTimer1->setInterval(splashTime);
+    connect(mTimer1, &QTimer::timeout, this, &MainScreen::Timer1_Timer);
+}
+
+MainScreen::~MainScreen()
+{
+    Form::setHost(nullptr);
+    Frame::setCurrent(nullptr);
+}
+
+bool MainScreen::Load()
+{
+    mDatabaseMissing = false;
+    defaultInstance<frmSplash>().Show();
+    Desktop::current().pump();
+    setUpControls();
+    try {
+        provisionCatalogue();
+        InitMainScreen();
+        if (FileExists(gDatabasePath)) {
+            startup::openCatalogue(gDatabasePath, mLastRunBroken);
+        } else {
+            mDatabaseMissing = true;
+            errorBox(GetMessage("FNFpart1") + gDatabasePath + GetMessage("FNFpart2"),
+                     GetMessage("FileNotFound"));
+            Unload();
+            return false;
+        }
+    } catch (const ADODB::Error &error) {
+        showConnectErrors(error);
+    }
+    mTimer1->start();
+    return true;
+}
+
+void MainScreen::setUpControls()
+{
+    mUi->setupUi(this);
+    setCentralWidget(mUi->Children);
+    connectActions();
+    Frame::setCurrent(this);
+    Form::setHost(this);
+}
+
+void MainScreen::InitMainScreen()
+{
+    const QString folder = Desktop::current().programFolder();
+    mStart = startup::readSettings(folder);
+    emit languageKnown();
+    markLanguage();
+    gDatabasePath = folder + QDir::separator() + QStringLiteral("Compact4.orv");
+    setCaptions();
+}
+
+void MainScreen::setCaptions()
+{
+    applyCaptions(this, {{"MainScreen", "MainScreen.Caption"},
+                         {"File", "File"},
+                         {"Import", "Import"},
+                         {"mnuSave", "mnuSave"},
+                         {"mnuConvertDatabase", "frmAutoUpdateUtilityCaption"},
+                         {"mnuLiedkist", "mnuLiedkist"},
+                         {"mnuSearchArtistsTitles", "mnuSearchArtistsTitles"},
+                         {"mnuCDInsert", "mnuCDInsert"},
+                         {"mnuInsertEnkelCD", "mnuInsertEnkelCD"},
+                         {"mnuUpdate", "mnuUpdate"},
+                         {"mnuMP3", "mnuInsertMP3Collection"},
+                         {"mnuCDDB", "mnuCDDB"},
+                         {"mnuInstellingen", "mnuInstellingen"},
+                         {"mnuRegisterCDDB", "mnuRegisterCDDB"},
+                         {"mnuTaal", "mnuTaal"},
+                         {"mnuEngels", "mnuEngels"},
+                         {"mnuNederlands", "mnuNederlands"},
+                         {"Over", "Over"},
+                         {"mnuOverCDDB", "OverCDDB"},
+                         {"tbImport", "TTekstImport"},
+                         {"tbSave", "TTSave"},
+                         {"tbQuicksearch", "TTQuicksearch"},
+                         {"tbCollection", "TTYourcollection"},
+                         {"tbCredits", "TTCredits"},
+                         {"tbHelp", "TTHelp"},
+                         {"tbCDDB", "TTCDDB"},
+                         {"MainToolbar", "xToolbar"}});
+    // The keys that a toolbar's commands send go to the control with the focus.
+    for (QToolButton *button : mUi->MainToolbar->findChildren<QToolButton *>())
+        button->setFocusPolicy(Qt::NoFocus);
+}
+
+void MainScreen::markLanguage()
+{
+    mUi->mnuNederlands->setChecked(gLanguage == languageDutch);
+    mUi->mnuEngels->setChecked(gLanguage == languageEnglish);
+}
+
+void MainScreen::connectActions()
+{
+    const auto on = [this](QAction *action, auto command) {
+        connect(action, &QAction::triggered, this, command);
+    };
+    const auto importText = [] { defaultInstance<frmImportWizard>().Show(); };
+    on(mUi->Import, importText);
+    on(mUi->tbImport, importText);
+    on(mUi->mnuUpdate, &MainScreen::openBrowser);
+    on(mUi->tbCollection, &MainScreen::openBrowser);
+    on(mUi->mnuHelp, &ShowHelpLinks);
+    on(mUi->tbHelp, &ShowHelpLinks);
+    on(mUi->Over, &MainScreen::Over_Click);
+    on(mUi->tbCredits, &MainScreen::Over_Click);
+    on(mUi->mnuEngels, [this] { ChangeLanguage(languageEnglish); });
+    on(mUi->mnuNederlands, [this] { ChangeLanguage(languageDutch); });
+}
+
+void MainScreen::showConnectErrors(const ADODB::Error &error)
+{
+    const auto show = [](const ADODB::Error &e) {
+        errorBox(QStringLiteral("ADO Connect Error: ") + QString::number(e.Number) + QLatin1Char(' ') +
+                     e.Description,
+                 GetMessage("MsgSysErr"));
+    };
+    show(error);
+    if (!gConnection)
+        return;
+    const auto entries = gConnection->Errors;
+    for (const ADODB::Error &entry : entries)
+        show(entry);
+}
+
+// Nothing here hangs on a window manager, which may never activate the frame.
+void MainScreen::Timer1_Timer()
+{
+    {
+        const Freeze freeze(this);
+        defaultInstance<frmSplash>().Unload();
+        setWindowState(Qt::WindowNoState);
+        mTimer1->stop();
+        setGeometry(placeAtStart);
+    }
+    show();
+    openBrowser();
+    if (mStart.session == 1)
+        ShowHelpLinks();
+}
+
+void MainScreen::openBrowser()
+{
+    defaultInstance<frmCDList>().Show();
+}
+
+void MainScreen::ChangeLanguage(int language)
+{
+    const bool dutch = language == languageDutch;
+    const bool isMarked = (dutch ? mUi->mnuEngels : mUi->mnuNederlands)->isChecked();
+    mUi->mnuNederlands->setChecked(dutch);
+    mUi->mnuEngels->setChecked(!dutch);
+    if (!isMarked)
+        return; // the entry of the marked language was pressed again
+    clsRegistry settings;
+    settings.SetValue(settingsKey, QStringLiteral("Language"), language);
+    // The running program keeps its language, so these words are in no table.
+    if (dutch)
+        informationBox(QStringLiteral("De taalinstellingen worden van toepassing indien u dit programma "
+                                      "afsluit en daarna opnieuw start."),
+                       QStringLiteral("Instellingen"));
+    else
+        informationBox(QStringLiteral("If you close and restart this program, the preferred language "
+                                      "will be English."),
+                       QStringLiteral("Preferences"));
+}
+
+void MainScreen::Over_Click()
+{
+    defaultInstance<frmSplash>().ShowModal();
+    // By design: the author comes after the screen has closed, on a form that stays hidden.
+    frmSplash &hidden = defaultInstance<frmSplash>();
+    hidden.Load();
+    hidden.setAuthor(GetMessage("TheAuthor"));
+    Desktop::current().pump();
+}
+
+void MainScreen::setImportEnabled(bool enabled)
+{
+    mUi->Import->setEnabled(enabled);
+    mUi->tbImport->setEnabled(enabled);
+}
+
+void MainScreen::adopt(Form *form)
+{
+    const QSize wanted = form->size();
+    QMdiSubWindow *child = mUi->Children->addSubWindow(form);
+    child->setAttribute(Qt::WA_DeleteOnClose, false);
+    child->setWindowIcon(form->windowIcon());
+    form->show();
+    child->show();
+    child->resize((wanted + child->size() - form->size()).boundedTo(mUi->Children->viewport()->size()));
+    if (const auto place = form->place())
+        child->move(*place);
+    mUi->Children->setActiveSubWindow(child);
+}
+
+void MainScreen::bringUp(Form *form)
+{
+    if (QMdiSubWindow *child = subWindowOf(form)) {
+        child->showNormal();
+        mUi->Children->setActiveSubWindow(child);
+    } else {
+        form->show();
+        form->activateWindow();
+    }
+}
+
+QMdiSubWindow *MainScreen::subWindowOf(Form *form) const
+{
+    return qobject_cast<QMdiSubWindow *>(form->parentWidget());
+}
+
+void MainScreen::bringToFront()
+{
+    if (mTimer1->isActive())
+        return; // the start is still on its way
+    setWindowState(windowState() & ~Qt::WindowMinimized);
+    show();
+    raise();
+    activateWindow();
+}
+
+void MainScreen::closeEvent(QCloseEvent *event)
+{
+    event->setAccepted(Unload());
+}
+
+bool MainScreen::unloadChildren()
+{
+    const auto forms = Form::openForms();
+    for (Form *form : forms) {
+        if (form->Name() != QLatin1String("frmSplash") && !form->Unload())
+            return false;
+    }
+    return true;
+}
+
+bool MainScreen::Unload()
+{
+    if (mUnloaded)
+        return true;
+    if (!unloadChildren())
+        return false;
+    mUnloaded = true;
+    mTimer1->stop();
+    closeCatalogue();
+    const auto forms = Form::openForms();
+    for (Form *form : forms)
+        form->Unload(); // the splash
+    emit unloaded();
+    return true;
+}
+
+void MainScreen::closeCatalogue()
+{
+    if (mDatabaseMissing)
+        return;
+    try {
+        CleanOrphans();
+        if (!gConnection)
+            throw ADODB::makeError(ADODB::errObjectClosed);
+        gConnection->Close();
+        gConnection.reset();
+    } catch (const ADODB::Error &error) {
+        errorBox(error.numbered(), GetMessage("MsgSysErr"));
+        if (gConnection)
+            gConnection->RollbackTrans();
+    }
+}

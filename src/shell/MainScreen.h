@@ -1,0 +1,75 @@
+#pragma once
+
+#include "platform/desktop/form.h"
+#include "shell/services/frame.h"
+#include "shell/startup.h"
+
+#include <QMainWindow>
+#include <memory>
+
+class QMdiSubWindow;
+class QTimer;
+
+namespace ADODB
+{
+class Error;
+}
+namespace Ui
+{
+class MainScreen;
+}
+
+/// The frame and the process: the program starts by loading it and ends when it unloads. It owns the one
+/// connection to the catalogue from its load to its unload, and hosts the modeless screens.
+class MainScreen : public QMainWindow, public Frame, public Form::Host
+{
+    Q_OBJECT
+
+public:
+    explicit MainScreen(bool lastRunBroken = false);
+    ~MainScreen() override;
+
+    /// All of the start but the timer step. False if the program is to end at once.
+    bool Load();
+    bool Unload(); // false if a child refuses
+    void bringToFront();
+
+    // Frame
+    QWidget *window() override { return this; }
+    QSize size() const override { return QMainWindow::size(); }
+    void setImportEnabled(bool enabled) override;
+
+    // Form::Host
+    void adopt(Form *form) override;
+    void bringUp(Form *form) override;
+    QPoint origin() const override { return pos(); }
+
+signals:
+    void languageKnown();
+    void unloaded();
+
+protected:
+    void closeEvent(QCloseEvent *event) override;
+
+private:
+    void setUpControls();
+    void connectActions();
+    void InitMainScreen();
+    void setCaptions();
+    void markLanguage();
+    void showConnectErrors(const ADODB::Error &error);
+    void Timer1_Timer();
+    void openBrowser();
+    void ChangeLanguage(int language);
+    void Over_Click();
+    bool unloadChildren();
+    void closeCatalogue();
+    QMdiSubWindow *subWindowOf(Form *form) const;
+
+    std::unique_ptr<Ui::MainScreen> mUi;
+    QTimer *mTimer1;
+    bool mDatabaseMissing = false;
+    startup::Found mStart;
+    bool mLastRunBroken;
+    bool mUnloaded = false;
+};

@@ -1,0 +1,74 @@
+#include "shell/frmHelp.h"
+
+#include "platform/desktop/desktop.h"
+#include "shell/services/captions.h"
+#include "shell/services/globals.h"
+#include "shell/services/messages.h"
+#include "ui_frmHelp.h"
+
+#include <QCoreApplication>
+#include <QFileInfo>
+#include <QKeyEvent>
+#include <QStandardPaths>
+#include <QUrl>
+
+frmHelp::frmHelp()
+    : Form(QStringLiteral("frmHelp"))
+    , mUi(std::make_unique<Ui::frmHelp>())
+{
+    mUi->setupUi(this);
+    mUi->Picture1->setSource(QStringLiteral(":/icons/songcase.svg"));
+    connect(mUi->Link, &QLabel::linkActivated, this, &frmHelp::Link_Click);
+}
+
+frmHelp::~frmHelp() = default;
+
+QString frmHelp::guideAddress()
+{
+    const QString page = QLatin1String(gLanguage == languageDutch ? "nl" : "en") +
+                         QStringLiteral("/index.html");
+    const QString beside = QCoreApplication::applicationDirPath() +
+                           QStringLiteral("/../share/songcase/guide/") + page;
+    QString file = QFileInfo(beside).canonicalFilePath();
+    if (file.isEmpty())
+        file = QStandardPaths::locate(QStandardPaths::GenericDataLocation,
+                                      QStringLiteral("songcase/guide/") + page);
+    return file.isEmpty() ? QString() : QUrl::fromLocalFile(file).toString();
+}
+
+void frmHelp::Form_Load()
+{
+    applyCaptions(this, {{"lblVisitOurWebsite", "lblVisitOurWebsite"},
+                         {"lblToGetYourHelpOnLine", "lblToGetYourHelpOnLine"}});
+    setWindowTitle(GetMessage("TTHelp"));
+    const QString name = gLanguage == languageDutch ? QStringLiteral("De gids van Liedkist")
+                                                    : QStringLiteral("The guide to Songcase");
+    mUi->Link->setText(QStringLiteral("<a href=\"guide\"><b>") + name + QStringLiteral("</b></a>"));
+    mUi->Link->setAccessibleName(name);
+    mUi->Link->setToolTip(guideAddress());
+}
+
+void frmHelp::Form_Activate()
+{
+    mUi->Link->setFocus();
+}
+
+void frmHelp::keyPressEvent(QKeyEvent *event)
+{
+    if (event->key() == Qt::Key_Escape)
+        Unload();
+    else
+        Form::keyPressEvent(event);
+}
+
+void frmHelp::Link_Click()
+{
+    const QString address = guideAddress();
+    if (address.isEmpty() || !Desktop::current().openAddress(address))
+        errorBox(QStringLiteral("No browser detected!"));
+}
+
+void ShowHelpLinks()
+{
+    defaultInstance<frmHelp>().Show();
+}

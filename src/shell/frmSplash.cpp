@@ -1,0 +1,59 @@
+#include "shell/frmSplash.h"
+
+#include "shell/services/messages.h"
+#include "ui_frmSplash.h"
+
+#include <QScreen>
+
+namespace
+{
+
+// Light on the dark ground of the picture, whatever the palette of the desktop is.
+void setLight(QLabel *label, qreal scale, int alpha)
+{
+    QFont font = label->font();
+    font.setPointSizeF(font.pointSizeF() * scale);
+    font.setBold(scale > 1.5);
+    label->setFont(font);
+    QPalette palette = label->palette();
+    palette.setColor(QPalette::WindowText, QColor(255, 246, 230, alpha));
+    label->setPalette(palette);
+}
+
+} // namespace
+
+frmSplash::frmSplash()
+    : Form(QStringLiteral("frmSplash"))
+    , mUi(std::make_unique<Ui::frmSplash>())
+{
+    mUi->setupUi(this);
+    setWindowFlags(Qt::SplashScreen | Qt::FramelessWindowHint);
+    setFixedSize(size());
+    mUi->Picture1->setSource(QStringLiteral(":/splash/splash.svg"));
+    setLight(mUi->lblProgram, 2.0, 255);
+    setLight(mUi->lblVersion, 1.1, 220);
+    setLight(mUi->lblAuthor, 1.0, 200);
+    connect(mUi->Picture1, &SvgPicture::Click, this, &Form::Unload);
+}
+
+frmSplash::~frmSplash() = default;
+
+void frmSplash::Form_Load()
+{
+    const QString name = GetMessage("MainScreen.Caption");
+    setWindowTitle(name);
+    mUi->lblProgram->setText(name);
+    mUi->lblVersion->setText(QStringLiteral("Version " SONGCASE_VERSION));
+    mUi->Picture1->setAccessibleName(name);
+    move(screen()->availableGeometry().center() - rect().center());
+}
+
+void frmSplash::setAuthor(const QString &text)
+{
+    mUi->lblAuthor->setText(text);
+}
+
+void frmSplash::keyPressEvent(QKeyEvent *)
+{
+    Unload();
+}

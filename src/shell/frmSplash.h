@@ -1,0 +1,29 @@
+#pragma once
+
+#include "platform/desktop/form.h"
+
+#include <memory>
+
+namespace Ui
+{
+class frmSplash;
+}
+
+/// The picture at the start, and the About screen. A key or a click closes it.
+class frmSplash : public Form
+{
+    Q_OBJECT
+
+public:
+    frmSplash();
+    ~frmSplash() override;
+
+    void setAuthor(const QString &text);
+
+protected:
+    void Form_Load() override;
+    void keyPressEvent(QKeyEvent *event) override;
+
+private:
+    std::unique_ptr<Ui::frmSplash> mUi;
+};

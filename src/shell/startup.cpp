@@ -1,0 +1,144 @@
+#include "shell/startup.h"
+
+#include "catalogue/cataloguefile.h"
+#include "catalogue/connect.h"
+#include "platform/ado/connection.h"
+#include "platform/ado/value.h"
+#include "platform/text/textrules.h"
+#include "shell/services/clsRegistry.h"
+#include "shell/services/fileutilities.h"
+#include "shell/services/globals.h"
+#include "shell/services/messages.h"
+
+#include <QDir>
+
+namespace startup
+{
+
+namespace
+{
+
+constexpr int currentGeneration = 4;
+
+QString read(clsRegistry &settings, const char *name)
+{
+    return settings.GetValue(settingsReadKey, QLatin1String(name)).toString();
+}
+
+void write(clsRegistry &settings, const char *name, int value)
+{
+    settings.SetValue(settingsKey, QLatin1String(name), value);
+}
+
+void writeFirst(clsRegistry &settings, const char *name, int value)
+{
+    settings.CreateKey(settingsKey);
+    write(settings, name, value);
+}
+
+int number(const QString &text)
+{
+    const qint64 value = ADODB::Value(text).toLong();
+    if (value != int(value))
+        throw ADODB::makeError(ADODB::errOverflow);
+    return int(value);
+}
+
+int countSession(clsRegistry &settings)
+{
+    const QString stored = read(settings, "Session");
+    if (!text::isNumeric(stored)) {
+        writeFirst(settings, "Session", 1);
+        return 1;
+    }
+    const int session = number(stored) + 1;
+    write(settings, "Session", session);
+    return session;
+}
+
+void readLanguage(clsRegistry &settings)
+{
+    const QString stored = read(settings, "Language");
+    if (!text::isNumeric(stored)) {
+        gLanguage = languageEnglish;
+        writeFirst(settings, "Language", gLanguage);
+        return;
+    }
+    const qint64 language = ADODB::Value(stored).toLong();
+    gLanguage = language == languageDutch ? languageDutch : languageEnglish;
+    if (language != gLanguage)
+        write(settings, "Language", gLanguage);
+}
+
+bool oldCatalogueIn(const QString &folder)
+{
+    return FileExists(folder + QDir::separator() + QStringLiteral("Compact.orv")) ||
+           FileExists(folder + QDir::separator() + QStringLiteral("Compact3.orv"));
+}
+
+void readGeneration(clsRegistry &settings, const QString &programFolder, Found &found)
+{
+    const QString stored = read(settings, "DBVersion");
+    if (!text::isNumeric(stored)) {
+        writeFirst(settings, "DBVersion", currentGeneration);
+        found.conversionPending = oldCatalogueIn(programFolder);
+        return;
+    }
+    found.dbVersion = number(stored);
+    if (found.dbVersion < currentGeneration) {
+        settings.SetValue(QStringLiteral("Software\\Orvanta Software\\Songcase"),
+                          QStringLiteral("DBVersion"), currentGeneration);
+        found.conversionPending = true;
+    }
+}
+
+} // namespace
+
+Found readSettings(const QString &programFolder)
+{
+    clsRegistry settings;
+    Found found;
+    found.session = countSession(settings);
+    readLanguage(settings);
+    ADODB::setErrorLanguage(gLanguage);
+    readGeneration(settings, programFolder, found);
+    found.useProxy = ReadProxySettings();
+    return found;
+}
+
+int storedLanguage()
+{
+    clsRegistry settings;
+    const bool dutch = read(settings, "Language") == QString::number(languageDutch);
+    return dutch ? languageDutch : languageEnglish;
+}
+
+QString ReadProxySettings()
+{
+    clsRegistry settings;
+    const QString useProxy = read(settings, "UseProxy");
+    gUseProxy = useProxy == QLatin1String("1");
+    gProxyServer = gUseProxy ? read(settings, "ProxyServer") : QString();
+    gProxyPassword = gUseProxy ? read(settings, "ProxyPassword") : QString();
+    gProxyUserName = gUseProxy ? read(settings, "ProxyUserName") : QString();
+    gProxyServerPort = gUseProxy ? read(settings, "ProxyServerPort") : QStringLiteral("0");
+    return useProxy;
+}
+
+void openCatalogue(const QString &file, bool lastRunBroken)
+{
+    gConnection = std::make_unique<ADODB::Connection>();
+    configureConnection(*gConnection, file);
+    try {
+        cataloguefile::inspect(file);
+        gConnection->Open();
+        cataloguefile::verify(*gConnection, lastRunBroken);
+    } catch (const ADODB::Error &error) {
+        gConnection->Errors.assign(1, error);
+        if (gConnection->State() == ADODB::adStateOpen)
+            gConnection->Close();
+        throw;
+    }
+}
+
+} // namespace startup

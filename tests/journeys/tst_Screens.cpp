@@ -1,0 +1,129 @@
+// Label: journey
+#include "collection/frmCDList.h"
+#include "platform/ado/connection.h"
+#include "shell/frmHelp.h"
+#include "shell/frmSplash.h"
+#include "shell/services/globals.h"
+#include "shell/services/messages.h"
+#include "support/scripteddesktop.h"
+#include "support/testcatalogue.h"
+#include "textimport/frmImport.h"
+#include "textimport/frmImportBusy.h"
+#include "textimport/frmImportDBBusy.h"
+#include "textimport/frmImportWizard.h"
+
+#include <QAbstractButton>
+#include <QAbstractItemView>
+#include <QLabel>
+#include <QLineEdit>
+#include <QProgressBar>
+#include <QStyle>
+#include <QTest>
+#include <QTimer>
+#include <functional>
+
+/// What holds for every screen in both languages: each text comes from the table, is shown whole, and each
+/// control has a name that a screen reader can say.
+class tst_Screens : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void everyScreen_data();
+    void everyScreen();
+};
+
+namespace
+{
+
+using Make = std::function<Form *()>;
+
+template <typename Screen>
+Make make()
+{
+    return [] { return new Screen; };
+}
+
+QString textOf(const QWidget *w)
+{
+    return w->property("text").toString() + w->property("title").toString() + w->windowTitle() +
+           w->toolTip() + w->accessibleName();
+}
+
+bool needsName(const QWidget *w)
+{
+    return qobject_cast<const QAbstractButton *>(w) || qobject_cast<const QLineEdit *>(w) ||
+           qobject_cast<const QAbstractItemView *>(w) || qobject_cast<const QProgressBar *>(w);
+}
+
+bool hasName(const QWidget *w, const QWidget *screen)
+{
+    const auto *button = qobject_cast<const QAbstractButton *>(w);
+    if (!w->accessibleName().isEmpty() || (button && !button->text().isEmpty()))
+        return true;
+    const auto labels = screen->findChildren<QLabel *>();
+    return std::any_of(labels.begin(), labels.end(), [w](QLabel *l) { return l->buddy() == w; });
+}
+
+bool isCut(const QWidget *w)
+{
+    if (const auto *label = qobject_cast<const QLabel *>(w); label && label->wordWrap())
+        return label->heightForWidth(label->width()) > label->height();
+    if (!qobject_cast<const QLabel *>(w) && !qobject_cast<const QAbstractButton *>(w))
+        return false;
+    return w->sizeHint().width() > w->width() || w->sizeHint().height() > w->height();
+}
+
+bool isPartOfAnother(const QWidget *w)
+{
+    return w->objectName().isEmpty() || w->objectName().startsWith(QLatin1String("qt_"));
+}
+
+} // namespace
+
+void tst_Screens::everyScreen_data()
+{
+    QTest::addColumn<int>("language");
+    QTest::addColumn<Make>("make");
+    const std::pair<const char *, Make> screens[] = {
+        {"frmSplash", make<frmSplash>()},           {"frmHelp", make<frmHelp>()},
+        {"frmCDList", make<frmCDList>()},           {"frmImportWizard", make<frmImportWizard>()},
+        {"frmImportBusy", make<frmImportBusy>()},   {"frmImport", make<frmImport>()},
+        {"frmImportDBBusy", make<frmImportDBBusy>()}};
+    for (const auto &[name, make] : screens) {
+        QTest::newRow(QByteArray(name) + ", English") << languageEnglish << make;
+        QTest::newRow(QByteArray(name) + ", Dutch") << languageDutch << make;
+    }
+}
+
+void tst_Screens::everyScreen()
+{
+    QFETCH(int, language);
+    QFETCH(Make, make);
+    gLanguage = language;
+    ScriptedDesktop desktop;
+    TestCatalogue catalogue;
+    Form *screen = make();
+    QCOMPARE(screen->Name(), QString::fromLatin1(QTest::currentDataTag()).section(QLatin1Char(','), 0, 0));
+    for (QTimer *timer : screen->findChildren<QTimer *>())
+        timer->stop();
+    screen->Show();
+    QVERIFY(QTest::qWaitForWindowExposed(screen));
+    QVERIFY2(!screen->windowTitle().isEmpty(), "a window without a title");
+
+    for (const QWidget *w : screen->findChildren<QWidget *>()) {
+        const QByteArray name = w->objectName().toLatin1();
+        const QString text = textOf(w);
+        QVERIFY2(!text.contains(QLatin1String("Unknown")) && !text.contains(QLatin1String("Onbekend")), name);
+        if (isPartOfAnother(w) || !w->isVisible())
+            continue;
+        QVERIFY2(!needsName(w) || hasName(w, screen), name + ": no name for a screen reader");
+        QVERIFY2(!isCut(w), name + ": text cut: " + text.toUtf8());
+    }
+    screen->Unload();
+    QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+}
+
+
+QTEST_MAIN(tst_Screens)
+#include "tst_Screens.moc"
