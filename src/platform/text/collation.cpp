@@ -4,12 +4,15 @@
 #include <stdexcept>
 #include <string>
 #include <unicode/ucol.h>
+#include <unicode/uiter.h>
 
 namespace text
 {
 
 namespace
 {
+
+constexpr unsigned latinEnd = 0x250;
 
 UCollator *openRoot(UCollationStrength strength)
 {
@@ -25,6 +28,19 @@ UCollator *openRoot(UCollationStrength strength)
 UCollationResult compareUnits(const UCollator *collator, char16_t a, char16_t b)
 {
     return ucol_strcoll(collator, &a, 1, &b, 1);
+}
+
+/// The character at a place if it is ASCII or one of the Latin letters with accents, which take two
+/// bytes; otherwise the end of these.
+unsigned latinAt(std::string_view s, std::size_t at)
+{
+    const auto byte = [&](std::size_t i) { return static_cast<unsigned char>(s[i]); };
+    const unsigned lead = byte(at);
+    if (lead < 0x80)
+        return lead;
+    const bool pair = at + 1 < s.size() && (byte(at + 1) & 0xC0) == 0x80;
+    const unsigned c = (lead & 0x1F) << 6 | (pair ? byte(at + 1) & 0x3F : 0);
+    return pair && lead >= 0xC3 && lead < 0xE0 && c < latinEnd ? c : latinEnd;
 }
 
 } // namespace
@@ -108,22 +124,33 @@ int Collation::compare(std::string_view a, std::string_view b) const
                             &status);
 }
 
-bool Collation::sortPrefix(std::string_view s, std::uint64_t &prefix) const
+bool Collation::sortPrefix(std::string_view s, std::uint64_t &prefix, std::size_t &used) const
 {
     prefix = 0;
-    std::size_t i = 0;
-    for (int shift = 56; shift >= 0; shift -= 8) {
-        if (i >= s.size())
-            return true;
-        unsigned c = static_cast<unsigned char>(s[i++]);
-        if (c >= 0xC3 && c < 0xE0 && i < s.size())
-            c = (c & 0x1F) << 6 | (static_cast<unsigned char>(s[i++]) & 0x3F);
-        if (c >= latinEnd || (c >= 0x80 && c < 0xC0) || mLatinRank[c] == 0)
+    used = 0;
+    for (int shift = 56; shift >= 0 && used < s.size(); shift -= 8) {
+        const unsigned c = latinAt(s, used);
+        if (c >= latinEnd || mLatinRank[c] == 0)
             return false;
+        used += c < 0x80 ? 1 : 2;
         prefix |= std::uint64_t(mLatinRank[c]) << shift;
     }
     // A mark behind the last letter could still change it.
-    return i >= s.size() || !(s[i] & 0x80);
+    return used >= s.size() || latinAt(s, used) < latinEnd;
+}
+
+std::uint64_t Collation::sortKeyStart(std::string_view s) const
+{
+    UCharIterator characters;
+    uiter_setUTF8(&characters, s.data(), int32_t(s.size()));
+    std::array<std::uint8_t, 8> bytes{};
+    std::array<std::uint32_t, 2> state{};
+    UErrorCode status = U_ZERO_ERROR;
+    ucol_nextSortKeyPart(mCollator, &characters, state.data(), bytes.data(), bytes.size(), &status);
+    std::uint64_t start = 0;
+    for (const std::uint8_t byte : bytes)
+        start = start << 8 | byte;
+    return start;
 }
 
 } // namespace text

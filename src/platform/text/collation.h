@@ -23,8 +23,14 @@ public:
     int compare(std::string_view a, std::string_view b) const;
 
     /// A number that sorts as the start of the text does, for sorting long lists: different numbers
-    /// decide, equal ones leave it to compare(). False if the text has no such number.
-    bool sortPrefix(std::string_view s, std::uint64_t &prefix) const;
+    /// decide, equal ones leave it to the rest of the texts, from the byte `used` on; the last byte
+    /// of the number is 0 if there is none. Once all of two texts are equal so, compare() decides.
+    /// False if the text has no such number: it holds more than Latin letters and ASCII.
+    bool sortPrefix(std::string_view s, std::uint64_t &prefix, std::size_t &used) const;
+
+    /// The same for any text, more slowly: the first eight bytes of its sort key. Not to be mixed
+    /// with those of sortPrefix(); equal ones leave it to compare().
+    std::uint64_t sortKeyStart(std::string_view s) const;
 
     /// The version of the order's tables, 24 bits. Indexes made under another one are not usable.
     std::uint32_t version() const { return mVersion; }
@@ -37,8 +43,6 @@ private:
     ~Collation();
     void rankCharacters();
     void rankAccented();
-
-    static constexpr unsigned latinEnd = 0x250;
 
     UCollator *mCollator = nullptr;
     std::uint32_t mVersion = 0;

@@ -1,0 +1,600 @@
+#include "controls/DBListViewCTL.h"
+
+#include "controls/keycodes.h"
+#include "controls/listmodel.h"
+#include "controls/rowdelegate.h"
+#include "controls/rowdrag.h"
+
+#include <QAccessible>
+#include <QApplication>
+#include <QClipboard>
+#include <QHeaderView>
+#include <QMouseEvent>
+#include <QPainter>
+#include <QPointer>
+#include <QScrollBar>
+#include <QStyleOption>
+
+#include <algorithm>
+
+namespace
+{
+
+constexpr int defaultColumnWidth = 96;
+constexpr int dropShade = 80; // of 255, over the row
+
+int buttonOf(Qt::MouseButton button)
+{
+    if (button == Qt::RightButton)
+        return 2;
+    return button == Qt::LeftButton ? 1 : 4;
+}
+
+/// F1 to F8 and the commands on Insert are the menu's.
+bool isMenuKey(const QKeyEvent &event)
+{
+    const bool insert = event.key() == Qt::Key_Insert;
+    return (event.key() >= Qt::Key_F1 && event.key() <= Qt::Key_F8) ||
+           (insert && shiftStateOf(event.modifiers()) != 0);
+}
+
+qsizetype rowsIn(const QItemSelection &selection)
+{
+    qsizetype rows = 0;
+    for (const QItemSelectionRange &range : selection)
+        rows += range.height();
+    return rows;
+}
+
+bool isPrintable(const QString &text)
+{
+    return !text.isEmpty() && text.front().isPrint();
+}
+
+} // namespace
+
+DBListViewCTL::DBListViewCTL(QWidget *parent)
+    : QTableView(parent), mModel(new ListModel(this)), mDrag(new RowDrag(this))
+{
+    setModel(mModel);
+    setItemDelegate(new RowDelegate(this));
+    setSelectionBehavior(SelectRows);
+    setSelectionMode(ExtendedSelection);
+    setEditTriggers(NoEditTriggers);
+    setTabKeyNavigation(false);
+    setShowGrid(false);
+    setWordWrap(false);
+    setHorizontalScrollMode(ScrollPerPixel);
+    setUpHeaders();
+    fitRowHeight();
+    connect(mModel, &ListModel::checkToggled, this,
+            [this](int record) { emit ItemCheck(itemAt(mModel->rowOf(record))); });
+}
+
+DBListViewCTL::~DBListViewCTL() = default;
+
+void DBListViewCTL::setUpHeaders()
+{
+    verticalHeader()->hide();
+    verticalHeader()->setSectionResizeMode(QHeaderView::Fixed);
+    verticalHeader()->setMinimumSectionSize(1);
+
+    QHeaderView *head = horizontalHeader();
+    head->setDefaultAlignment(Qt::AlignLeft | Qt::AlignVCenter);
+    head->setDefaultSectionSize(defaultColumnWidth);
+    head->setMinimumSectionSize(1);
+    head->setHighlightSections(false);
+    head->setSectionsClickable(true);
+    head->setSortIndicatorShown(true);
+    showSortMark();
+    // A table selects a whole column otherwise.
+    disconnect(head, &QHeaderView::sectionPressed, this, nullptr);
+    disconnect(head, &QHeaderView::sectionEntered, this, nullptr);
+    connect(head, &QHeaderView::sectionClicked, this, [this](int column) {
+        showSortMark(); // the header has moved it on its own
+        emit ColumnClick(column + 1);
+    });
+}
+
+void DBListViewCTL::fitRowHeight()
+{
+    const int text = fontMetrics().height();
+    const int box =
+        CheckBoxes() ? style()->pixelMetric(QStyle::PM_IndicatorHeight, nullptr, this) : 0;
+    verticalHeader()->setDefaultSectionSize(std::max(text, box) + 4);
+}
+
+void DBListViewCTL::setRecordset(ADODB::RecordsetPtr recordset)
+{
+    mRecordset = std::move(recordset);
+}
+
+void DBListViewCTL::Populate()
+{
+    auto rows = mRecordset ? mRecordset->rows() : nullptr;
+    mSorted = false;
+    mTyped.clear();
+    mModel->fill(std::move(rows));
+    for (int column = 0; column < mModel->columnCount(); ++column) {
+        setColumnHidden(column, false);
+        setColumnWidth(column, defaultColumnWidth);
+    }
+    columnsChanged();
+    showSortMark();
+    makeCurrent(0);
+}
+
+ListItem DBListViewCTL::itemAt(int row)
+{
+    if (row < 0 || row >= mModel->rowCount())
+        return {};
+    return {this, mModel->recordAt(row), mModel->filling()};
+}
+
+int DBListViewCTL::rowOf(const ListItem &item) const
+{
+    return item && item.mList == this ? mModel->rowOf(item.mRecord) : -1;
+}
+
+QModelIndex DBListViewCTL::shownIndex(int row) const
+{
+    int column = 0;
+    while (column < mModel->columnCount() && isColumnHidden(column))
+        ++column;
+    return mModel->index(row, column < mModel->columnCount() ? column : 0);
+}
+
+ListItem DBListViewCTL::SelectedItem()
+{
+    return itemAt(currentIndex().row());
+}
+
+void DBListViewCTL::setSelectedItem(const ListItem &item)
+{
+    makeCurrent(rowOf(item));
+}
+
+void DBListViewCTL::makeCurrent(int row)
+{
+    const QModelIndex index = shownIndex(row);
+    if (!index.isValid()) {
+        selectionModel()->clear();
+        return;
+    }
+    selectionModel()->setCurrentIndex(index, QItemSelectionModel::ClearAndSelect |
+                                                 QItemSelectionModel::Rows);
+    scrollTo(index);
+}
+
+// Rows beside selected ones widen their range, so that a screen that selects many rows one by one
+// makes few ranges.
+void DBListViewCTL::setRowSelected(int row, bool selected)
+{
+    const auto command = selected ? QItemSelectionModel::Select : QItemSelectionModel::Deselect;
+    int top = row, bottom = row;
+    const bool currentIsSelected = selectionModel()->isSelected(currentIndex());
+    if (selected) {
+        for (const QItemSelectionRange &range : selectionModel()->selection()) {
+            if (range.bottom() == row - 1)
+                top = range.top();
+            if (range.top() == row + 1)
+                bottom = range.bottom();
+        }
+    }
+    const QItemSelection rows(mModel->index(top, 0), mModel->index(bottom, 0));
+    selectionModel()->select(rows, command | QItemSelectionModel::Rows);
+    if (selected && !currentIsSelected)
+        selectionModel()->setCurrentIndex(shownIndex(row), QItemSelectionModel::NoUpdate);
+}
+
+void DBListViewCTL::setDropHighlight(const ListItem &item)
+{
+    mDropHighlight = item;
+    viewport()->update();
+}
+
+ListItem DBListViewCTL::HitTest(int x, int y)
+{
+    const QPoint at(x, y);
+    return viewport()->rect().contains(at) ? itemAt(indexAt(at).row()) : ListItem();
+}
+
+void DBListViewCTL::setSorted(bool sorted)
+{
+    mSorted = sorted;
+    applyOrder();
+}
+
+void DBListViewCTL::setSortKey(int column)
+{
+    mSortKey = column;
+    applyOrder();
+}
+
+void DBListViewCTL::applyOrder()
+{
+    const bool possible = mSortKey >= 0 && mSortKey < mModel->columnCount();
+    const int column = mSorted && possible ? mSortKey : -1;
+    if (!mModel->hasOrderOf(column)) {
+        const ListItem current = SelectedItem();
+        const QModelIndex cell = currentIndex();
+        const std::vector<bool> selected = selectedRecords();
+        selectionModel()->reset();
+        mModel->sortBy(column);
+        selectRecords(selected);
+        if (current)
+            selectionModel()->setCurrentIndex(mModel->index(rowOf(current), cell.column()),
+                                              QItemSelectionModel::NoUpdate);
+        viewport()->update();
+    }
+    showSortMark();
+}
+
+// One bit for each record; none at all if no row is selected.
+std::vector<bool> DBListViewCTL::selectedRecords() const
+{
+    std::vector<bool> selected;
+    for (const QItemSelectionRange &range : selectionModel()->selection()) {
+        selected.resize(std::size_t(mModel->rowCount()));
+        for (int row = range.top(); row <= range.bottom(); ++row)
+            selected[std::size_t(mModel->recordAt(row))] = true;
+    }
+    return selected;
+}
+
+void DBListViewCTL::selectRecords(const std::vector<bool> &selected)
+{
+    const auto isSelected = [&](int row) { return selected[std::size_t(mModel->recordAt(row))]; };
+    QItemSelection ranges;
+    const int rows = int(selected.size());
+    for (int top = 0; top < rows; ++top) {
+        if (!isSelected(top))
+            continue;
+        int end = top + 1;
+        while (end < rows && isSelected(end))
+            ++end;
+        ranges.select(mModel->index(top, 0), mModel->index(end - 1, mModel->columnCount() - 1));
+        top = end;
+    }
+    selectionModel()->select(ranges, QItemSelectionModel::Select);
+}
+
+void DBListViewCTL::showSortMark()
+{
+    const bool shown = mSorted && mSortKey < mModel->columnCount();
+    horizontalHeader()->setSortIndicator(shown ? mSortKey : -1, Qt::AscendingOrder);
+}
+
+int DBListViewCTL::columnWidthOf(int column) const
+{
+    return isColumnHidden(column) ? 0 : columnWidth(column);
+}
+
+void DBListViewCTL::setColumnWidthOf(int column, int width)
+{
+    setColumnHidden(column, width <= 0);
+    if (width > 0)
+        setColumnWidth(column, width);
+    columnsChanged();
+}
+
+// The current cell and the check boxes are always in a column that shows.
+void DBListViewCTL::columnsChanged()
+{
+    const int first = shownIndex(0).isValid() ? shownIndex(0).column() : 0;
+    if (CheckBoxes())
+        mModel->setCheckColumn(first);
+    const QModelIndex current = currentIndex();
+    if (current.isValid() && isColumnHidden(current.column()))
+        selectionModel()->setCurrentIndex(shownIndex(current.row()), QItemSelectionModel::NoUpdate);
+}
+
+bool DBListViewCTL::CheckBoxes() const
+{
+    return mModel->checkColumn() >= 0;
+}
+
+void DBListViewCTL::setCheckBoxes(bool on)
+{
+    mModel->setCheckColumn(on ? 0 : -1);
+    columnsChanged();
+    fitRowHeight();
+}
+
+void DBListViewCTL::Drag(int action)
+{
+    if (action == 1)
+        mDrag->begin();
+    else
+        mDrag->end();
+}
+
+void DBListViewCTL::setDragIcon(const QCursor &cursor)
+{
+    mDrag->setCursor(cursor);
+}
+
+// Sideways the list stays where the user has put it.
+void DBListViewCTL::scrollTo(const QModelIndex &index, ScrollHint hint)
+{
+    const int left = horizontalScrollBar()->value();
+    QTableView::scrollTo(shownIndex(index.row()), hint);
+    horizontalScrollBar()->setValue(left);
+}
+
+QModelIndex DBListViewCTL::moveCursor(CursorAction action, Qt::KeyboardModifiers)
+{
+    const QModelIndex current = currentIndex();
+    const int last = mModel->rowCount() - 1;
+    if (!current.isValid())
+        return shownIndex(0);
+    const int page = std::max(1, viewport()->height() / rowHeight(0) - 1);
+    const auto to = [&](int row) { return current.siblingAtRow(std::clamp(row, 0, last)); };
+    switch (action) {
+    case MoveUp:
+    case MovePrevious:
+        return to(current.row() - 1);
+    case MoveDown:
+    case MoveNext:
+        return to(current.row() + 1);
+    case MovePageUp:
+        return to(current.row() - page);
+    case MovePageDown:
+        return to(current.row() + page);
+    case MoveHome:
+        return to(0);
+    case MoveEnd:
+        return to(last);
+    default:
+        return current;
+    }
+}
+
+// A table would list every selected cell for assistive tools.
+void DBListViewCTL::selectionChanged(const QItemSelection &selected, const QItemSelection &old)
+{
+    constexpr qsizetype many = 1000;
+    if (!QAccessible::isActive() || rowsIn(selected) + rowsIn(old) < many) {
+        QTableView::selectionChanged(selected, old);
+        return;
+    }
+    QAbstractItemView::selectionChanged(selected, old);
+    QAccessibleEvent event(this, QAccessible::SelectionWithin);
+    QAccessible::updateAccessibility(&event);
+}
+
+void DBListViewCTL::keyPressEvent(QKeyEvent *event)
+{
+    const QPointer<DBListViewCTL> self(this);
+    if (mDrag->running() && event->key() == Qt::Key_Escape) {
+        mDrag->end();
+        return;
+    }
+    if (isMenuKey(*event)) {
+        event->ignore();
+        return;
+    }
+    if (const int code = keyCodeOf(event->key()))
+        emit KeyDown(code, shiftStateOf(event->modifiers()));
+    if (self && isEnabled() && !actOnKey(event))
+        QTableView::keyPressEvent(event);
+}
+
+bool DBListViewCTL::actOnKey(QKeyEvent *event)
+{
+    const bool plain = shiftStateOf(event->modifiers()) == 0;
+    const bool typing =
+        !mTyped.isEmpty() && !mTypedAt.hasExpired(QApplication::keyboardInputInterval());
+    if (event->matches(QKeySequence::Copy)) {
+        copySelected();
+    } else if (event->key() == Qt::Key_Space && plain && typing) {
+        keyboardSearch(event->text());
+    } else if (event->key() == Qt::Key_Space && plain && CheckBoxes()) {
+        toggleCheck(currentIndex());
+    } else if (event->key() == Qt::Key_Left && plain) {
+        horizontalScrollBar()->triggerAction(QScrollBar::SliderSingleStepSub);
+    } else if (event->key() == Qt::Key_Right && plain) {
+        horizontalScrollBar()->triggerAction(QScrollBar::SliderSingleStepAdd);
+    } else if (!event->text().isEmpty() && !isPrintable(event->text()) &&
+               !event->matches(QKeySequence::SelectAll) && event->key() != Qt::Key_Return &&
+               event->key() != Qt::Key_Enter) {
+        event->ignore(); // Esc, Delete and their like would be taken for typing
+    } else {
+        return false;
+    }
+    return true;
+}
+
+void DBListViewCTL::keyReleaseEvent(QKeyEvent *event)
+{
+    QTableView::keyReleaseEvent(event);
+    const int code = keyCodeOf(event->key());
+    if (code != 0 && !event->isAutoRepeat() && !isMenuKey(*event))
+        emit KeyUp(code, shiftStateOf(event->modifiers()));
+}
+
+void DBListViewCTL::keyboardSearch(const QString &typed)
+{
+    const bool continues =
+        !mTyped.isEmpty() && !mTypedAt.hasExpired(QApplication::keyboardInputInterval());
+    if (!isPrintable(typed) || (!continues && typed.trimmed().isEmpty()))
+        return;
+    mTyped = continues ? QString(mTyped + typed) : typed;
+    mTypedAt.start();
+    // One letter typed again and again visits all rows that start with it.
+    const bool one = std::all_of(mTyped.begin(), mTyped.end(), [this](QChar c) {
+        return c.toCaseFolded() == mTyped[0].toCaseFolded();
+    });
+    const int current = currentIndex().row();
+    const int found =
+        one ? searchFrom(current + 1, mTyped.left(1)) : searchFrom(std::max(current, 0), mTyped);
+    if (found >= 0)
+        makeCurrent(found);
+}
+
+int DBListViewCTL::searchFrom(int row, const QString &text) const
+{
+    const bool sorted = mSorted && mSortKey < mModel->columnCount() && !isColumnHidden(mSortKey);
+    const int column = sorted ? mSortKey : shownIndex(0).column();
+    const int rows = mModel->rowCount();
+    for (int i = 0; i < rows; ++i) {
+        const int at = (row + i) % rows;
+        if (mModel->startsWith(mModel->recordAt(at), column, text))
+            return at;
+    }
+    return -1;
+}
+
+void DBListViewCTL::copySelected() const
+{
+    std::vector<std::pair<int, int>> ranges;
+    for (const QItemSelectionRange &range : selectionModel()->selection())
+        ranges.emplace_back(range.top(), range.bottom());
+    std::sort(ranges.begin(), ranges.end());
+    QString text;
+    for (const auto &[top, bottom] : ranges) {
+        for (int row = top; row <= bottom; ++row)
+            appendLine(text, mModel->recordAt(row));
+    }
+    if (!text.isEmpty())
+        QApplication::clipboard()->setText(text);
+}
+
+void DBListViewCTL::appendLine(QString &text, int record) const
+{
+    bool first = true;
+    for (int column = 0; column < mModel->columnCount(); ++column) {
+        if (isColumnHidden(column))
+            continue;
+        if (!first)
+            text += u'\t';
+        first = false;
+        QString cell = mModel->text(record, column);
+        for (const QChar separator : {u'\t', u'\n', u'\r'})
+            cell.replace(separator, u' ');
+        text += cell;
+    }
+    text += u'\n';
+}
+
+void DBListViewCTL::toggleCheck(const QModelIndex &index)
+{
+    const QModelIndex cell = index.siblingAtColumn(mModel->checkColumn());
+    const bool checked = cell.data(Qt::CheckStateRole).toInt() == Qt::Checked;
+    mModel->setData(cell, checked ? Qt::Unchecked : Qt::Checked, Qt::CheckStateRole);
+}
+
+bool DBListViewCTL::onCheckBox(const QModelIndex &index, QPoint at) const
+{
+    if (!index.isValid() || index.column() != mModel->checkColumn())
+        return false;
+    QStyleOptionViewItem option;
+    initViewItemOption(&option);
+    option.rect = visualRect(index);
+    option.features |= QStyleOptionViewItem::HasCheckIndicator;
+    return style()
+        ->subElementRect(QStyle::SE_ItemViewItemCheckIndicator, &option, this)
+        .contains(at);
+}
+
+void DBListViewCTL::mousePressEvent(QMouseEvent *event)
+{
+    const QPointer<DBListViewCTL> self(this);
+    const QPoint at = event->position().toPoint();
+    emit MouseDown(buttonOf(event->button()), shiftStateOf(event->modifiers()), at.x(), at.y());
+    if (!self || mDrag->running())
+        return;
+    const QModelIndex index = indexAt(at);
+    mCheckPressed = event->button() == Qt::LeftButton && onCheckBox(index, at);
+    if (mCheckPressed) {
+        toggleCheck(index);
+        return;
+    }
+    QTableView::mousePressEvent(event);
+    if (index.isValid())
+        emit ItemClick(itemAt(index.row()));
+}
+
+void DBListViewCTL::mouseMoveEvent(QMouseEvent *event)
+{
+    if (mDrag->running())
+        mDrag->pointerMoved(event->position().toPoint());
+    else if (!mCheckPressed)
+        QTableView::mouseMoveEvent(event);
+}
+
+void DBListViewCTL::mouseReleaseEvent(QMouseEvent *event)
+{
+    if (mDrag->running())
+        mDrag->released(event->position().toPoint());
+    else if (!mCheckPressed)
+        QTableView::mouseReleaseEvent(event);
+    mCheckPressed = false;
+}
+
+void DBListViewCTL::mouseDoubleClickEvent(QMouseEvent *event)
+{
+    const QModelIndex index = indexAt(event->position().toPoint());
+    if (event->button() == Qt::LeftButton && onCheckBox(index, event->position().toPoint())) {
+        mCheckPressed = true;
+        toggleCheck(index);
+        return;
+    }
+    QTableView::mouseDoubleClickEvent(event);
+    if (event->button() == Qt::LeftButton && index.isValid())
+        emit DblClick();
+}
+
+void DBListViewCTL::focusInEvent(QFocusEvent *event)
+{
+    QTableView::focusInEvent(event);
+    if (event->reason() != Qt::PopupFocusReason)
+        emit GotFocus();
+}
+
+void DBListViewCTL::focusOutEvent(QFocusEvent *event)
+{
+    QTableView::focusOutEvent(event);
+    if (event->reason() != Qt::PopupFocusReason)
+        emit LostFocus();
+}
+
+void DBListViewCTL::hideEvent(QHideEvent *event)
+{
+    mDrag->end();
+    QTableView::hideEvent(event);
+}
+
+void DBListViewCTL::changeEvent(QEvent *event)
+{
+    QTableView::changeEvent(event);
+    if (event->type() == QEvent::FontChange || event->type() == QEvent::StyleChange)
+        fitRowHeight();
+}
+
+void DBListViewCTL::paintEvent(QPaintEvent *event)
+{
+    QTableView::paintEvent(event);
+    QPainter painter(viewport());
+    if (const int row = rowOf(mDropHighlight); row >= 0) {
+        QColor shade = palette().color(QPalette::Highlight);
+        painter.setPen(shade);
+        shade.setAlpha(dropShade);
+        painter.setBrush(shade);
+        painter.drawRect(rowRect(row).adjusted(0, 0, -1, -1));
+    }
+    if (hasFocus() && currentIndex().isValid()) {
+        QStyleOptionFocusRect option;
+        option.initFrom(this);
+        option.rect = rowRect(currentIndex().row());
+        option.state |= QStyle::State_KeyboardFocusChange;
+        option.backgroundColor = palette().color(QPalette::Base);
+        style()->drawPrimitive(QStyle::PE_FrameFocusRect, &option, &painter, this);
+    }
+}
+
+QRect DBListViewCTL::rowRect(int row) const
+{
+    const int width = std::max(horizontalHeader()->length() - horizontalHeader()->offset(), 0);
+    return {0, rowViewportPosition(row), std::min(width, viewport()->width()), rowHeight(row)};
+}
