@@ -1,0 +1,44 @@
+#pragma once
+
+#include "platform/ado/rows.h"
+#include "platform/desktop/desktop.h"
+
+#include <functional>
+
+/// Writes gImportRecords to the catalogue, track by track in one transaction: artists and tracks
+/// are found or made, each CD gets its title and its links. A CD whose title is there already is
+/// asked about.
+class CatalogueLoad
+{
+public:
+    enum class Outcome { Committed, Cancelled };
+
+    /// What to show of the progress, whenever it has changed; percent of the tracks.
+    std::function<void(int percent, const QString &label)> show;
+
+    /// Before each track, for what has to happen meanwhile.
+    std::function<void()> nextTrack;
+
+    /// Asked for a CD that is there already: Yes imports it once more, No leaves it out, Cancel
+    /// takes everything back.
+    std::function<BoxAnswer(const QString &question)> ask;
+
+    /// Throws ADODB::Error. The transaction is then left open for the caller's handler to roll
+    /// back, after it has shown what the connection says.
+    Outcome run();
+
+    /// The number of tracks that were put on a CD.
+    qsizetype importedCount() const { return mImportedCount; }
+
+private:
+    struct Track;
+    void tell(qsizetype number, qsizetype count);
+    bool load(const Track &track); // false: cancelled
+    bool beginCd(const Track &track, qint64 artistId);
+    BoxAnswer answerFor(const Track &track, qint64 artistId) const;
+
+    qsizetype mImportedCount = 0;
+    qint64 mLastCdIndex = 0;
+    BoxAnswer mCdAnswer = vbYes; // holds for the CD in work
+    int mPercentShown = -1;
+};

@@ -1,0 +1,72 @@
+#include "textimport/filereading.h"
+
+#include "catalogue/ids.h"
+#include "platform/ado/error.h"
+#include "shell/services/fileutilities.h"
+#include "shell/services/globals.h"
+#include "shell/services/messages.h"
+
+namespace
+{
+
+const auto nextCompactDiscId = QStringLiteral("select max(id+1) as ID from CompactDiscs");
+const auto nextCdTitelId = QStringLiteral("select max(id+1) as ID from CDtitels");
+
+// By design: this word is Dutch in both languages where a reader does not take it from the table.
+QString progressWord(FilePart part)
+{
+    const bool fromTable =
+        gImportCompilationNested || (gImportAlbumNested && part == FilePart::Tracks);
+    return fromTable ? GetMessage("lblRead") : QStringLiteral("% ingelezen");
+}
+
+} // namespace
+
+void FileReading::run()
+{
+    gImportRecords = newImportRecords();
+    const qint64 discRow = nextId(nextCompactDiscId, QLatin1String("ID"));
+    const qint64 cd = nextId(nextCdTitelId, QLatin1String("ID"));
+    if (!FileExists(gImportFile))
+        return;
+    InputTextFile file;
+    if (!OpenInputFile(gImportFile, file))
+        throw ADODB::makeError(ADODB::errCannotUse, gImportFile);
+    mLineTotal = file.countLines();
+    tell(FilePart::Head);
+    if (mLineTotal == 0)
+        return;
+    TrackRows rows(*gImportRecords, discRow, cd);
+    readLines(file, rows);
+    CloseTextFile(file);
+    gImportRecords->MoveFirst(); // refuses a file without a track
+}
+
+void FileReading::readLines(InputTextFile &file, TrackRows &rows)
+{
+    ImportLines lines(file, [this](int lineNumber, FilePart part) {
+        mLineNumber = lineNumber;
+        tell(part);
+        if (lineRead)
+            lineRead();
+    });
+    if (gImportCompilationNested)
+        ReadCompilationNested(lines, rows);
+    else if (gImportCompilationFlat)
+        ReadCompilationFlat(lines, rows);
+    else if (gImportAlbumNested)
+        ReadAlbumNested(lines, rows);
+    else if (gImportAlbumFlat)
+        ReadAlbumFlat(lines, rows);
+}
+
+void FileReading::tell(FilePart part)
+{
+    const int percent =
+        mLineTotal == 0 ? 100 : int(qMin<qint64>(100, qint64(mLineNumber) * 100 / mLineTotal));
+    if (!show || (percent == mPercentShown && part == mPartShown))
+        return;
+    mPercentShown = percent;
+    mPartShown = part;
+    show(percent, QString::number(percent) + progressWord(part));
+}
