@@ -1,0 +1,66 @@
+#include "cases.h"
+#include "opencatalogue.h"
+#include "platform/ado/dialect.h"
+#include "platform/ado/recordset.h"
+#include "rawdatabase.h"
+#include "shell/services/globals.h"
+
+namespace
+{
+
+const auto findArtist = QStringLiteral("Select ID, Naam From Artiesten where Naam = '%1'");
+
+const char *const typical[] = {
+    "Select ID, Naam From Artiesten where Naam = 'O''Brien & The Foxes'",
+    "select max(id+1) as ID from tracks",
+    "Insert into Tracks(ID,Artiest_ID,Titel,Genre,Hitjaar) values (4711,12,'Café De "
+    "Maan','Pop',1985)",
+    "delete from tracks trk where not exists (select '1' from CompactDiscs where Track_ID=trk.ID)",
+};
+
+// The catalogue's busiest kind of statement, as the program sends it: a look-up of a name. In a
+// transaction, or both would measure the locks of the file.
+void find(benchmark::State &state)
+{
+    openCatalogue(QString::fromStdString(benchdata::catalogue(benchdata::scales().front())));
+    const QString statement =
+        QString(findArtist).replace(QLatin1String("%1"), QLatin1String("Nobody At All"));
+    const ADODB::Transaction transaction(*gConnection);
+    for (auto _ : state) {
+        ADODB::Recordset answer;
+        answer.Open(statement, *gConnection);
+        benchmark::DoNotOptimize(answer.RecordCount());
+    }
+    gConnection.reset();
+}
+
+void findPrepared(benchmark::State &state)
+{
+    RawDatabase database(benchdata::catalogue(benchdata::scales().front()));
+    database.exec("begin immediate");
+    RawStatement search(database, "select ID, Naam from Artiesten where Naam = ?");
+    for (auto _ : state)
+        benchmark::DoNotOptimize(search.number(std::string_view("Nobody At All")));
+}
+
+void translate(benchmark::State &state)
+{
+    const QString statement = QString::fromUtf8(typical[state.range(0)]);
+    state.SetLabel(statement.left(30).toStdString());
+    ADODB::Dialect dialect;
+    for (auto _ : state) {
+        dialect.translate(statement);
+        benchmark::DoNotOptimize(dialect.sql().data());
+    }
+    state.SetBytesProcessed(state.iterations() * statement.size());
+}
+
+} // namespace
+
+void registerStatementCases()
+{
+    benchmark::RegisterBenchmark("statement/sent as text", find);
+    benchmark::RegisterBenchmark("statement/prepared by hand", findPrepared);
+    benchmark::RegisterBenchmark("translate", translate)
+        ->DenseRange(0, int(std::size(typical)) - 1);
+}

@@ -1,0 +1,48 @@
+#include "browsepages.h"
+#include "catalogue/cataloguefile.h"
+#include "catalogue/cleanorphans.h"
+#include "measure.h"
+#include "opencatalogue.h"
+#include "platform/ado/recordset.h"
+#include "workcommands.h"
+
+namespace
+{
+
+void open(const QString &file)
+{
+    measured("open", [&] {
+        openCatalogue(file);
+        return std::string();
+    });
+}
+
+} // namespace
+
+void newCatalogue(const QStringList &arguments)
+{
+    measured("new", [&] {
+        cataloguefile::create(arguments[0]);
+        return std::string();
+    });
+}
+
+void browse(const QStringList &arguments)
+{
+    open(arguments[0]);
+    measured("browse", [] {
+        const BrowsePages pages = loadBrowsePages();
+        return count("compilations", pages.compilations->rowCount()) +
+               count("albums", pages.albums->rowCount()) +
+               count("collections", pages.collections->rowCount()) + count("tracks", pages.tracks);
+    });
+}
+
+void removeOrphans(const QStringList &arguments)
+{
+    open(arguments[0]);
+    measured("orphans", [] {
+        CleanOrphans();
+        return std::string();
+    });
+}

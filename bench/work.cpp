@@ -1,0 +1,66 @@
+#include "consoledesktop.h"
+#include "measure.h"
+#include "platform/ado/connection.h"
+#include "platform/ado/error.h"
+#include "shell/services/globals.h"
+#include "workcommands.h"
+
+#include <QCoreApplication>
+#include <cstdio>
+
+namespace
+{
+
+struct Command {
+    const char *name;
+    const char *arguments;
+    void (*run)(const QStringList &arguments);
+};
+
+constexpr Command commands[] = {
+    {"new", "CATALOGUE", newCatalogue},      {"browse", "CATALOGUE", browse},
+    {"read", "A|B|C|D FILE", readText},      {"load", "CATALOGUE A|B|C|D FILE", loadText},
+    {"orphans", "CATALOGUE", removeOrphans},
+};
+
+int usage()
+{
+    for (const Command &command : commands)
+        std::fprintf(stderr, "songcase-work %s %s\n", command.name, command.arguments);
+    return 2;
+}
+
+const Command *find(const QStringList &words)
+{
+    for (const Command &command : commands) {
+        const auto wanted = QString::fromLatin1(command.arguments).split(u' ').size();
+        if (words.value(1) == QLatin1String(command.name) && words.size() == wanted + 2)
+            return &command;
+    }
+    return nullptr;
+}
+
+} // namespace
+
+// songcase-work COMMAND ...: what the screens do, without a screen, for timing from outside. Ends
+// with 1 if anything would have shown an error box.
+int main(int argc, char **argv)
+{
+    const QCoreApplication application(argc, argv);
+    const QStringList words = QCoreApplication::arguments();
+    const Command *command = find(words);
+    if (!command)
+        return usage();
+    ConsoleDesktop desktop;
+    try {
+        command->run(words.sliced(2));
+        gConnection.reset();
+    } catch (const std::exception &error) {
+        std::fprintf(stderr, "%s\n", error.what());
+        return 1;
+    }
+    if (desktop.questions)
+        std::printf("questions=%d, all answered with yes\n", desktop.questions);
+    std::printf("peak_kib=%ld\n", peakMemory());
+    return desktop.failed ? 1 : 0;
+}

@@ -1,0 +1,12 @@
+#pragma once
+
+#include <QStringList>
+
+// What songcase-work can do: each command is what a screen does, with the program's own code, and
+// prints what it did. Failures are ADODB::Error or an error box.
+
+void newCatalogue(const QStringList &arguments);  // CATALOGUE
+void browse(const QStringList &arguments);        // CATALOGUE
+void readText(const QStringList &arguments);      // FORMAT FILE
+void loadText(const QStringList &arguments);      // CATALOGUE FORMAT FILE
+void removeOrphans(const QStringList &arguments); // CATALOGUE
