@@ -116,9 +116,13 @@ bool Collation::sortPrefix(std::string_view s, std::uint64_t &prefix) const
         if (i >= s.size())
             return true;
         unsigned c = static_cast<unsigned char>(s[i++]);
-        if (c >= 0xC3 && c < 0xE0 && i < s.size())
+        if (c >= 0x80) {
+            const bool pair = c >= 0xC3 && c < 0xE0 && i < s.size() && (s[i] & 0xC0) == 0x80;
+            if (!pair)
+                return false;
             c = (c & 0x1F) << 6 | (static_cast<unsigned char>(s[i++]) & 0x3F);
-        if (c >= latinEnd || (c >= 0x80 && c < 0xC0) || mLatinRank[c] == 0)
+        }
+        if (c >= latinEnd || mLatinRank[c] == 0)
             return false;
         prefix |= std::uint64_t(mLatinRank[c]) << shift;
     }
