@@ -36,7 +36,10 @@ ScriptedDesktop::ScriptedDesktop()
     setCurrent(this);
 }
 
-ScriptedDesktop::~ScriptedDesktop() = default;
+ScriptedDesktop::~ScriptedDesktop()
+{
+    setCurrent(nullptr);
+}
 
 void ScriptedDesktop::expectBox(const QString &part, BoxAnswer answer)
 {
@@ -91,7 +94,8 @@ void ScriptedDesktop::showModal(Form &form)
     }
     QPointer<Form> alive = &form;
     QEventLoop loop;
-    QObject::connect(&form, &Form::unloaded, &loop, &QEventLoop::quit);
+    QObject::connect(&form, &Form::hid, &loop, &QEventLoop::quit);
+    QObject::connect(&form, &QObject::destroyed, &loop, &QEventLoop::quit);
     QTimer::singleShot(modalAtMost, &loop, [&] {
         failTest(QStringLiteral("The modal screen did not end: ") + form.Name());
         loop.quit();

@@ -13,6 +13,8 @@
 /// "error|information|yes-no|yes-no-cancel [title] text".
 class ScriptedDesktop : public Desktop
 {
+    QTemporaryDir mTemporary; // first: folder and settings lie in it
+
 public:
     ScriptedDesktop();
     ~ScriptedDesktop() override;
@@ -64,5 +66,4 @@ private:
     std::deque<Box> mBoxes;
     std::deque<Modal> mModals;
     std::deque<QString> mFiles;
-    QTemporaryDir mTemporary;
 };

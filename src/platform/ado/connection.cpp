@@ -25,6 +25,7 @@ struct Prepared {
     std::unique_ptr<sqlite3_stmt, Finalize> statement;
     std::shared_ptr<const FieldList> fields;
     bool readOnly = false;
+    int timesPrepared = 0; // by the engine itself, after the tables were changed
 };
 
 // A statement goes back to its start on every way out, so that it holds no lock and no value.
@@ -48,6 +49,19 @@ std::shared_ptr<const FieldList> fieldsOf(sqlite3_stmt *s)
     for (int i = 0; i < sqlite3_column_count(s); ++i)
         fields->push_back({QString::fromUtf8(sqlite3_column_name(s, i)), adVarWChar, 0});
     return fields;
+}
+
+// The first step finds out whether the tables are still those that the statement was prepared for.
+int firstStep(Prepared &prepared)
+{
+    sqlite3_stmt *s = prepared.statement.get();
+    const int code = sqlite3_step(s);
+    const int times = sqlite3_stmt_status(s, SQLITE_STMTSTATUS_REPREPARE, 0);
+    if (times != prepared.timesPrepared) {
+        prepared.timesPrepared = times;
+        prepared.fields = fieldsOf(s);
+    }
+    return code;
 }
 
 int bind(sqlite3_stmt *s, const Dialect &dialect)
@@ -122,19 +136,26 @@ Prepared &Connection::Engine::prepare(const std::string &sql, int &code)
     sqlite3_stmt *s = nullptr;
     code =
         sqlite3_prepare_v3(db, sql.data(), int(sql.size()), SQLITE_PREPARE_PERSISTENT, &s, nullptr);
+    Prepared p;
+    p.statement.reset(s);
+    if (code == SQLITE_OK && !s)
+        code = SQLITE_ERROR;
     if (code != SQLITE_OK) {
         static Prepared none;
         return none;
     }
-    Prepared p;
-    p.statement.reset(s);
     p.fields = fieldsOf(s);
     p.readOnly = sqlite3_stmt_readonly(s);
     return prepared.emplace(sql, std::move(p)).first->second;
 }
 
 Connection::Connection() = default;
-Connection::~Connection() = default;
+
+Connection::~Connection()
+{
+    if (mEngine)
+        Close();
+}
 
 QString Connection::dataSource(const QString &connectionString)
 {
@@ -186,6 +207,8 @@ void Connection::Open(const QString &, const QString &, const QString &connectio
     mEngine = std::make_unique<Engine>();
     try {
         const QByteArray file = dataSource(ConnectionString).toUtf8();
+        if (file.isEmpty()) // to the engine, a temporary file of its own
+            throw makeError(errCannotUse);
         const int access = Mode == adModeRead ? SQLITE_OPEN_READONLY : SQLITE_OPEN_READWRITE;
         check(sqlite3_open_v2(file.constData(), &mEngine->db, access | SQLITE_OPEN_EXRESCODE,
                               nullptr));
@@ -236,8 +259,9 @@ std::shared_ptr<const Rows> Connection::run(const QString &statement)
     sqlite3_stmt *s = prepared.statement.get();
     const Running running(s);
     check(bind(s, mEngine->dialect));
+    code = firstStep(prepared);
     auto rows = std::make_shared<Rows>(prepared.fields);
-    while ((code = sqlite3_step(s)) == SQLITE_ROW)
+    for (; code == SQLITE_ROW; code = sqlite3_step(s))
         readRow(s, *rows);
     check(code);
     return rows;
@@ -247,11 +271,17 @@ std::shared_ptr<const Rows> Connection::run(const QString &statement)
 // nothing new goes down with it. One that the engine took back by itself must not be written on in.
 void Connection::settleBefore(bool readOnly)
 {
-    if (readOnly || !mEngine->transactionOpen)
+    if (readOnly)
         return;
     if (mEngine->abandoned())
         RollbackTrans();
-    else if (sqlite3_get_autocommit(mEngine->db))
+    else
+        requireKept();
+}
+
+void Connection::requireKept() const
+{
+    if (mEngine->transactionOpen && sqlite3_get_autocommit(mEngine->db))
         throw makeError(errNotPermitted);
 }
 
@@ -274,6 +304,8 @@ void Connection::begin(Transaction *owner)
     requireOpen();
     if (mEngine->abandoned())
         RollbackTrans();
+    else
+        requireKept();
     owner->mJoined = mEngine->transactionOpen;
     check(mEngine->exec(owner->mJoined ? "SAVEPOINT joined" : "BEGIN IMMEDIATE"));
     mEngine->transactionOpen = true;
@@ -295,7 +327,7 @@ void Connection::finish(Transaction *owner, bool commit)
     }
     std::erase(mEngine->routines, owner);
     owner->mRunning = false;
-    mEngine->transactionOpen = owner->mJoined && stillOpen;
+    mEngine->transactionOpen = owner->mJoined; // the first routine's share is still to be closed
 }
 
 void Connection::leave(Transaction *owner)

@@ -74,6 +74,7 @@ private:
     void check(int code);
     void requireOpen() const;
     void settleBefore(bool readOnly);
+    void requireKept() const; // that the engine has not taken an open transaction back
     void begin(class Transaction *owner);
     void finish(class Transaction *owner, bool commit);
     void leave(class Transaction *owner);

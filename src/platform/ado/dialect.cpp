@@ -3,6 +3,7 @@
 #include "platform/ado/error.h"
 
 #include <QString>
+#include <algorithm>
 
 namespace ADODB
 {
@@ -86,13 +87,10 @@ QString shapeContent(QStringView s)
     return QLatin1String("select distinct") + content.sliced(end);
 }
 
-bool mayHoldParameters(QStringView firstWord)
+bool isOneOf(QStringView word, std::initializer_list<const char *> keywords)
 {
-    for (const char *w : {"select", "insert", "update", "delete"}) {
-        if (is(firstWord, QLatin1String(w)))
-            return true;
-    }
-    return false;
+    return std::any_of(keywords.begin(), keywords.end(),
+                       [&](const char *k) { return is(word, QLatin1String(k)); });
 }
 
 } // namespace
@@ -108,22 +106,21 @@ void Dialect::translate(QStringView statement)
     mTexts.clear();
     mLiterals.clear();
     mAt = skipBlanks(statement, 0);
-    mDepth = 0;
-    mInOrdinals = mEnded = false;
+    mEnded = false;
+    mOrdinals.assign(1, false);
     mValues = Values::None;
     mDelete = Delete::None;
     const QStringView first = statement.sliced(mAt, wordEnd(statement, mAt) - mAt);
-    mLifts = mayHoldParameters(first);
+    mLifts = !isOneOf(first, {"create", "alter", "drop"});
     if (is(first, QLatin1String("shape"))) {
         const QString content = shapeContent(statement);
-        mLifts = true;
         mAt = 0;
         translatePiece(content);
-    } else {
+    } else if (!mLifts || isOneOf(first, {"select", "insert", "update", "delete"})) {
         translatePiece(statement);
+    } else {
+        refuse(first.toString());
     }
-    if (mSql.empty())
-        refuse({});
 }
 
 void Dialect::translatePiece(QStringView s)
@@ -136,8 +133,8 @@ void Dialect::translatePiece(QStringView s)
                 mSql.push_back(' ');
             continue;
         }
-        if (mEnded)
-            refuse(QStringLiteral(";"));
+        if (mEnded || (mValues == Values::Behind && c != u';'))
+            refuse(QString(c));
         if (startsWord(c))
             word(s);
         else if (isDigit(c) || (c == u'.' && isDigit(charAt(s, mAt + 1))))
@@ -169,10 +166,9 @@ void Dialect::afterWord(QStringView s, QStringView w)
 {
     const bool orders = is(w, QLatin1String("order")) || is(w, QLatin1String("group"));
     if (orders && nextWordIs(s, mAt, QLatin1String("by"))) {
-        mInOrdinals = true;
-        mOrdinalDepth = mDepth;
+        mOrdinals.back() = true;
     } else if (is(w, QLatin1String("having")) || is(w, QLatin1String("union"))) {
-        mInOrdinals = false;
+        mOrdinals.back() = false;
     } else if (is(w, QLatin1String("values"))) {
         mValues = Values::Expected;
     }
@@ -189,9 +185,9 @@ bool Dialect::maxOfSum(QStringView s)
                       charAt(s, one) == u'1' && charAt(s, close) == u')';
     if (!fits)
         return false;
-    mSql.append("max(");
+    mSql.append("(max(");
     appendUtf8(mSql, s.sliced(from, to - from));
-    mSql.append(")+1");
+    mSql.append(")+1)");
     mAt = close + 1;
     return true;
 }
@@ -260,6 +256,8 @@ void Dialect::literalText(QStringView s, char16_t quote)
         mSql.push_back('?');
     } else {
         const std::string content = mTexts.substr(l.offset);
+        if (content.find('\0') != std::string::npos)
+            refuse(QString(QChar(quote)));
         mSql.push_back('\'');
         for (const char c : content)
             mSql.append(c == '\'' ? 2 : 1, c);
@@ -313,8 +311,9 @@ void Dialect::otherSign(QStringView s)
 {
     const QChar c = s[mAt], next = charAt(s, mAt + 1);
     const bool comment = (c == u'-' && next == u'-') || (c == u'/' && next == u'*');
+    const bool control = c < u' '; // SQLite takes a NUL for the end of the statement
     const bool parameter = c == u'?' || c == u':' || c == u'@' || c == u'$' || c == u'#';
-    if (comment || parameter || (c == u'|' && next == u'|'))
+    if (comment || control || parameter || (c == u'|' && next == u'|'))
         refuse(QString(c) + next);
     if (c == u';')
         mEnded = true;
@@ -327,17 +326,15 @@ void Dialect::sign(QStringView s)
 {
     const char16_t c = s[mAt].unicode();
     if (c == u'(') {
-        ++mDepth;
+        mOrdinals.push_back(mOrdinals.back());
         if (mValues == Values::Expected)
             mValues = Values::Inside;
     } else if (c == u')') {
-        --mDepth;
-        if (mInOrdinals && mDepth < mOrdinalDepth)
-            mInOrdinals = false;
-        if (mValues == Values::Inside && mDepth == 0)
+        if (mOrdinals.size() == 1)
+            refuse(QString(QChar(c)));
+        mOrdinals.pop_back();
+        if (mValues == Values::Inside && mOrdinals.size() == 1)
             mValues = Values::Behind;
-    } else if (c == u',' && mValues == Values::Behind) {
-        refuse(QStringLiteral("VALUES"));
     }
     appendUtf8(mSql, s.sliced(mAt, 1));
 }

@@ -14,8 +14,8 @@ namespace ADODB
 /// What it mends: the alias of a DELETE gets its "as", left() is quoted, max(id+1) becomes
 /// max(id)+1 (which an index serves), of a SHAPE command the statement in its braces is left,
 /// without repeats. What it refuses, as the engine that the statements were written for did: a
-/// second statement, a comment, several rows behind VALUES, "||", parameters, numbers glued to
-/// words.
+/// second statement, a comment, anything behind the one row of VALUES, "||", parameters, numbers
+/// glued to words, commands that were not in its language (PRAGMA, ATTACH, COMMIT).
 class Dialect
 {
 public:
@@ -44,7 +44,7 @@ private:
     bool maxOfSum(QStringView s);
     void deleteAlias(QStringView w);
     void literalText(QStringView s, char16_t quote);
-    bool liftsHere() const { return mLifts && !mInOrdinals; }
+    bool liftsHere() const { return mLifts && !mOrdinals.back(); }
     [[noreturn]] void refuse(const QString &why) const;
 
     std::string mSql, mTexts;
@@ -52,11 +52,9 @@ private:
 
     // Where in the statement the scan stands.
     qsizetype mAt = 0;
-    int mDepth = 0;
-    int mOrdinalDepth = 0;
-    bool mLifts = true;       // the statement is one that may hold parameters
-    bool mInOrdinals = false; // behind ORDER BY or GROUP BY
-    bool mEnded = false;      // a ";" was seen
+    bool mLifts = true;          // the statement is one that may hold parameters
+    bool mEnded = false;         // a ";" was seen
+    std::vector<bool> mOrdinals; // for each open parenthesis: whether behind ORDER BY or GROUP BY
     enum class Values { None, Expected, Inside, Behind } mValues = Values::None;
     enum class Delete { None, From, Table, Done } mDelete = Delete::None;
 };

@@ -72,7 +72,7 @@ void Recordset::requireRecord() const
 bool Recordset::isEOF() const
 {
     requireOpen();
-    return !mOnDeleted && mPosition >= mRows->rowCount();
+    return !mOnDeleted && (mPosition >= mRows->rowCount() || mRows->rowCount() == 0);
 }
 
 bool Recordset::isBOF() const
@@ -117,7 +117,7 @@ void Recordset::MoveNext()
 void Recordset::MovePrevious()
 {
     requireOpen();
-    if (mPosition < 0)
+    if (isBOF())
         throw makeError(errNoCurrentRecord);
     mOnDeleted = false;
     --mPosition;

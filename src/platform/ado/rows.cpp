@@ -1,5 +1,6 @@
 #include "platform/ado/rows.h"
 
+#include <algorithm>
 #include <cstring>
 
 namespace ADODB
