@@ -79,6 +79,8 @@ void Form::Show()
 {
     const bool first = !isVisible();
     Load();
+    if (mUnloaded)
+        return;
     if (gHost && first)
         gHost->adopt(this);
     else if (gHost)
@@ -90,7 +92,8 @@ void Form::Show()
 void Form::ShowModal()
 {
     Load();
-    Desktop::current().showModal(*this);
+    if (!mUnloaded)
+        Desktop::current().showModal(*this);
 }
 
 bool Form::Unload()
@@ -119,6 +122,13 @@ void Form::finishUnload()
 void Form::closeEvent(QCloseEvent *event)
 {
     event->setAccepted(Unload());
+}
+
+void Form::hideEvent(QHideEvent *event)
+{
+    QWidget::hideEvent(event);
+    if (!event->spontaneous())
+        emit hid();
 }
 
 void Form::setDefaultButton(QPushButton *button)
