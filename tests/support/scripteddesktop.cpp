@@ -36,10 +36,7 @@ ScriptedDesktop::ScriptedDesktop()
     setCurrent(this);
 }
 
-ScriptedDesktop::~ScriptedDesktop()
-{
-    setCurrent(nullptr);
-}
+ScriptedDesktop::~ScriptedDesktop() = default;
 
 void ScriptedDesktop::expectBox(const QString &part, BoxAnswer answer)
 {

@@ -54,5 +54,6 @@ Hourglass::Hourglass(QWidget *window) : mWindow(window)
 
 Hourglass::~Hourglass()
 {
-    Desktop::current().setPointer(mWindow, vbDefault);
+    if (mWindow)
+        Desktop::current().setPointer(mWindow, vbDefault);
 }

@@ -1,10 +1,11 @@
 #pragma once
 
 #include <QDateTime>
+#include <QPointer>
 #include <QString>
+#include <QWidget>
 
 class Form;
-class QWidget;
 
 enum class BoxKind { Error, Information, Question };
 enum class BoxButtons { Ok, YesNo, YesNoCancel };
@@ -65,7 +66,7 @@ public:
     Hourglass &operator=(const Hourglass &) = delete;
 
 private:
-    QWidget *mWindow;
+    QPointer<QWidget> mWindow; // may be closed meanwhile
 };
 
 /// No drawing of a window for as long as this object lives. Freezes are not counted.

@@ -22,7 +22,9 @@ void release()
     gFrozen.clear();
 }
 
-void watch();
+constexpr int again = 20; // milliseconds; a modal screen may be open for long
+
+void watch(int delay);
 
 void lookAgain()
 {
@@ -33,15 +35,15 @@ void lookAgain()
     if (inMainLoop)
         release();
     else
-        watch();
+        watch(again);
 }
 
-void watch()
+void watch(int delay)
 {
     if (gWatching)
         return;
     gWatching = true;
-    QTimer::singleShot(gPumps == 0 ? 0 : 20, lookAgain);
+    QTimer::singleShot(delay, lookAgain);
 }
 
 } // namespace
@@ -53,7 +55,7 @@ void freeze(QWidget *window)
         return;
     gFrozen = window;
     window->setUpdatesEnabled(false);
-    watch();
+    watch(0);
 }
 
 Pumping::Pumping()

@@ -79,6 +79,8 @@ void Form::Show()
 {
     const bool first = !isVisible();
     Load();
+    if (mUnloaded)
+        return;
     if (gHost && first)
         gHost->adopt(this);
     else if (gHost)
@@ -90,6 +92,8 @@ void Form::Show()
 void Form::ShowModal()
 {
     Load();
+    if (mUnloaded)
+        return;
     if (gHost && mPlace)
         move(gHost->origin() + *mPlace);
     Desktop::current().showModal(*this);
@@ -121,6 +125,13 @@ void Form::finishUnload()
 void Form::closeEvent(QCloseEvent *event)
 {
     event->setAccepted(Unload());
+}
+
+void Form::hideEvent(QHideEvent *event)
+{
+    QWidget::hideEvent(event);
+    if (!event->spontaneous())
+        emit hid();
 }
 
 void Form::setDefaultButton(QPushButton *button)

@@ -22,7 +22,8 @@ public:
 
     QString Name() const { return objectName(); }
 
-    /// Runs Form_Load if it has not run yet; the form stays hidden.
+    /// Runs Form_Load if it has not run yet; the form stays hidden. One that unloads itself there
+    /// is not shown.
     void Load();
     void Show(); // modeless; brings it up if it is shown already
     void ShowModal();
@@ -51,6 +52,7 @@ public:
 
 signals:
     void unloaded();
+    void hid(); // by the program, an unload included
     void activated();
 
 protected:
@@ -62,6 +64,7 @@ protected:
     void setDefaultButton(QPushButton *button); // Enter
     void setCancelButton(QPushButton *button);  // Esc
     void closeEvent(QCloseEvent *event) override;
+    void hideEvent(QHideEvent *event) override;
     void keyPressEvent(QKeyEvent *event) override;
 
 private:

@@ -114,7 +114,8 @@ void QtDesktop::showModal(Form &form)
     form.setWindowFlags(Qt::Dialog | frameless);
     form.setWindowModality(Qt::ApplicationModal);
     QEventLoop loop;
-    QObject::connect(&form, &Form::unloaded, &loop, &QEventLoop::quit);
+    QObject::connect(&form, &Form::hid, &loop, &QEventLoop::quit);
+    QObject::connect(&form, &QObject::destroyed, &loop, &QEventLoop::quit);
     form.show();
     form.activateWindow();
     loop.exec();
@@ -171,16 +172,18 @@ void QtDesktop::pump()
 
 void QtDesktop::sendKeys(const QString &keys)
 {
-    QWidget *to = QApplication::focusWidget();
-    if (!to)
-        to = QApplication::activeWindow();
     const QKeySequence sequence(keys);
-    for (int i = 0; to && i < sequence.count(); ++i) {
+    for (int i = 0; i < sequence.count(); ++i) {
         const QKeyCombination key = sequence[uint(i)];
-        QKeyEvent press(QEvent::KeyPress, key.key(), key.keyboardModifiers());
-        QApplication::sendEvent(to, &press);
-        QKeyEvent release(QEvent::KeyRelease, key.key(), key.keyboardModifiers());
-        QApplication::sendEvent(to, &release);
+        for (const auto type : {QEvent::KeyPress, QEvent::KeyRelease}) {
+            // Each key goes to where the one before it has moved the focus.
+            QWidget *to = QApplication::focusWidget();
+            if (!to)
+                to = QApplication::activeWindow();
+            QKeyEvent event(type, key.key(), key.keyboardModifiers());
+            if (to)
+                QApplication::sendEvent(to, &event);
+        }
     }
 }
 

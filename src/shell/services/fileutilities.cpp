@@ -6,6 +6,10 @@
 #include <QDirIterator>
 #include <QRegularExpression>
 #include <cstdio>
+#ifdef Q_OS_UNIX
+#include <fcntl.h>
+#include <unistd.h>
+#endif
 
 QStringList gFoundFiles;
 QString gBrowseInitialFolder;
@@ -21,15 +25,10 @@ bool isPattern(const QString &name)
 
 QRegularExpression wildcards(const QString &pattern)
 {
-    QString expression;
-    for (const QChar c : pattern) {
-        if (c == QLatin1Char('*'))
-            expression += QLatin1String(".*");
-        else if (c == QLatin1Char('?'))
-            expression += QLatin1Char('.');
-        else
-            expression += QRegularExpression::escape(QString(c));
-    }
+    // The escape comes first, and whole: cut into units, characters of two would be broken.
+    QString expression = QRegularExpression::escape(pattern);
+    expression.replace(QLatin1String("\\*"), QLatin1String(".*"));
+    expression.replace(QLatin1String("\\?"), QLatin1String("."));
     return QRegularExpression(QRegularExpression::anchoredPattern(expression),
                               QRegularExpression::CaseInsensitiveOption |
                                   QRegularExpression::DotMatchesEverythingOption);
@@ -55,9 +54,9 @@ bool FileExists(const QString &path)
 {
     if (path.isEmpty())
         return false;
-    if (QFileInfo::exists(systemPath(path)))
+    const QFileInfo info(systemPath(path));
+    if (info.exists())
         return true;
-    const QFileInfo info(path);
     if (!isPattern(info.fileName()))
         return false;
     const auto pattern = wildcards(info.fileName());
@@ -89,6 +88,19 @@ bool IsDriveRoot(const QString &text)
             return true;
     }
     return false;
+}
+
+void syncFolder(const QString &folder)
+{
+#ifdef Q_OS_UNIX
+    const int handle = open(QFile::encodeName(folder).constData(), O_RDONLY | O_DIRECTORY);
+    if (handle >= 0) {
+        fsync(handle);
+        close(handle);
+    }
+#else
+    Q_UNUSED(folder)
+#endif
 }
 
 QString StripAtNull(QString &s)
@@ -132,7 +144,10 @@ double ScanFolderTree(QString path, const QString &pattern, int fileCount, int f
 
 bool MoveFileReplace(const QString &from, const QString &to)
 {
-    return std::rename(QFile::encodeName(from).constData(), QFile::encodeName(to).constData()) != 0;
+    if (std::rename(QFile::encodeName(from).constData(), QFile::encodeName(to).constData()) != 0)
+        return true;
+    syncFolder(QFileInfo(to).absolutePath());
+    return false;
 }
 
 QString BrowseForFolderDialog(const QString &title, const QString &initialFolder)

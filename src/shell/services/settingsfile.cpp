@@ -11,11 +11,9 @@
 namespace
 {
 
-QString normalKey(QString key)
+QString normalKey(const QString &key)
 {
-    while (key.endsWith(QLatin1Char('\\')))
-        key.chop(1);
-    return key.toLower();
+    return key.toLower().split(QLatin1Char('\\'), Qt::SkipEmptyParts).join(QLatin1Char('\\'));
 }
 
 QVariant fromJson(const QJsonObject &o)
@@ -45,32 +43,32 @@ QJsonObject toJson(const QVariant &v)
     }
 }
 
-void setAside(const QString &file)
+bool setAside(const QString &file)
 {
     const QString stamp = QDateTime::currentDateTime().toString(QStringLiteral("yyyyMMdd-hhmmss"));
     QString aside = file + QStringLiteral(".damaged-") + stamp;
     while (QFile::exists(aside))
         aside += QLatin1Char('x');
-    QFile::rename(file, aside);
+    return QFile::rename(file, aside);
 }
 
 } // namespace
 
 SettingsFile::SettingsFile(QString file) : mFile(std::move(file)) {}
 
-SettingsFile::Tree SettingsFile::read() const
+// No file is an empty tree; one that is there but cannot be read must never be taken for that.
+SettingsFile::Code SettingsFile::read(Tree &tree) const
 {
     QFile file(mFile);
     if (!file.open(QIODevice::ReadOnly))
-        return {};
-    QJsonParseError error;
-    const QJsonDocument document = QJsonDocument::fromJson(file.readAll(), &error);
+        return QFileInfo::exists(mFile) ? AccessDenied : Success;
+    const QJsonDocument document = QJsonDocument::fromJson(file.readAll());
+    const bool wholly = file.error() == QFileDevice::NoError;
     file.close();
-    if (!document.isObject()) {
-        setAside(mFile);
-        return {};
-    }
-    Tree tree;
+    if (!wholly)
+        return AccessDenied;
+    if (!document.isObject())
+        return setAside(mFile) ? Success : BadFormat;
     const QJsonObject keys = document.object();
     for (auto key = keys.begin(); key != keys.end(); ++key) {
         Values &values = tree[normalKey(key.key())];
@@ -78,7 +76,7 @@ SettingsFile::Tree SettingsFile::read() const
         for (auto v = named.begin(); v != named.end(); ++v)
             values[v.key().toLower()] = fromJson(v.value().toObject());
     }
-    return tree;
+    return Success;
 }
 
 template <typename Change> SettingsFile::Code SettingsFile::change(Change change)
@@ -88,7 +86,9 @@ template <typename Change> SettingsFile::Code SettingsFile::change(Change change
     QLockFile lock(mFile + QStringLiteral(".lock"));
     if (!lock.tryLock(2000))
         return AccessDenied;
-    Tree tree = read();
+    Tree tree;
+    if (const Code code = read(tree); code != Success)
+        return code;
     if (const Code code = change(tree); code != Success)
         return code;
     QJsonObject keys;
@@ -101,19 +101,25 @@ template <typename Change> SettingsFile::Code SettingsFile::change(Change change
     QSaveFile file(mFile);
     if (!file.open(QIODevice::WriteOnly))
         return AccessDenied;
+    file.setPermissions(QFile::ReadOwner | QFile::WriteOwner); // it may hold a password
     file.write(QJsonDocument(keys).toJson());
     return file.commit() ? Success : AccessDenied;
 }
 
 bool SettingsFile::hasKey(const QString &key) const
 {
-    return read().contains(normalKey(key));
+    Tree tree;
+    return read(tree) == Success && tree.contains(normalKey(key));
 }
 
 SettingsFile::Code SettingsFile::createKey(const QString &key)
 {
     return change([&](Tree &tree) {
-        tree[normalKey(key)];
+        const QString normal = normalKey(key);
+        for (auto end = normal.indexOf(QLatin1Char('\\')); end >= 0;
+             end = normal.indexOf(QLatin1Char('\\'), end + 1))
+            tree[normal.left(end)];
+        tree[normal];
         return Success;
     });
 }
@@ -131,7 +137,9 @@ SettingsFile::Code SettingsFile::deleteKey(const QString &key)
 SettingsFile::Code SettingsFile::value(const QString &key, const QString &name,
                                        QVariant &value) const
 {
-    const Tree tree = read();
+    Tree tree;
+    if (const Code code = read(tree); code != Success)
+        return code;
     const auto it = tree.constFind(normalKey(key));
     if (it == tree.cend() || !it->contains(name.toLower()))
         return NotFound;

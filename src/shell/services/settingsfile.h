@@ -14,7 +14,7 @@ public:
     enum Code { Success = 0, NotFound = 2, AccessDenied = 5, BadFormat = 1010 };
 
     bool hasKey(const QString &key) const;
-    Code createKey(const QString &key);
+    Code createKey(const QString &key); // and those above it
     Code deleteKey(const QString &key); // with all that is below it
     Code value(const QString &key, const QString &name, QVariant &value) const;
     Code setValue(const QString &key, const QString &name, const QVariant &value);
@@ -23,7 +23,7 @@ public:
 private:
     using Values = QMap<QString, QVariant>;
     using Tree = QMap<QString, Values>;
-    Tree read() const;
+    Code read(Tree &tree) const;
     template <typename Change> Code change(Change change);
 
     QString mFile;

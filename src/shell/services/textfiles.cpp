@@ -69,8 +69,13 @@ OutputTextFile::~OutputTextFile() = default;
 
 bool OpenOutputFile(const QString &name, OutputTextFile &file)
 {
-    file.mFile = std::make_unique<QSaveFile>(systemPath(name));
-    return file.mFile->open(QIODevice::WriteOnly | QIODevice::Text);
+    // Not a stored name but one just chosen: a "\" in it is a plain character.
+    auto target = std::make_unique<QSaveFile>(name);
+    const bool plain = !name.isEmpty() && !QFileInfo(name).isDir();
+    if (!plain || !target->open(QIODevice::WriteOnly | QIODevice::Text))
+        target.reset();
+    file.mFile = std::move(target);
+    return file.mFile != nullptr;
 }
 
 bool WriteTextLine(OutputTextFile &file, const QString &line)
