@@ -29,18 +29,6 @@ UCollationResult compareUnits(const UCollator *collator, char16_t a, char16_t b)
     return ucol_strcoll(collator, &a, 1, &b, 1);
 }
 
-// The character at a place, which moves on behind it; 0 if its order is not known here.
-unsigned latinAt(std::string_view s, std::size_t &at)
-{
-    const unsigned c = static_cast<unsigned char>(s[at++]);
-    if (c < 0x80)
-        return c;
-    if (c < 0xC3 || c > 0xC9 || at >= s.size() || (s[at] & 0xC0) != 0x80)
-        return 0;
-    const unsigned letter = (c & 0x1F) << 6 | (static_cast<unsigned char>(s[at++]) & 0x3F);
-    return letter < 0x250 ? letter : 0;
-}
-
 // A mark may stand here, which would join the character before it into another one.
 bool mayJoin(std::string_view s, std::size_t at)
 {
@@ -110,6 +98,18 @@ void Collation::rankAccented()
         }
     }
     ucol_close(primary);
+}
+
+// The character at a place, which moves on behind it; 0 if its order is not known here.
+unsigned Collation::latinAt(std::string_view s, std::size_t &at)
+{
+    const unsigned c = static_cast<unsigned char>(s[at++]);
+    if (c < 0x80)
+        return c;
+    if (c < 0xC3 || c > 0xC9 || at >= s.size() || (s[at] & 0xC0) != 0x80)
+        return 0;
+    const unsigned letter = (c & 0x1F) << 6 | (static_cast<unsigned char>(s[at++]) & 0x3F);
+    return letter < latinEnd ? letter : 0;
 }
 
 int Collation::compare(std::string_view a, std::string_view b) const

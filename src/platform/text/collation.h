@@ -42,6 +42,7 @@ private:
     ~Collation();
     void rankCharacters();
     void rankAccented();
+    static unsigned latinAt(std::string_view s, std::size_t &at);
     int compareAll(std::string_view a, std::string_view b) const;
 
     static constexpr unsigned latinEnd = 0x250;
