@@ -7,8 +7,6 @@
 #include "shell/services/messages.h"
 #include "textimport/importrecords.h"
 
-#include <optional>
-
 /// One track as the statements take it: texts with their quotes doubled, genre and year as finished
 /// values, numbers as digits.
 struct CatalogueLoad::Track {
@@ -29,13 +27,13 @@ QString selectArtist(const QString &artist)
     return Literal("Select ID, Naam From Artiesten where Naam = '") + artist + Literal("'");
 }
 
-QString insertArtist(qint64 id, const QString &artist)
+QString insertArtist(const QString &id, const QString &artist)
 {
-    return Literal("Insert into Artiesten(ID,Naam) values (") + QString::number(id) +
-           Literal(",'") + artist + Literal("')");
+    return Literal("Insert into Artiesten(ID,Naam) values (") + id + Literal(",'") + artist +
+           Literal("')");
 }
 
-QString selectTrack(const QString &title, qint64 artistId)
+QString selectTrack(const QString &title, const QString &artistId)
 {
     return Literal("select tr.ID as trackid,  "
                    "       ar.id as artistid, "
@@ -44,15 +42,15 @@ QString selectTrack(const QString &title, qint64 artistId)
                    "      Artiesten ar "
                    " where ar.id = tr.artiest_id "
                    " and tr.Titel = '") +
-           title + Literal("' and tr.artiest_id = ") + QString::number(artistId);
+           title + Literal("' and tr.artiest_id = ") + artistId;
 }
 
-QString insertTrack(qint64 id, qint64 artistId, const QString &title, const QString &genre,
-                    const QString &year)
+QString insertTrack(const QString &id, const QString &artistId, const QString &title,
+                    const QString &genre, const QString &year)
 {
-    return Literal("Insert into Tracks(ID,Artiest_ID,Titel,Genre,Hitjaar) values (") +
-           QString::number(id) + Literal(",") + QString::number(artistId) + Literal(",'") + title +
-           Literal("',") + genre + Literal(",") + year + Literal(")");
+    return Literal("Insert into Tracks(ID,Artiest_ID,Titel,Genre,Hitjaar) values (") + id +
+           Literal(",") + artistId + Literal(",'") + title + Literal("',") + genre + Literal(",") +
+           year + Literal(")");
 }
 
 QString selectCompilation(const QString &title)
@@ -60,10 +58,10 @@ QString selectCompilation(const QString &title)
     return Literal("select '1' from CDTitels where Titel = '") + title + Literal("'");
 }
 
-QString selectAlbum(const QString &title, qint64 artistId)
+QString selectAlbum(const QString &title, const QString &artistId)
 {
     return Literal("select '1' from CDTitels where Titel = '") + title +
-           Literal("' and Artiest_ID = ") + QString::number(artistId);
+           Literal("' and Artiest_ID = ") + artistId;
 }
 
 QString insertCompilation(const QString &id, const QString &title)
@@ -72,18 +70,18 @@ QString insertCompilation(const QString &id, const QString &title)
            Literal("','V')");
 }
 
-QString insertAlbum(const QString &id, const QString &title, qint64 artistId)
+QString insertAlbum(const QString &id, const QString &title, const QString &artistId)
 {
     return Literal("Insert into CDTitels(ID,Titel,Artiest_ID,CD_Type) values (") + id +
-           Literal(",'") + title + Literal("',") + QString::number(artistId) + Literal(",'E')");
+           Literal(",'") + title + Literal("',") + artistId + Literal(",'E')");
 }
 
 QString insertLink(const QString &id, const QString &cd, const QString &disk, const QString &track,
-                   qint64 trackId)
+                   const QString &trackId)
 {
     return Literal("Insert into Compactdiscs(id,cdtitels_id,diskno,trackno,track_id) values (") +
            id + Literal(",") + cd + Literal(",") + disk + Literal(",") + track + Literal(",") +
-           QString::number(trackId) + Literal(")");
+           trackId + Literal(")");
 }
 
 const auto nextArtistId = QStringLiteral("Select max(ID)+1 as ID from Artiesten");
@@ -108,33 +106,34 @@ bool isThere(const QString &statement)
     return answer.RecordCount() >= 1;
 }
 
-// The id that the only row of the answer has in this field; none for any other number of rows.
-std::optional<qint64> onlyId(const QString &statement, QStringView field)
+// The id, in digits, that the only row of the answer has in this field; empty for any other number
+// of rows.
+QString onlyId(const QString &statement, QStringView field)
 {
     ADODB::Recordset answer;
     answer.Open(statement, *gConnection);
-    if (answer.RecordCount() != 1)
-        return std::nullopt;
-    return answer.Fields(field).Value().toLong();
+    return answer.RecordCount() == 1 ? answer.Fields(field).Value().toText() : QString();
 }
 
-qint64 findOrMakeArtist(const QString &artist)
+QString findOrMakeArtist(const QString &artist)
 {
-    if (const auto id = onlyId(selectArtist(artist), u"ID"))
-        return *id;
-    const qint64 id = nextId(nextArtistId, QLatin1String("ID"));
-    gConnection->Execute(insertArtist(id, artist));
+    QString id = onlyId(selectArtist(artist), u"ID");
+    if (id.isEmpty()) {
+        id = QString::number(nextId(nextArtistId, QLatin1String("ID")));
+        gConnection->Execute(insertArtist(id, artist));
+    }
     return id;
 }
 
 // A track that is there already keeps its genre and year, whatever the file says.
-qint64 findOrMakeTrack(const QString &title, qint64 artistId, const QString &genre,
-                       const QString &year)
+QString findOrMakeTrack(const QString &title, const QString &artistId, const QString &genre,
+                        const QString &year)
 {
-    if (const auto id = onlyId(selectTrack(title, artistId), u"trackid"))
-        return *id;
-    const qint64 id = nextId(nextTrackId, QLatin1String("ID"));
-    gConnection->Execute(insertTrack(id, artistId, title, genre, year));
+    QString id = onlyId(selectTrack(title, artistId), u"trackid");
+    if (id.isEmpty()) {
+        id = QString::number(nextId(nextTrackId, QLatin1String("ID")));
+        gConnection->Execute(insertTrack(id, artistId, title, genre, year));
+    }
     return id;
 }
 
@@ -196,8 +195,8 @@ void CatalogueLoad::tell(qsizetype number, qsizetype count)
 // No; the next clean-up takes those that nothing else points at.
 bool CatalogueLoad::load(const Track &track)
 {
-    const qint64 artistId = findOrMakeArtist(track.artist);
-    const qint64 trackId = findOrMakeTrack(track.title, artistId, track.genre, track.year);
+    const QString artistId = findOrMakeArtist(track.artist);
+    const QString trackId = findOrMakeTrack(track.title, artistId, track.genre, track.year);
     const bool newCd = track.mainTitleIndex.toLongLong() != mLastCdIndex;
     if (newCd && !beginCd(track, artistId))
         return false;
@@ -209,7 +208,7 @@ bool CatalogueLoad::load(const Track &track)
     return true;
 }
 
-bool CatalogueLoad::beginCd(const Track &track, qint64 artistId)
+bool CatalogueLoad::beginCd(const Track &track, const QString &artistId)
 {
     mCdAnswer = answerFor(track, artistId);
     if (mCdAnswer == vbCancel)
@@ -222,7 +221,7 @@ bool CatalogueLoad::beginCd(const Track &track, qint64 artistId)
     return true;
 }
 
-BoxAnswer CatalogueLoad::answerFor(const Track &track, qint64 artistId) const
+BoxAnswer CatalogueLoad::answerFor(const Track &track, const QString &artistId) const
 {
     const bool isCompilation = compilations();
     if (!isThere(isCompilation ? selectCompilation(track.mainTitle)

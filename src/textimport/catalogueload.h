@@ -34,8 +34,8 @@ private:
     struct Track;
     void tell(qsizetype number, qsizetype count);
     bool load(const Track &track); // false: cancelled
-    bool beginCd(const Track &track, qint64 artistId);
-    BoxAnswer answerFor(const Track &track, qint64 artistId) const;
+    bool beginCd(const Track &track, const QString &artistId);
+    BoxAnswer answerFor(const Track &track, const QString &artistId) const;
 
     qsizetype mImportedCount = 0;
     qint64 mLastCdIndex = 0;

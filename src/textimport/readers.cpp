@@ -4,6 +4,7 @@
 #include "platform/text/textrules.h"
 #include "shell/services/messages.h"
 
+#include <algorithm>
 #include <limits>
 
 QString ImportLines::next(FilePart part)
@@ -23,7 +24,6 @@ void ImportLines::refuse(const char *key) const
 namespace
 {
 
-constexpr double firstYear = 1901;
 constexpr qsizetype yearLength = 4;
 
 void requireTitle(const ImportLines &lines, QStringView title)
@@ -38,12 +38,21 @@ void requireArtist(const ImportLines &lines, QStringView artist)
         lines.refuse("EmptyLineFoundArtist");
 }
 
+// Four plain digits compare as text as they do by value.
+bool reachesFirstYear(QStringView year)
+{
+    const bool plain =
+        std::all_of(year.begin(), year.end(), [](QChar c) { return c >= u'0' && c <= u'9'; });
+    return plain ? year >= QStringView(u"1901") : year.toDouble() >= 1901;
+}
+
 // Any number of four characters will do, "2e03" as well: it is judged by its value.
 void requireYear(const ImportLines &lines, QStringView year)
 {
     if (year.isEmpty())
         return;
-    if (year.size() != yearLength || !text::isNumeric(year) || year.toDouble() < firstYear)
+    const bool numeric = year.size() == yearLength && text::isNumeric(year);
+    if (!numeric || !reachesFirstYear(year))
         lines.refuse("InvalidYearFound");
 }
 

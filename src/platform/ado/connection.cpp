@@ -70,10 +70,10 @@ int bind(sqlite3_stmt *s, const Dialect &dialect)
     for (const auto &l : dialect.literals()) {
         ++place;
         const auto text = dialect.text(l);
-        if (l.kind == Dialect::Literal::Text)
+        if (l.kind == Literal::Text)
             code =
                 sqlite3_bind_text64(s, place, text.data(), text.size(), SQLITE_STATIC, SQLITE_UTF8);
-        else if (l.kind == Dialect::Literal::Integer)
+        else if (l.kind == Literal::Integer)
             code = sqlite3_bind_int64(s, place, l.integer);
         else
             code = sqlite3_bind_double(s, place, l.real);
@@ -204,14 +204,17 @@ void Connection::Open(const QString &, const QString &, const QString &connectio
         throw makeError(errNotPermitted);
     if (!connectionString.isEmpty())
         ConnectionString = connectionString;
+    // The engine's book-keeping of its memory, which nobody reads, would lock at each allocation.
+    [[maybe_unused]] static const int once = sqlite3_config(SQLITE_CONFIG_MEMSTATUS, 0);
     mEngine = std::make_unique<Engine>();
     try {
         const QByteArray file = dataSource(ConnectionString).toUtf8();
         if (file.isEmpty()) // to the engine, a temporary file of its own
             throw makeError(errCannotUse);
         const int access = Mode == adModeRead ? SQLITE_OPEN_READONLY : SQLITE_OPEN_READWRITE;
-        check(sqlite3_open_v2(file.constData(), &mEngine->db, access | SQLITE_OPEN_EXRESCODE,
-                              nullptr));
+        // The program has one thread: the engine need not lock at each call.
+        const int flags = access | SQLITE_OPEN_EXRESCODE | SQLITE_OPEN_NOMUTEX;
+        check(sqlite3_open_v2(file.constData(), &mEngine->db, flags, nullptr));
         // Another program's short lock is waited for; a longer wait would freeze the screen.
         sqlite3_busy_timeout(mEngine->db, std::min(ConnectionTimeout, 1) * 1000);
         sqlite3_db_config(mEngine->db, SQLITE_DBCONFIG_DEFENSIVE, 1, nullptr);
@@ -237,8 +240,7 @@ void Connection::Close()
 Recordset Connection::Execute(const QString &statement, int)
 {
     Recordset answer;
-    auto rows = run(statement);
-    if (rows->columnCount() > 0)
+    if (auto rows = run(statement))
         answer.adopt(std::move(rows));
     return answer;
 }
@@ -260,7 +262,9 @@ std::shared_ptr<const Rows> Connection::run(const QString &statement)
     const Running running(s);
     check(bind(s, mEngine->dialect));
     code = firstStep(prepared);
-    auto rows = std::make_shared<Rows>(prepared.fields);
+    std::shared_ptr<Rows> rows; // none for a change
+    if (!prepared.fields->empty())
+        rows = std::make_shared<Rows>(prepared.fields);
     for (; code == SQLITE_ROW; code = sqlite3_step(s))
         readRow(s, *rows);
     check(code);

@@ -11,19 +11,18 @@ namespace ADODB
 namespace
 {
 
+// Every statement of the program passes through here, those of long loads a hundred thousand times:
+// the small functions below are kept free of calls and allocations.
+
 bool startsWord(QChar c)
 {
-    return c == u'_' || c.unicode() >= 0x80 || c.isLetter();
+    const char16_t u = c.unicode(), small = u | 0x20;
+    return (small >= u'a' && small <= u'z') || u == u'_' || u >= 0x80;
 }
 
 bool inWord(QChar c)
 {
     return startsWord(c) || (c >= u'0' && c <= u'9');
-}
-
-bool isDigit(QChar c)
-{
-    return c >= u'0' && c <= u'9';
 }
 
 bool isBlank(QChar c)
@@ -50,28 +49,22 @@ qsizetype wordEnd(QStringView s, qsizetype i)
     return i;
 }
 
+// The keyword is in small letters.
 bool is(QStringView word, QLatin1String keyword)
 {
-    return word.compare(keyword, Qt::CaseInsensitive) == 0;
+    if (word.size() != keyword.size())
+        return false;
+    for (qsizetype i = 0; i < word.size(); ++i) {
+        if ((word[i].unicode() | 0x20) != keyword[i].unicode())
+            return false;
+    }
+    return true;
 }
 
 bool nextWordIs(QStringView s, qsizetype i, QLatin1String keyword)
 {
     i = skipBlanks(s, i);
     return is(s.sliced(i, wordEnd(s, i) - i), keyword);
-}
-
-void appendUtf8(std::string &out, QStringView s)
-{
-    for (const QChar c : s) {
-        if (c.unicode() >= 0x80) {
-            const QByteArray bytes = s.toUtf8();
-            out.append(bytes.constData(), std::size_t(bytes.size()));
-            return;
-        }
-    }
-    for (const QChar c : s)
-        out.push_back(char(c.unicode()));
 }
 
 // SHAPE { select ... } as X compute X by a, b: the select alone, each row once.
@@ -102,25 +95,39 @@ void Dialect::refuse(const QString &why) const
 
 void Dialect::translate(QStringView statement)
 {
+    mKnown = mShapes.match(statement, mLiterals);
+    if (mKnown)
+        return;
+    begin(statement);
+    const QStringView first = statement.sliced(mAt, wordEnd(statement, mAt) - mAt);
+    mLifts = !isOneOf(first, {"create", "alter", "drop"});
+    if (is(first, QLatin1String("shape"))) {
+        translateShape(statement);
+        return;
+    }
+    if (mLifts && !isOneOf(first, {"select", "insert", "update", "delete"}))
+        refuse(first.toString());
+    translatePiece(statement);
+    mShapes.remember(statement, mGaps, mSql);
+}
+
+void Dialect::begin(QStringView statement)
+{
     mSql.clear();
-    mTexts.clear();
     mLiterals.clear();
+    mGaps.clear();
     mAt = skipBlanks(statement, 0);
     mEnded = false;
     mOrdinals.assign(1, false);
     mValues = Values::None;
     mDelete = Delete::None;
-    const QStringView first = statement.sliced(mAt, wordEnd(statement, mAt) - mAt);
-    mLifts = !isOneOf(first, {"create", "alter", "drop"});
-    if (is(first, QLatin1String("shape"))) {
-        const QString content = shapeContent(statement);
-        mAt = 0;
-        translatePiece(content);
-    } else if (!mLifts || isOneOf(first, {"select", "insert", "update", "delete"})) {
-        translatePiece(statement);
-    } else {
-        refuse(first.toString());
-    }
+}
+
+void Dialect::translateShape(QStringView statement)
+{
+    const QString content = shapeContent(statement);
+    mAt = 0;
+    translatePiece(content);
 }
 
 void Dialect::translatePiece(QStringView s)
@@ -137,7 +144,7 @@ void Dialect::translatePiece(QStringView s)
             refuse(QString(c));
         if (startsWord(c))
             word(s);
-        else if (isDigit(c) || (c == u'.' && isDigit(charAt(s, mAt + 1))))
+        else if (startsNumber(s, mAt))
             number(s);
         else if (c == u'\'' || c == u'"')
             quoted(s);
@@ -215,96 +222,48 @@ void Dialect::deleteAlias(QStringView w)
 void Dialect::quoted(QStringView s)
 {
     const char16_t quote = s[mAt].unicode();
-    auto end = mAt + 1;
-    for (;; ++end) {
-        if (end >= s.size())
-            refuse(QString(QChar(quote)));
-        if (s[end] != quote)
-            continue;
-        if (charAt(s, end + 1) != quote)
-            break;
-        ++end;
-    }
+    const auto end = closingQuote(s, mAt);
+    if (end < 0)
+        refuse(QString(QChar(quote)));
     if (inWord(charAt(s, end + 1)))
         refuse(s.sliced(end + 1, wordEnd(s, end + 1) - end - 1).toString());
-    literalText(s.sliced(mAt + 1, end - mAt - 1), quote);
+    if (mLifts) {
+        mLiterals.addText(s.sliced(mAt + 1, end - mAt - 1), quote);
+        mGaps.push_back({mAt, end + 1, quote});
+        mSql.push_back('?');
+    } else {
+        keepText(s.sliced(mAt + 1, end - mAt - 1), quote);
+    }
     mAt = end + 1;
 }
 
-// The text between the quotes, doubled quotes undone, in NFC.
-void Dialect::literalText(QStringView s, char16_t quote)
+// A text that cannot be lifted, between single quotes.
+void Dialect::keepText(QStringView content, char16_t quote)
 {
-    Literal l{Literal::Text, mTexts.size()};
-    bool ascii = true;
-    for (qsizetype i = 0; i < s.size() && ascii; ++i) {
-        const char16_t c = s[i].unicode();
-        ascii = c < 0x80;
-        mTexts.push_back(char(c));
-        if (c == quote)
-            ++i;
-    }
-    if (!ascii) {
-        mTexts.resize(l.offset);
-        const QString once(1, QChar(quote)), twice(2, QChar(quote));
-        QString undone = s.toString();
-        undone.replace(twice, once);
-        appendUtf8(mTexts, undone.normalized(QString::NormalizationForm_C));
-    }
-    l.size = mTexts.size() - l.offset;
-    if (mLifts) {
-        mLiterals.push_back(l);
-        mSql.push_back('?');
-    } else {
-        const std::string content = mTexts.substr(l.offset);
-        if (content.find('\0') != std::string::npos)
-            refuse(QString(QChar(quote)));
-        mSql.push_back('\'');
-        for (const char c : content)
-            mSql.append(c == '\'' ? 2 : 1, c);
-        mSql.push_back('\'');
-    }
+    if (content.contains(QChar::Null))
+        refuse(QString(QChar(quote)));
+    QString text = content.toString();
+    text.replace(QString(2, QChar(quote)), QString(1, QChar(quote)));
+    text.replace(u'\'', QLatin1String("''"));
+    mSql.push_back('\'');
+    appendUtf8(mSql, text.normalized(QString::NormalizationForm_C));
+    mSql.push_back('\'');
 }
 
 void Dialect::number(QStringView s)
 {
     const auto from = mAt;
-    auto skipDigits = [&] {
-        while (isDigit(charAt(s, mAt)))
-            ++mAt;
-    };
-    skipDigits();
-    bool whole = true;
-    if (charAt(s, mAt) == u'.') {
-        whole = false;
-        ++mAt;
-        skipDigits();
-    }
-    if (charAt(s, mAt).toLower() == u'e') {
-        auto digits = mAt + 1;
-        if (charAt(s, digits) == u'+' || charAt(s, digits) == u'-')
-            ++digits;
-        if (isDigit(charAt(s, digits))) {
-            whole = false;
-            mAt = digits;
-            skipDigits();
-        }
-    }
-    const QStringView text = s.sliced(from, mAt - from);
+    mAt = numberEnd(s, from);
+    const QStringView digits = s.sliced(from, mAt - from);
     if (inWord(charAt(s, mAt)))
-        refuse(text.toString() + s[mAt]);
-    if (!liftsHere()) {
-        appendUtf8(mSql, text);
-        return;
+        refuse(digits.toString() + s[mAt]);
+    if (liftsHere()) {
+        mLiterals.addNumber(digits);
+        mGaps.push_back({from, mAt, 0});
+        mSql.push_back('?');
+    } else {
+        appendUtf8(mSql, digits);
     }
-    Literal l{Literal::Integer};
-    bool fits = false;
-    l.integer = whole ? text.toLongLong(&fits) : 0;
-    if (!fits) {
-        l.kind = Literal::Real;
-        l.real = text.toDouble();
-    }
-    mLiterals.push_back(l);
-    mSql.push_back('?');
 }
 
 void Dialect::otherSign(QStringView s)

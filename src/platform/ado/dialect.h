@@ -1,9 +1,6 @@
 #pragma once
 
-#include <QStringView>
-#include <string>
-#include <string_view>
-#include <vector>
+#include "platform/ado/statementshapes.h"
 
 namespace ADODB
 {
@@ -19,36 +16,34 @@ namespace ADODB
 class Dialect
 {
 public:
-    struct Literal {
-        enum Kind { Text, Integer, Real } kind;
-        std::size_t offset = 0, size = 0; // of a text, in texts()
-        qint64 integer = 0;
-        double real = 0;
-    };
-
     /// Takes a statement; sql() and literals() hold until the next call. Throws Error errSyntax.
     void translate(QStringView statement);
 
-    const std::string &sql() const { return mSql; }
-    const std::vector<Literal> &literals() const { return mLiterals; }
-    std::string_view text(const Literal &l) const { return {mTexts.data() + l.offset, l.size}; }
+    const std::string &sql() const { return mKnown ? *mKnown : mSql; }
+    const std::vector<Literal> &literals() const { return mLiterals.all(); }
+    std::string_view text(const Literal &l) const { return mLiterals.text(l); }
 
 private:
+    void begin(QStringView statement);
+    void translateShape(QStringView statement);
     void translatePiece(QStringView s);
     void word(QStringView s);
     void otherSign(QStringView s);
     void quoted(QStringView s);
+    void keepText(QStringView content, char16_t quote);
     void number(QStringView s);
     void sign(QStringView s);
     void afterWord(QStringView s, QStringView w);
     bool maxOfSum(QStringView s);
     void deleteAlias(QStringView w);
-    void literalText(QStringView s, char16_t quote);
     bool liftsHere() const { return mLifts && !mOrdinals.back(); }
     [[noreturn]] void refuse(const QString &why) const;
 
-    std::string mSql, mTexts;
-    std::vector<Literal> mLiterals;
+    std::string mSql;
+    Literals mLiterals;
+    StatementShapes mShapes;
+    StatementShapes::Gaps mGaps;
+    const std::string *mKnown = nullptr; // the SQL of a shape seen before
 
     // Where in the statement the scan stands.
     qsizetype mAt = 0;

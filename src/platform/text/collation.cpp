@@ -5,14 +5,13 @@
 #include <string>
 #include <unicode/ucol.h>
 #include <unicode/uiter.h>
+#include <vector>
 
 namespace text
 {
 
 namespace
 {
-
-constexpr unsigned latinEnd = 0x250;
 
 UCollator *openRoot(UCollationStrength strength)
 {
@@ -30,17 +29,10 @@ UCollationResult compareUnits(const UCollator *collator, char16_t a, char16_t b)
     return ucol_strcoll(collator, &a, 1, &b, 1);
 }
 
-/// The character at a place if it is ASCII or one of the Latin letters with accents, which take two
-/// bytes; otherwise the end of these.
-unsigned latinAt(std::string_view s, std::size_t at)
+// A mark may stand here, which would join the character before it into another one.
+bool mayJoin(std::string_view s, std::size_t at)
 {
-    const auto byte = [&](std::size_t i) { return static_cast<unsigned char>(s[i]); };
-    const unsigned lead = byte(at);
-    if (lead < 0x80)
-        return lead;
-    const bool pair = at + 1 < s.size() && (byte(at + 1) & 0xC0) == 0x80;
-    const unsigned c = (lead & 0x1F) << 6 | (pair ? byte(at + 1) & 0x3F : 0);
-    return pair && lead >= 0xC3 && lead < 0xE0 && c < latinEnd ? c : latinEnd;
+    return at < s.size() && static_cast<unsigned char>(s[at]) > 0xC9;
 }
 
 } // namespace
@@ -86,39 +78,64 @@ void Collation::rankCharacters()
     }
 }
 
+// Letters with accents have the primary order of their base, and one among themselves.
 void Collation::rankAccented()
 {
-    mLatinRank.assign(mRank.begin(), mRank.end());
-    mLatinRank.resize(latinEnd, 0);
     UCollator *primary = openRoot(UCOL_PRIMARY);
-    for (char16_t c = 0xC0; c < latinEnd; ++c) {
-        for (char16_t base = 'a'; base <= 'z' && mLatinRank[c] == 0; ++base) {
+    for (char16_t base = 'a'; base <= 'z'; ++base) {
+        std::vector<char16_t> letters{base};
+        for (char16_t c = 0xC0; c < latinEnd; ++c) {
             if (compareUnits(primary, c, base) == UCOL_EQUAL)
-                mLatinRank[c] = mRank[base];
+                letters.push_back(c);
+        }
+        std::stable_sort(letters.begin(), letters.end(), [this](char16_t a, char16_t b) {
+            return compareUnits(mCollator, a, b) == UCOL_LESS;
+        });
+        for (std::size_t i = 0; i < letters.size(); ++i) {
+            const bool next = i > 0 && compareUnits(mCollator, letters[i - 1], letters[i]) != 0;
+            mRank[letters[i]] = mRank[base];
+            mAccent[letters[i]] = i > 0 ? std::uint8_t(mAccent[letters[i - 1]] + next) : 0;
         }
     }
     ucol_close(primary);
 }
 
+// The character at a place, which moves on behind it; 0 if its order is not known here.
+unsigned Collation::latinAt(std::string_view s, std::size_t &at)
+{
+    const unsigned c = static_cast<unsigned char>(s[at++]);
+    if (c < 0x80)
+        return c;
+    if (c < 0xC3 || c > 0xC9 || at >= s.size() || (s[at] & 0xC0) != 0x80)
+        return 0;
+    const unsigned letter = (c & 0x1F) << 6 | (static_cast<unsigned char>(s[at++]) & 0x3F);
+    return letter < latinEnd ? letter : 0;
+}
+
 int Collation::compare(std::string_view a, std::string_view b) const
 {
-    const std::size_t both = std::min(a.size(), b.size());
-    std::size_t i = 0;
-    for (; i < both; ++i) {
-        const auto x = static_cast<unsigned char>(a[i]), y = static_cast<unsigned char>(b[i]);
-        if ((x | y) & 0x80 || mRank[x] == 0 || mRank[y] == 0)
-            break;
-        if (mRank[x] != mRank[y]) {
-            // A mark behind one of the two could still join it into another letter.
-            const bool joined =
-                (i + 1 < a.size() && a[i + 1] & 0x80) || (i + 1 < b.size() && b[i + 1] & 0x80);
-            if (joined)
-                break;
-            return mRank[x] < mRank[y] ? -1 : 1;
-        }
+    std::size_t i = 0, j = 0;
+    int byAccent = 0; // counts if nothing else tells the two apart
+    while (i < a.size() && j < b.size()) {
+        const unsigned x = latinAt(a, i), y = latinAt(b, j);
+        const int rankX = mRank[x], rankY = mRank[y];
+        if (rankX == 0 || rankY == 0)
+            return compareAll(a, b);
+        if (rankX != rankY)
+            return mayJoin(a, i) || mayJoin(b, j) ? compareAll(a, b) : rankX - rankY;
+        if (byAccent == 0)
+            byAccent = mAccent[x] - mAccent[y];
     }
-    if (i == a.size() && i == b.size())
-        return 0;
+    if (i == a.size() && j == b.size())
+        return byAccent;
+    const bool longerA = i < a.size();
+    if (mRank[longerA ? latinAt(a, i) : latinAt(b, j)] == 0)
+        return compareAll(a, b);
+    return longerA ? 1 : -1;
+}
+
+int Collation::compareAll(std::string_view a, std::string_view b) const
+{
     UErrorCode status = U_ZERO_ERROR;
     return ucol_strcollUTF8(mCollator, a.data(), int32_t(a.size()), b.data(), int32_t(b.size()),
                             &status);
@@ -130,13 +147,12 @@ bool Collation::sortPrefix(std::string_view s, std::uint64_t &prefix, std::size_
     used = 0;
     for (int shift = 56; shift >= 0 && used < s.size(); shift -= 8) {
         const unsigned c = latinAt(s, used);
-        if (c >= latinEnd || mLatinRank[c] == 0)
+        if (mRank[c] == 0)
             return false;
-        used += c < 0x80 ? 1 : 2;
-        prefix |= std::uint64_t(mLatinRank[c]) << shift;
+        prefix |= std::uint64_t(mRank[c]) << shift;
     }
     // A mark behind the last letter could still change it.
-    return used >= s.size() || latinAt(s, used) < latinEnd;
+    return !mayJoin(s, used);
 }
 
 std::uint64_t Collation::sortKeyStart(std::string_view s) const

@@ -3,7 +3,6 @@
 #include <array>
 #include <cstdint>
 #include <string_view>
-#include <vector>
 
 struct UCollator;
 
@@ -18,7 +17,7 @@ class Collation
 public:
     static const Collation &root();
 
-    /// Below, equal to or above 0, as a sorts before, with or after b. ASCII texts take a short way
+    /// Below, equal to or above 0, as a sorts before, with or after b. Latin texts take a short way
     /// that gives the same answer.
     int compare(std::string_view a, std::string_view b) const;
 
@@ -43,11 +42,17 @@ private:
     ~Collation();
     void rankCharacters();
     void rankAccented();
+    static unsigned latinAt(std::string_view s, std::size_t &at);
+    int compareAll(std::string_view a, std::string_view b) const;
+
+    static constexpr unsigned latinEnd = 0x250;
 
     UCollator *mCollator = nullptr;
     std::uint32_t mVersion = 0;
-    std::array<std::uint8_t, 128> mRank{}; // primary order of ASCII; 0: takes the long way
-    std::vector<std::uint8_t> mLatinRank;  // the same, letters with accents included
+
+    // Of ASCII and Latin letters: primary order, 0 for what takes the long way; and the order of
+    // the accents that a letter may have.
+    std::array<std::uint8_t, latinEnd> mRank{}, mAccent{};
 };
 
 } // namespace text

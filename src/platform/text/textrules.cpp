@@ -18,26 +18,40 @@ bool partsWords(QChar c)
     return c.isSpace() || c.category() == QChar::Other_Control;
 }
 
+QChar cased(QChar c, bool capital)
+{
+    const char16_t u = c.unicode();
+    if (u >= 0x80)
+        return capital ? c.toUpper() : c.toLower();
+    const bool letter = (u | 0x20) >= u'a' && (u | 0x20) <= u'z';
+    return letter ? QChar(char16_t(capital ? u & ~0x20 : u | 0x20)) : c;
+}
+
+// The pair of surrogates at p.
+void casePair(QChar *p, bool capital)
+{
+    const char32_t u = QChar::surrogateToUcs4(p[0], p[1]);
+    const char32_t mapped = capital ? QChar::toUpper(u) : QChar::toLower(u);
+    if (QChar::requiresSurrogates(mapped)) {
+        p[0] = QChar(QChar::highSurrogate(mapped));
+        p[1] = QChar(QChar::lowSurrogate(mapped));
+    }
+}
+
 } // namespace
 
 QString properCase(const QString &s)
 {
     QString out = s;
     bool first = true;
-    for (qsizetype i = 0; i < out.size(); ++i) {
-        const QChar c = out.at(i);
-        if (c.isHighSurrogate() && i + 1 < out.size() && out.at(i + 1).isLowSurrogate()) {
-            const char32_t u = QChar::surrogateToUcs4(c, out.at(i + 1));
-            const char32_t mapped = first ? QChar::toUpper(u) : QChar::toLower(u);
-            if (QChar::requiresSurrogates(mapped)) {
-                out[i] = QChar(QChar::highSurrogate(mapped));
-                out[i + 1] = QChar(QChar::lowSurrogate(mapped));
-            }
-            ++i;
-        } else {
-            out[i] = first ? c.toUpper() : c.toLower();
-        }
-        first = partsWords(c);
+    QChar *const end = out.data() + out.size();
+    for (QChar *p = out.data(); p < end; ++p) {
+        const QChar c = *p;
+        if (c.isHighSurrogate() && p + 1 < end && p[1].isLowSurrogate())
+            casePair(p++, first);
+        else
+            *p = cased(c, first);
+        first = c.unicode() <= u' ' || (c.unicode() >= 0x7F && partsWords(c));
     }
     return out;
 }
