@@ -2,9 +2,9 @@
 
 #include "platform/desktop/drawingfreeze.h"
 #include "platform/desktop/form.h"
+#include "platform/desktop/modalloop.h"
 #include "platform/desktop/qtdesktop.h"
 
-#include <QEventLoop>
 #include <QTest>
 #include <QTimer>
 
@@ -90,19 +90,16 @@ void ScriptedDesktop::showModal(Form &form)
         failTest(QStringLiteral("Unexpected modal screen: ") + form.Name());
     }
     QPointer<Form> alive = &form;
-    QEventLoop loop;
-    QObject::connect(&form, &Form::hid, &loop, &QEventLoop::quit);
-    QObject::connect(&form, &QObject::destroyed, &loop, &QEventLoop::quit);
-    QTimer::singleShot(modalAtMost, &loop, [&] {
-        failTest(QStringLiteral("The modal screen did not end: ") + form.Name());
-        loop.quit();
+    QTimer guard;
+    guard.setSingleShot(true);
+    QObject::connect(&guard, &QTimer::timeout, &form, [alive] {
+        failTest(QStringLiteral("The modal screen did not end: ") + alive->Name());
+        alive->hide();
     });
+    guard.start(modalAtMost);
     if (script)
         QTimer::singleShot(0, &form, [script, alive] { script(*alive); });
-    form.setWindowModality(Qt::ApplicationModal);
-    form.setWindowFlag(Qt::Dialog);
-    form.show();
-    loop.exec();
+    runModal(form);
 }
 
 QString ScriptedDesktop::nextFile(const char *dialog)

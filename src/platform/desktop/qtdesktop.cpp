@@ -1,13 +1,12 @@
 #include "platform/desktop/qtdesktop.h"
 
 #include "platform/desktop/drawingfreeze.h"
-#include "platform/desktop/form.h"
+#include "platform/desktop/modalloop.h"
 #include "platform/desktop/programfolder.h"
 #include "platform/text/textrules.h"
 
 #include <QApplication>
 #include <QDesktopServices>
-#include <QEventLoop>
 #include <QFileDialog>
 #include <QKeyEvent>
 #include <QKeySequence>
@@ -110,15 +109,7 @@ BoxAnswer QtDesktop::messageBox(BoxKind kind, BoxButtons buttons, const QString 
 
 void QtDesktop::showModal(Form &form)
 {
-    const auto frameless = form.windowFlags() & Qt::FramelessWindowHint;
-    form.setWindowFlags(Qt::Dialog | frameless);
-    form.setWindowModality(Qt::ApplicationModal);
-    QEventLoop loop;
-    QObject::connect(&form, &Form::hid, &loop, &QEventLoop::quit);
-    QObject::connect(&form, &QObject::destroyed, &loop, &QEventLoop::quit);
-    form.show();
-    form.activateWindow();
-    loop.exec();
+    runModal(form);
 }
 
 QString QtDesktop::openFileName(const FileQuestion &question)
