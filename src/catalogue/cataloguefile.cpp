@@ -66,9 +66,8 @@ QByteArray pragma(const char *name, int value)
 
 bool mayBeWritten(const QFileInfo &file)
 {
-    // The rights are looked at as well: for some users the system ignores them.
-    constexpr auto anyWrite =
-        QFile::WriteOwner | QFile::WriteUser | QFile::WriteGroup | QFile::WriteOther;
+    // The bits are looked at as well: some users the system does not stop, and "WriteUser" says so.
+    constexpr auto anyWrite = QFile::WriteOwner | QFile::WriteGroup | QFile::WriteOther;
     const QFileInfo folder(file.absolutePath());
     return file.isWritable() && (file.permissions() & anyWrite) && folder.isWritable() &&
            (folder.permissions() & anyWrite);
@@ -78,32 +77,36 @@ bool mayBeWritten(const QFileInfo &file)
 
 void create(const QString &file)
 {
+    if (QFile::exists(file))
+        throw ADODB::engineError(SQLITE_CANTOPEN, file);
     sqlite3 *db = nullptr;
-    int code = SQLITE_CANTOPEN;
-    if (!QFile::exists(file))
-        code = sqlite3_open(file.toUtf8().constData(), &db);
+    int code = sqlite3_open(file.toUtf8().constData(), &db);
     if (code == SQLITE_OK)
         code = ADODB::registerFunctions(db);
     const auto run = [&](const char *sql) {
         if (code == SQLITE_OK)
             code = sqlite3_exec(db, sql, nullptr, nullptr, nullptr);
     };
+    run("begin");
     run(pragma("application_id", applicationId).constData());
     run(pragma("user_version", currentVersion()).constData());
-    run("begin");
     run(schema);
     run("commit");
     sqlite3_close(db);
-    if (code != SQLITE_OK)
+    if (code != SQLITE_OK) {
+        QFile::remove(file); // a half one must not be taken for a catalogue
         throw ADODB::engineError(code, file);
+    }
 }
 
 void inspect(const QString &name)
 {
     const QFileInfo info(name);
     QFile file(name);
-    if (info.isDir() || !file.open(QIODevice::ReadOnly))
+    if (info.isDir())
         refuse(ADODB::errCannotUse, "xNotACatalogue");
+    if (!file.open(QIODevice::ReadOnly))
+        throw ADODB::engineError(SQLITE_CANTOPEN, file.errorString());
     const QByteArray header = file.read(headerSize);
     const bool database = header.size() == headerSize && header.startsWith("SQLite format 3");
     if (!database ||
@@ -156,6 +159,8 @@ void verify(ADODB::Connection &connection, bool thorough)
     const bool check = thorough || file.size() <= quicklyChecked;
     if (check && connection.housekeeping("PRAGMA quick_check(1)") != QLatin1String("ok"))
         refuse(ADODB::errCannotUse, "xDamaged");
+    // Another program may have left it in a mode that keeps files beside it.
+    connection.housekeeping("PRAGMA journal_mode=DELETE");
     keepSortOrder(connection);
 }
 

@@ -4,10 +4,12 @@
 #include "platform/desktop/desktop.h"
 #include "platform/desktop/programfolder.h"
 #include "shell/services/clsRegistry.h"
+#include "shell/services/fileutilities.h"
 #include "shell/services/messages.h"
 
 #include <QDir>
 #include <QFileInfo>
+#include <QSaveFile>
 
 namespace
 {
@@ -22,12 +24,15 @@ bool firstStart(const QString &folder)
     return !startedBefore && !QFileInfo::exists(folder);
 }
 
-// The copy of a resource comes read-only.
+// On the disk before it returns: the folder gets its name only with the catalogue whole in it.
 bool copyCatalogue(const QString &to)
 {
-    return QFile::copy(QLatin1String(shipped), to) &&
-           QFile::setPermissions(to, QFile::ReadOwner | QFile::WriteOwner | QFile::ReadGroup |
-                                         QFile::ReadOther);
+    QFile from(QLatin1String{shipped});
+    QSaveFile copy(to);
+    if (!from.open(QIODevice::ReadOnly) || !copy.open(QIODevice::WriteOnly))
+        return false;
+    copy.write(from.readAll());
+    return copy.commit();
 }
 
 } // namespace
@@ -45,4 +50,5 @@ void provisionCatalogue()
     if (!made)
         throw ADODB::Error(ADODB::errCannotUse, QStringLiteral("Songcase"),
                            GetMessage("xCannotMakeCatalogue") + QDir::toNativeSeparators(folder));
+    syncFolder(QFileInfo(folder).absolutePath());
 }
