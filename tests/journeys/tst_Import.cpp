@@ -126,10 +126,10 @@ void tst_Import::aFileOfEachFormat_data()
     QTest::addColumn<bool>("flat");
     for (const int language : {languageEnglish, languageDutch}) {
         const QByteArray in = language == languageDutch ? ", Dutch" : ", English";
-        QTest::newRow("compilations, nested" + in) << language << compilationNested << false << false;
-        QTest::newRow("compilations, flat" + in) << language << compilationFlat << false << true;
-        QTest::newRow("albums, nested" + in) << language << albumNested << true << false;
-        QTest::newRow("albums, flat" + in) << language << albumFlat << true << true;
+        QTest::newRow(QByteArray("compilations, nested").append(in)) << language << compilationNested << false << false;
+        QTest::newRow(QByteArray("compilations, flat").append(in)) << language << compilationFlat << false << true;
+        QTest::newRow(QByteArray("albums, nested").append(in)) << language << albumNested << true << false;
+        QTest::newRow(QByteArray("albums, flat").append(in)) << language << albumFlat << true << true;
     }
 }
 
@@ -159,9 +159,9 @@ void tst_Import::theQuestionAboutASecondCopy_data()
     QTest::addColumn<int>("titles");
     for (const int language : {languageEnglish, languageDutch}) {
         const QByteArray in = language == languageDutch ? ", Dutch" : ", English";
-        QTest::newRow("Yes" + in) << language << int(vbYes) << 2;
-        QTest::newRow("No" + in) << language << int(vbNo) << 1;
-        QTest::newRow("Cancel" + in) << language << int(vbCancel) << 1;
+        QTest::newRow(QByteArray("Yes").append(in)) << language << int(vbYes) << 2;
+        QTest::newRow(QByteArray("No").append(in)) << language << int(vbNo) << 1;
+        QTest::newRow(QByteArray("Cancel").append(in)) << language << int(vbCancel) << 1;
     }
 }
 

@@ -91,8 +91,8 @@ void tst_Screens::everyScreen_data()
         {"frmImportBusy", make<frmImportBusy>()},   {"frmImport", make<frmImport>()},
         {"frmImportDBBusy", make<frmImportDBBusy>()}};
     for (const auto &[name, make] : screens) {
-        QTest::newRow(QByteArray(name) + ", English") << languageEnglish << make;
-        QTest::newRow(QByteArray(name) + ", Dutch") << languageDutch << make;
+        QTest::newRow(QByteArray(name).append(", English")) << languageEnglish << make;
+        QTest::newRow(QByteArray(name).append(", Dutch")) << languageDutch << make;
     }
 }
 
@@ -117,8 +117,8 @@ void tst_Screens::everyScreen()
         QVERIFY2(!text.contains(QLatin1String("Unknown")) && !text.contains(QLatin1String("Onbekend")), name);
         if (isPartOfAnother(w) || !w->isVisible())
             continue;
-        QVERIFY2(!needsName(w) || hasName(w, screen), name + ": no name for a screen reader");
-        QVERIFY2(!isCut(w), name + ": text cut: " + text.toUtf8());
+        QVERIFY2(!needsName(w) || hasName(w, screen), QByteArray(name).append(": no name for a screen reader"));
+        QVERIFY2(!isCut(w), QByteArray(name).append(": text cut: ").append(text.toUtf8()));
     }
     screen->Unload();
     QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
