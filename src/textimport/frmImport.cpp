@@ -1,0 +1,91 @@
+#include "textimport/frmImport.h"
+
+#include "shell/services/captions.h"
+#include "shell/services/frame.h"
+#include "shell/services/globals.h"
+#include "shell/services/messages.h"
+#include "textimport/frmImportDBBusy.h"
+#include "textimport/importrecords.h"
+#include "ui_frmImport.h"
+
+#include <QStyle>
+
+namespace
+{
+
+// The columns, in the order of importfield: the key of the head and the share of the width.
+struct Column {
+    const char *key;
+    int percent;
+};
+constexpr Column columns[] = {{"No", 7},     {"Artiest", 20}, {"Titel", 22},
+                              {"Genre", 10}, {"HitYear", 7},  {"CD-Titel", 14},
+                              {"CD-nr", 7},  {"Disknr", 6},   {"Track", 7}};
+
+} // namespace
+
+frmImport::frmImport() : Form(QStringLiteral("frmImport")), mUi(std::make_unique<Ui::frmImport>())
+{
+    mUi->setupUi(this);
+    connect(mUi->StartDBImport, &QPushButton::clicked, this, &frmImport::StartDBImport_Click);
+}
+
+frmImport::~frmImport() = default;
+
+void frmImport::Form_Load()
+{
+    const Hourglass hourglass(this);
+    applyCaptions(this, {{"frmImport", "frmImportCaption"},
+                         {"lbltext", "lblImport"},
+                         {"StartDBImport", "StartDBImportCaption"}});
+    mUi->ImportListView->setAccessibleName(GetMessage("xTracksRead"));
+    fillList();
+    mUi->StartDBImport->setEnabled(gImportRecords->RecordCount() > 0);
+    releaseFrame();
+    setFramePointer(vbDefault);
+}
+
+void frmImport::fillList()
+{
+    if (!gImportRecords)
+        gImportRecords = newImportRecords();
+    mUi->ImportListView->setRecordset(gImportRecords);
+    mUi->ImportListView->Populate();
+    int index = 0;
+    for (const Column &column : columns)
+        mUi->ImportListView->ColumnHeaders().Item(++index).setText(GetMessage(column.key));
+    fitColumns();
+}
+
+// The whole width is used, less the room of a scroll bar.
+void frmImport::fitColumns()
+{
+    DBListViewCTL *list = mUi->ImportListView;
+    if (list->ColumnHeaders().Count() == 0)
+        return;
+    const int scrollBar = style()->pixelMetric(QStyle::PM_ScrollBarExtent, nullptr, list);
+    const int width = list->width() - 2 * list->frameWidth() - scrollBar;
+    int index = 0;
+    for (const Column &column : columns)
+        list->ColumnHeaders().Item(++index).setWidth(qMax(1, width * column.percent / 100));
+}
+
+void frmImport::resizeEvent(QResizeEvent *event)
+{
+    Form::resizeEvent(event);
+    fitColumns();
+}
+
+// Nothing of this screen may be used behind this: a load that succeeds unloads it.
+void frmImport::StartDBImport_Click()
+{
+    defaultInstance<frmImportDBBusy>().ShowModal();
+}
+
+void frmImport::Form_Unload()
+{
+    if (gImportRecords && gImportRecords->State() == ADODB::adStateOpen)
+        gImportRecords->Close();
+    gImportRecords.reset();
+    setImportEnabled(true);
+}
