@@ -11,7 +11,7 @@
 #include "shell/services/messages.h"
 #include "ui_frmCDList.h"
 
-#include <QLabel>
+#include <QHeaderView>
 
 namespace
 {
@@ -94,16 +94,14 @@ void frmCDList::Form_Load()
     mLoading = false;
 }
 
-// The lists get their sizes with the form; what they will have is told by the form's own.
+// Id is hidden. The last column takes what the others leave free.
 void frmCDList::setFirstWidths()
 {
-    ensurePolished();
-    layout()->activate();
-    const int frameAndBar = 2 * mUi->ColList->frameWidth() + style()->pixelMetric(QStyle::PM_ScrollBarExtent);
-    const int whole = mUi->CDTab->width() - 2 * mUi->pageCompilations->layout()->contentsMargins().left() -
-                      frameAndBar - 8;
-    mPages[0].widths = {0, whole};
-    mPages[1].widths = mPages[2].widths = {0, whole / 2, whole - whole / 2};
+    const int half = (width() - 60) / 2;
+    mPages[0].widths = {0, half};
+    mPages[1].widths = mPages[2].widths = {0, half, half / 2};
+    for (ListPage &page : mPages)
+        page.list->horizontalHeader()->setStretchLastSection(true);
 }
 
 void frmCDList::RefreshLists()

@@ -19,6 +19,7 @@
 #include <QMdiSubWindow>
 #include <QTimer>
 #include <QToolButton>
+#include <algorithm>
 
 namespace
 {
@@ -86,6 +87,7 @@ void MainScreen::InitMainScreen()
     markLanguage();
     gDatabasePath = folder + QDir::separator() + QStringLiteral("Compact4.orv");
     setCaptions();
+    setBoxTitle(windowTitle());
 }
 
 void MainScreen::setCaptions()
@@ -169,7 +171,8 @@ void MainScreen::Timer1_Timer()
         defaultInstance<frmSplash>().Unload();
         setWindowState(Qt::WindowNoState);
         mTimer1->stop();
-        setGeometry(placeAtStart);
+        move(placeAtStart.topLeft());
+        resize(placeAtStart.size());
     }
     show();
     openBrowser();
@@ -219,17 +222,20 @@ void MainScreen::setImportEnabled(bool enabled)
     mUi->tbImport->setEnabled(enabled);
 }
 
+// A screen gets the size that it wants and the place that it asks for, as far as the frame has room.
 void MainScreen::adopt(Form *form)
 {
-    const QSize wanted = form->size();
+    const QSize wanted = form->size().expandedTo(form->minimumSizeHint());
     QMdiSubWindow *child = mUi->Children->addSubWindow(form);
     child->setAttribute(Qt::WA_DeleteOnClose, false);
     child->setWindowIcon(form->windowIcon());
     form->show();
     child->show();
-    child->resize((wanted + child->size() - form->size()).boundedTo(mUi->Children->viewport()->size()));
-    if (const auto place = form->place())
-        child->move(*place);
+    const QSize room = mUi->Children->viewport()->size();
+    child->resize((wanted + child->size() - form->size()).boundedTo(room));
+    const QPoint place = form->place().value_or(child->pos());
+    child->move(std::clamp(place.x(), 0, room.width() - child->width()),
+                std::clamp(place.y(), 0, room.height() - child->height()));
     mUi->Children->setActiveSubWindow(child);
 }
 

@@ -45,6 +45,5 @@ void nameApplication()
 {
     QCoreApplication::setApplicationName(QStringLiteral("songcase"));
     QCoreApplication::setApplicationVersion(QStringLiteral(SONGCASE_VERSION));
-    QGuiApplication::setApplicationDisplayName(QStringLiteral("Songcase"));
     QGuiApplication::setDesktopFileName(QStringLiteral("songcase"));
 }

@@ -8,12 +8,14 @@
 namespace
 {
 
+constexpr int nameSize = 20, otherSize = 13; // pixels
+
 // Light on the dark ground of the picture, whatever the palette of the desktop is.
-void setLight(QLabel *label, qreal scale, int alpha)
+void setLight(QLabel *label, int pixels, int alpha)
 {
     QFont font = label->font();
-    font.setPointSizeF(font.pointSizeF() * scale);
-    font.setBold(scale > 1.5);
+    font.setPixelSize(pixels); // the picture has one size, too
+    font.setBold(pixels == nameSize);
     label->setFont(font);
     QPalette palette = label->palette();
     palette.setColor(QPalette::WindowText, QColor(255, 246, 230, alpha));
@@ -30,9 +32,9 @@ frmSplash::frmSplash()
     setWindowFlags(Qt::SplashScreen | Qt::FramelessWindowHint);
     setFixedSize(size());
     mUi->Picture1->setSource(QStringLiteral(":/splash/splash.svg"));
-    setLight(mUi->lblProgram, 2.0, 255);
-    setLight(mUi->lblVersion, 1.1, 220);
-    setLight(mUi->lblAuthor, 1.0, 200);
+    setLight(mUi->lblProgram, nameSize, 255);
+    setLight(mUi->lblVersion, otherSize, 220);
+    setLight(mUi->lblAuthor, otherSize, 200);
     connect(mUi->Picture1, &SvgPicture::Click, this, &Form::Unload);
 }
 

@@ -212,7 +212,7 @@ void tst_Import::deleteAfterImport()
     QVERIFY(mProgram->end());
     openConnection(mDesktop->folder + QStringLiteral("/Compact4.orv"));
     QCOMPARE(gConnection->housekeeping("select group_concat(Naam, '|') from (select Naam from Artiesten order by ID)"),
-             QStringLiteral("Dire Streets|A-Hé|Dosikfu"));
+             QStringLiteral("Dire Streets|A-hé|Dosikfu"));
     gConnection.reset();
 }
 

@@ -1,17 +1,15 @@
 #include "platform/desktop/desktop.h"
 
-#include <QCoreApplication>
-#include <QGuiApplication>
 
 namespace
 {
 
 Desktop *gDesktop = nullptr;
+QString gBoxTitle = QStringLiteral("Songcase");
 
 BoxAnswer box(BoxKind kind, BoxButtons buttons, const QString &text, const QString &title)
 {
-    const QString shown = title.isEmpty() ? QGuiApplication::applicationDisplayName() : title;
-    return Desktop::current().messageBox(kind, buttons, text, shown);
+    return Desktop::current().messageBox(kind, buttons, text, title.isEmpty() ? gBoxTitle : title);
 }
 
 } // namespace
@@ -25,6 +23,11 @@ Desktop &Desktop::current()
 void Desktop::setCurrent(Desktop *desktop)
 {
     gDesktop = desktop;
+}
+
+void setBoxTitle(const QString &title)
+{
+    gBoxTitle = title;
 }
 
 void errorBox(const QString &text, const QString &title)

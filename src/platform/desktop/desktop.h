@@ -50,7 +50,10 @@ public:
     static void setCurrent(Desktop *desktop); // not owned; to be set before the first use
 };
 
-/// The shorthands that the screens use. Title empty: the program's name.
+/// The title of boxes that have none of their own: the program's name in the language of the run.
+void setBoxTitle(const QString &title);
+
+/// The shorthands that the screens use.
 void errorBox(const QString &text, const QString &title = {});
 void informationBox(const QString &text, const QString &title = {});
 BoxAnswer askYesNo(const QString &text, const QString &title = {});
