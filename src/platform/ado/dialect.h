@@ -16,6 +16,8 @@ namespace ADODB
 class Dialect
 {
 public:
+    using Literal = ADODB::Literal;
+
     /// Takes a statement; sql() and literals() hold until the next call. Throws Error errSyntax.
     void translate(QStringView statement);
 
