@@ -182,19 +182,24 @@ void Dialect::afterWord(QStringView s, QStringView w)
 }
 
 // max(id+1): as it stands it reads the whole table; as max(id)+1 it reads one entry of the index.
+// So with any number: a shape that is remembered stands for all of them.
 bool Dialect::maxOfSum(QStringView s)
 {
     const auto open = skipBlanks(s, mAt);
     const auto from = skipBlanks(s, open + 1), to = wordEnd(s, from);
     const auto plus = skipBlanks(s, to), one = skipBlanks(s, plus + 1);
-    const auto close = skipBlanks(s, one + 1);
-    const bool fits = charAt(s, open) == u'(' && to > from && charAt(s, plus) == u'+' &&
-                      charAt(s, one) == u'1' && charAt(s, close) == u')';
-    if (!fits)
+    const bool sum = charAt(s, open) == u'(' && to > from && charAt(s, plus) == u'+';
+    if (!sum || one >= s.size() || !startsNumber(s, one))
+        return false;
+    const auto close = skipBlanks(s, numberEnd(s, one));
+    if (charAt(s, close) != u')')
         return false;
     mSql.append("(max(");
     appendUtf8(mSql, s.sliced(from, to - from));
-    mSql.append(")+1)");
+    mSql.append(")+");
+    mAt = one;
+    number(s);
+    mSql.push_back(')');
     mAt = close + 1;
     return true;
 }
@@ -257,6 +262,8 @@ void Dialect::number(QStringView s)
     const QStringView digits = s.sliced(from, mAt - from);
     if (inWord(charAt(s, mAt)))
         refuse(digits.toString() + s[mAt]);
+    if (from > 0 && inWord(s[from - 1])) // "a.5": remembered, its gap would take "a5" for the same
+        refuse(s[from - 1] + digits.toString());
     if (liftsHere()) {
         mLiterals.addNumber(digits);
         mGaps.push_back({from, mAt, 0});

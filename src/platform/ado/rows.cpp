@@ -71,7 +71,9 @@ QString Rows::text(qsizetype row, int column) const
     if (kind(row, column) != Kind::Text)
         return value(row, column).toText();
     const auto bytes = utf8(row, column);
-    return QString::fromUtf8(bytes.data(), qsizetype(bytes.size()));
+    const QString text = QString::fromUtf8(bytes.data(), qsizetype(bytes.size()));
+    // Here it is a character like any other; the conversion takes it for the mark of a file.
+    return bytes.starts_with("\xEF\xBB\xBF") ? QChar(QChar::ByteOrderMark) + text : text;
 }
 
 qsizetype Rows::addRow()

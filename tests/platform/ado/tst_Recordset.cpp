@@ -227,6 +227,8 @@ void tst_Recordset::keepsTexts()
                       QStringLiteral("\U0001F3B5\u00e9"),
                       QString(3 << 20, u'x'),
                       QStringLiteral("after the long one"),
+                      QStringLiteral("\uFEFF"),
+                      QStringLiteral("\uFEFF\uFEFFx"),
                       QStringLiteral("a") + QChar(0) + u'b'};
     for (int i = 0; i < 3000; ++i) // over the end of a chunk, more than once
         texts.append(QString(1000, QChar(char16_t(u'a' + i % 26))));

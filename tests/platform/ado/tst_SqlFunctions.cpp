@@ -144,7 +144,8 @@ void tst_SqlFunctions::extensionForOtherPrograms()
     const auto run = [&](const char *sql) {
         return sqlite3_exec(db, sql, nullptr, nullptr, nullptr);
     };
-    const char *query = "select \"left\"(naam,1) from artiesten where naam='ÉDITH' and naam like 'é%'";
+    const char *query =
+        "select \"left\"(naam,1) from artiesten where naam='ÉDITH' and naam like 'é%'";
     sqlite3_db_config(db, SQLITE_DBCONFIG_ENABLE_LOAD_EXTENSION, 1, nullptr);
     const QByteArray file = qgetenv("SONGCASE_BIN") + "/lib/songcase.so";
     char *message = nullptr;

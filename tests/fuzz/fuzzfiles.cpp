@@ -1,0 +1,108 @@
+#include "catalogue/cataloguefile.h"
+#include "fuzz/fuzz.h"
+#include "platform/ado/recordset.h"
+#include "shell/services/globals.h"
+#include "shell/services/settingsfile.h"
+#include "support/testcatalogue.h"
+
+#include <QDir>
+#include <QFile>
+
+namespace
+{
+
+QByteArray contentOf(const QString &name)
+{
+    QFile file(name);
+    return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray();
+}
+
+// Whatever stands in the file, settings can be written and read again, and nothing of it is lost.
+void runSettings(const QByteArray &input)
+{
+    const QTemporaryDir folder;
+    const QString name = writeFile(folder.filePath(QStringLiteral("settings.json")), input);
+    SettingsFile settings(name);
+    const QString key = QStringLiteral("80000002\\Software\\Songcase");
+    QVariant old, value;
+    settings.value(key, QStringLiteral("old"), old);
+    fuzz::must(settings.createKey(key) == SettingsFile::Success, "no key can be made");
+    fuzz::must(settings.setValue(key, QStringLiteral("New"), 7) == SettingsFile::Success,
+               "nothing can be written");
+    fuzz::must(settings.value(key + u'\\', QStringLiteral("NEW"), value) == SettingsFile::Success &&
+                   value == QVariant(7),
+               "what was written is not read");
+    QVariant still;
+    settings.value(key, QStringLiteral("old"), still);
+    fuzz::must(still == old, "another value has changed");
+    const auto aside = QDir(folder.path()).entryList({QStringLiteral("*damaged*")}, QDir::Files);
+    for (const QString &file : aside)
+        fuzz::must(contentOf(folder.filePath(file)) == input, "the damaged file has changed");
+}
+
+QByteArray smallCatalogue()
+{
+    const QTemporaryDir folder;
+    const QString name = folder.filePath(QStringLiteral("Compact4.orv"));
+    cataloguefile::create(name);
+    openConnection(name);
+    for (int i = 0; i < 200; ++i)
+        gConnection->Execute(QStringLiteral("insert into artiesten values (") + QString::number(i) +
+                             QStringLiteral(",'artist ") + QString::number(i * 7 % 200) + u'\'' +
+                             u')');
+    gConnection.reset();
+    return contentOf(name);
+}
+
+// As at a start. False if the file was refused.
+bool opens(const QString &name)
+{
+    try {
+        cataloguefile::inspect(name);
+        openConnection(name);
+        cataloguefile::verify(*gConnection, true);
+        return true;
+    } catch (const ADODB::Error &error) {
+        fuzz::must(!error.Description.isEmpty(), "refused without words");
+        return false;
+    }
+}
+
+// A damaged catalogue is refused untouched, or can be worked with, errors included.
+void runCatalogue(const QByteArray &input)
+{
+    static const QTemporaryDir folder;
+    const QString name = writeFile(folder.filePath(QStringLiteral("Compact4.orv")), input);
+    if (opens(name)) {
+        for (const char *statement :
+             {"select * from artiesten order by naam", "select * from tracks",
+              "insert into artiesten values (1000,'new')",
+              "delete from artiesten where naam like 'artist 1%'"}) {
+            try {
+                gConnection->Execute(QLatin1String(statement));
+            } catch (const ADODB::Error &) {
+            }
+        }
+        gConnection.reset();
+    } else {
+        gConnection.reset();
+        fuzz::must(contentOf(name) == input, "a refused file was written");
+        fuzz::must(QDir(folder.path()).entryList(QDir::Files).size() == 1, "a file is left beside");
+    }
+    QFile::remove(name);
+}
+
+fuzz::Target settings(
+    "settings",
+    [] {
+        return fuzz::Inputs{
+            R"({"80000002\\software\\songcase": {"old": {"type": "text", "value": "caf\u00e9"}}})",
+            R"({"80000002\\SOFTWARE\\Songcase\\": {"Old": {"type": "number", "value": 19}}})",
+            R"({"80000002\\software\\songcase": {"old": {"type": "binary", "value": "AAEC"}}})"};
+    },
+    runSettings);
+
+fuzz::Target catalogues(
+    "catalogues", [] { return fuzz::Inputs{smallCatalogue()}; }, runCatalogue);
+
+} // namespace

@@ -1,0 +1,121 @@
+#include "catalogue/quoting.h"
+#include "fuzz/fuzz.h"
+#include "platform/ado/dialect.h"
+#include "platform/ado/recordset.h"
+#include "shell/services/globals.h"
+#include "support/testcatalogue.h"
+
+namespace
+{
+
+TestCatalogue &catalogue()
+{
+    static TestCatalogue one;
+    static const bool filled = [] {
+        one.exec(QStringLiteral("insert into artiesten values (1,'Björk'),(2,'d''Arc');"
+                                "insert into tracks values (1,1,'Jóga','Pop',1997)"));
+        return true;
+    }();
+    Q_UNUSED(filled)
+    return one;
+}
+
+qint64 count(const char *table)
+{
+    ADODB::Recordset rs;
+    rs.Open(QStringLiteral("select count(*) from ") + QLatin1String(table), *gConnection);
+    return rs.Fields(0).Value().toLong();
+}
+
+// One dialect that has seen everything before, and one that sees it for the first time.
+void translate(const QString &statement)
+{
+    static ADODB::Dialect seasoned;
+    ADODB::Dialect fresh;
+    const auto outcome = [&](ADODB::Dialect &dialect) {
+        try {
+            dialect.translate(statement);
+            std::string all = dialect.sql();
+            for (const ADODB::Literal &l : dialect.literals())
+                all.append("\n").append(dialect.text(l)).append(std::to_string(l.integer));
+            return all;
+        } catch (const ADODB::Error &) {
+            return std::string("refused");
+        }
+    };
+    fuzz::must(outcome(seasoned) == outcome(fresh), "memory changes the meaning of a statement");
+}
+
+void runStatement(const QByteArray &input)
+{
+    catalogue();
+    const QString statement = QString::fromUtf8(input);
+    translate(statement);
+    ADODB::Transaction transaction(*gConnection);
+    try {
+        const ADODB::Recordset answer = gConnection->Execute(statement);
+        if (answer.State() == ADODB::adStateOpen)
+            fuzz::must(answer.RecordCount() >= 0, "rows");
+    } catch (const ADODB::Error &error) {
+        fuzz::must(!error.Description.isEmpty(), "an error without words");
+    }
+    transaction.RollbackTrans();
+    fuzz::must(count("artiesten") == 2 && count("tracks") == 1, "a change outlived its rollback");
+}
+
+// What a person types: quoted it comes back as it went in, and as a genre that a text import does
+// not double it can break its own statement only.
+void runValue(const QByteArray &input)
+{
+    catalogue();
+    const QString typed = QString::fromUtf8(input);
+    ADODB::Transaction transaction(*gConnection);
+    gConnection->Execute(QStringLiteral("Insert into Artiesten(ID,Naam) values (3,") +
+                         quoted(typed) + QLatin1Char(')'));
+    ADODB::Recordset rs;
+    rs.Open(QStringLiteral("Select Naam From Artiesten where ID = 3 and Naam = ") + quoted(typed),
+            *gConnection);
+    fuzz::must(rs.RecordCount() == 1, "a name is not found again");
+    fuzz::must(rs.Fields(0).Value().toText() == typed.normalized(QString::NormalizationForm_C),
+               "a name comes back another");
+    try {
+        gConnection->Execute(
+            QStringLiteral("Insert into Tracks(ID,Artiest_ID,Titel,Genre,Hitjaar) values (2,1,") +
+            quoted(typed) + QStringLiteral(",'") + typed + QStringLiteral("',1985)"));
+    } catch (const ADODB::Error &) {
+        fuzz::must(count("tracks") == 1, "a refused statement has written");
+    }
+    fuzz::must(count("tracks") <= 2 && count("artiesten") == 3, "a genre has become a statement");
+    transaction.RollbackTrans();
+}
+
+fuzz::Target statements(
+    "statements",
+    [] {
+        return fuzz::Inputs{
+            "select cdt.id as Id, art.naam as Artiest from cdtitels as cdt, artiesten as art where "
+            "cdt.cd_type='E' and cdt.artiest_id=art.id order by cdt.titel asc",
+            "Insert into Tracks(ID,Artiest_ID,Titel,Genre,Hitjaar) values "
+            "(7,1,'it''s',\"Pop\",NULL)",
+            "delete from tracks trk where not exists (select '1' from CompactDiscs where "
+            "Track_ID=trk.ID)",
+            "select left(art.naam,1), max(id+1) from artiesten art where "
+            "iif(isnumeric(left(art.naam,1)),"
+            "1,0)=1 and trim(art.naam) like '%b_r%' group by 1 having count(*)= 2 order by 1,2",
+            "update tracks set Titel='x', Hitjaar=1985.5e1 where id between 1 and 2;",
+            "SHAPE { select art.naam as Artiest , trk.titel as titel from artiesten as art, tracks "
+            "as trk "
+            "where art.id = trk.artiest_id order by 1,2 } as X compute X by Artiest, Titel",
+            "select null as naam from tracks union select titel from cdtitels order by 1"};
+    },
+    runStatement);
+
+fuzz::Target values(
+    "values",
+    [] {
+        return fuzz::Inputs{"rock'n'roll", "x',1985),(51,1,'r','y", "Caf\xC3\xA9 \xF0\x9F\x8E\xB5",
+                            "e\xCC\x81",   "\"q\" -- /* ; ?1 :a",   "50%2 off"};
+    },
+    runValue);
+
+} // namespace
