@@ -13,14 +13,21 @@
 namespace
 {
 
-// The columns, in the order of importfield: the key of the head and the share of the width.
+// The columns, in the order of importfield: the key of the head, and the share of the width that is
+// left when those with a share of 0 have got what their heads and numbers need.
 struct Column {
     const char *key;
     int percent;
 };
-constexpr Column columns[] = {{"No", 7},     {"Artiest", 20}, {"Titel", 22},
-                              {"Genre", 10}, {"HitYear", 7},  {"CD-Titel", 14},
-                              {"CD-nr", 7},  {"Disknr", 6},   {"Track", 7}};
+constexpr Column columns[] = {{"No", 0},     {"Artiest", 29}, {"Titel", 34},
+                              {"Genre", 14}, {"HitYear", 0},  {"CD-Titel", 23},
+                              {"CD-nr", 0},  {"Disknr", 0},   {"Track", 0}};
+
+int neededWidth(const Column &column, const QFontMetrics &metrics)
+{
+    const int head = metrics.horizontalAdvance(GetMessage(column.key) + QStringLiteral("mm"));
+    return qMax(head, metrics.horizontalAdvance(QStringLiteral("000000")));
+}
 
 } // namespace
 
@@ -64,10 +71,15 @@ void frmImport::fitColumns()
     if (list->ColumnHeaders().Count() == 0)
         return;
     const int scrollBar = style()->pixelMetric(QStyle::PM_ScrollBarExtent, nullptr, list);
-    const int width = list->width() - 2 * list->frameWidth() - scrollBar;
-    int index = 0;
+    int left = list->width() - 2 * list->frameWidth() - scrollBar;
     for (const Column &column : columns)
-        list->ColumnHeaders().Item(++index).setWidth(qMax(1, width * column.percent / 100));
+        left -= column.percent == 0 ? neededWidth(column, list->fontMetrics()) : 0;
+    int index = 0;
+    for (const Column &column : columns) {
+        const int width = column.percent == 0 ? neededWidth(column, list->fontMetrics())
+                                              : left * column.percent / 100;
+        list->ColumnHeaders().Item(++index).setWidth(qMax(1, width));
+    }
 }
 
 void frmImport::resizeEvent(QResizeEvent *event)

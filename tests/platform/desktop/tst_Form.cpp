@@ -197,6 +197,7 @@ void tst_Form::hostedOnesAreBroughtUp()
             form->show();
         }
         void bringUp(Form *) override { TestForm::log += QStringLiteral("up "); }
+        QPoint origin() const override { return {}; }
     } host;
     Form::setHost(&host);
     TestForm form;
