@@ -12,19 +12,21 @@ const auto selectCompilations =
     QStringLiteral(" select cdt.id as Id, cdt.titel as Titel from cdtitels as cdt"
                    " where cdt.cd_type='V' order by cdt.titel asc ");
 
-const auto selectAlbums = QStringLiteral(
-    " select cdt.id as Id, art.naam as Artiest, cdt.titel as Titel from cdtitels as cdt, artiesten as art"
-    " where cdt.cd_type='E' and cdt.artiest_id=art.id order by cdt.titel asc ");
+const auto selectAlbums =
+    QStringLiteral(" select cdt.id as Id, art.naam as Artiest, cdt.titel as Titel from cdtitels as "
+                   "cdt, artiesten as art"
+                   " where cdt.cd_type='E' and cdt.artiest_id=art.id order by cdt.titel asc ");
 
-const auto selectMP3Collections =
-    QStringLiteral(" select mcs.id as Id, mcs.map as Map, mcs.album as Album from mp3collections as mcs"
-                   " order by mcs.album asc ");
+const auto selectMP3Collections = QStringLiteral(
+    " select mcs.id as Id, mcs.map as Map, mcs.album as Album from mp3collections as mcs"
+    " order by mcs.album asc ");
 
 const auto countTracks = QStringLiteral("SELECT COUNT(*) AS AANTAL FROM TRACKS");
 
 QString deleteDiscsOf(qint64 title)
 {
-    return QStringLiteral(" delete from compactdiscs where cdtitels_id = ") + QString::number(title);
+    return QStringLiteral(" delete from compactdiscs where cdtitels_id = ") +
+           QString::number(title);
 }
 
 QString deleteTitleRow(qint64 title)
@@ -34,7 +36,8 @@ QString deleteTitleRow(qint64 title)
 
 QString deleteFilesOf(qint64 collection)
 {
-    return QStringLiteral(" delete from mp3files where collectionid = ") + QString::number(collection);
+    return QStringLiteral(" delete from mp3files where collectionid = ") +
+           QString::number(collection);
 }
 
 QString deleteCollectionRow(qint64 collection)

@@ -16,21 +16,25 @@
 namespace
 {
 
-constexpr int idColumn = 1;  // columns are counted from 1
+constexpr int idColumn = 1;     // columns are counted from 1
 constexpr int firstSortKey = 1; // sort keys from 0: the first column that shows
 constexpr int keyDelete = 46;
 
 } // namespace
 
-frmCDList::frmCDList()
-    : Form(QStringLiteral("frmCDList"))
-    , mUi(std::make_unique<Ui::frmCDList>())
+frmCDList::frmCDList() : Form(QStringLiteral("frmCDList")), mUi(std::make_unique<Ui::frmCDList>())
 {
     mUi->setupUi(this);
-    mPages = {ListPage{Compilations, mUi->ColList, browserlists::compilations, {"Titel"}, "NumCompCol", {}},
-              ListPage{Albums, mUi->SngList, browserlists::albums, {"Artiest", "Titel"}, "NumAlbCol", {}},
-              ListPage{MP3Collections, mUi->MP3List, browserlists::mp3Collections, {"Map", "Titel"},
-                       "NumMP3Coll", {}}};
+    mPages = {
+        ListPage{
+            Compilations, mUi->ColList, browserlists::compilations, {"Titel"}, "NumCompCol", {}},
+        ListPage{Albums, mUi->SngList, browserlists::albums, {"Artiest", "Titel"}, "NumAlbCol", {}},
+        ListPage{MP3Collections,
+                 mUi->MP3List,
+                 browserlists::mp3Collections,
+                 {"Map", "Titel"},
+                 "NumMP3Coll",
+                 {}}};
     setCancelButton(mUi->cmdCancel);
     setCaptions();
     connectControls();

@@ -15,8 +15,8 @@ namespace Ui
 class frmCDList;
 }
 
-/// The browser of the whole collection: compilations, albums, records and MP3 collections, a page each.
-/// It shows the key fields only; its own changes to the catalogue are the deletions.
+/// The browser of the whole collection: compilations, albums, records and MP3 collections, a page
+/// each. It shows the key fields only; its own changes to the catalogue are the deletions.
 class frmCDList : public Form, public Browser
 {
     Q_OBJECT

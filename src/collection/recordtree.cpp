@@ -16,8 +16,7 @@ QIcon icon(const char *name)
 
 } // namespace
 
-RecordTree::RecordTree(QWidget *parent)
-    : QTreeWidget(parent)
+RecordTree::RecordTree(QWidget *parent) : QTreeWidget(parent)
 {
     setHeaderHidden(true);
     setUniformRowHeights(true);

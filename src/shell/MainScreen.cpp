@@ -24,15 +24,15 @@
 namespace
 {
 
-constexpr int splashTime = 3000; // milliseconds
+constexpr int splashTime = 3000;               // milliseconds
 constexpr QRect placeAtStart(7, 7, 1000, 667); // 100, 100, 15000, 10000 twips
 
 } // namespace
 
 MainScreen::MainScreen(bool lastRunBroken)
-    : mUi(std::make_unique<Ui::MainScreen>())
-    , mTimer1(new QTimer(this))
-    , mLastRunBroken(lastRunBroken)
+    : mUi(std::make_unique<Ui::MainScreen>()),
+      mTimer1(new QTimer(this)),
+      mLastRunBroken(lastRunBroken)
 {
     mTimer1->setObjectName(QStringLiteral("Timer1"));
     mTimer1->setInterval(splashTime);
@@ -151,8 +151,8 @@ void MainScreen::connectActions()
 void MainScreen::showConnectErrors(const ADODB::Error &error)
 {
     const auto show = [](const ADODB::Error &e) {
-        errorBox(QStringLiteral("ADO Connect Error: ") + QString::number(e.Number) + QLatin1Char(' ') +
-                     e.Description,
+        errorBox(QStringLiteral("ADO Connect Error: ") + QString::number(e.Number) +
+                     QLatin1Char(' ') + e.Description,
                  GetMessage("MsgSysErr"));
     };
     show(error);
@@ -197,13 +197,15 @@ void MainScreen::ChangeLanguage(int language)
     settings.SetValue(settingsKey, QStringLiteral("Language"), language);
     // The running program keeps its language, so these words are in no table.
     if (dutch)
-        informationBox(QStringLiteral("De taalinstellingen worden van toepassing indien u dit programma "
-                                      "afsluit en daarna opnieuw start."),
-                       QStringLiteral("Instellingen"));
+        informationBox(
+            QStringLiteral("De taalinstellingen worden van toepassing indien u dit programma "
+                           "afsluit en daarna opnieuw start."),
+            QStringLiteral("Instellingen"));
     else
-        informationBox(QStringLiteral("If you close and restart this program, the preferred language "
-                                      "will be English."),
-                       QStringLiteral("Preferences"));
+        informationBox(
+            QStringLiteral("If you close and restart this program, the preferred language "
+                           "will be English."),
+            QStringLiteral("Preferences"));
 }
 
 void MainScreen::Over_Click()
@@ -222,7 +224,8 @@ void MainScreen::setImportEnabled(bool enabled)
     mUi->tbImport->setEnabled(enabled);
 }
 
-// A screen gets the size that it wants and the place that it asks for, as far as the frame has room.
+// A screen gets the size that it wants and the place that it asks for, as far as the frame has
+// room.
 void MainScreen::adopt(Form *form)
 {
     const QSize wanted = form->size().expandedTo(form->minimumSizeHint());

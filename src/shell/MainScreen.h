@@ -19,8 +19,8 @@ namespace Ui
 class MainScreen;
 }
 
-/// The frame and the process: the program starts by loading it and ends when it unloads. It owns the one
-/// connection to the catalogue from its load to its unload, and hosts the modeless screens.
+/// The frame and the process: the program starts by loading it and ends when it unloads. It owns
+/// the one connection to the catalogue from its load to its unload, and hosts the modeless screens.
 class MainScreen : public QMainWindow, public Frame, public Form::Host
 {
     Q_OBJECT

@@ -15,7 +15,8 @@ namespace
 {
     errorBox(text, GetMessage("MsgSysErr"));
     gConnection.reset(); // rolls back
-    // The objects of the screens are in the middle of their work: nothing of theirs may run any more.
+    // The objects of the screens are in the middle of their work: nothing of theirs may run any
+    // more.
     std::_Exit(1);
 }
 
@@ -37,7 +38,8 @@ void Application::translateQt()
     if (gLanguage != languageDutch)
         return;
     auto *translator = new QTranslator(this);
-    if (translator->load(QStringLiteral("qtbase_nl"), QLibraryInfo::path(QLibraryInfo::TranslationsPath)))
+    if (translator->load(QStringLiteral("qtbase_nl"),
+                         QLibraryInfo::path(QLibraryInfo::TranslationsPath)))
         installTranslator(translator);
 }
 

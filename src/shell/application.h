@@ -2,8 +2,8 @@
 
 #include <QApplication>
 
-/// The application of a real session. An error that no routine has caught ends the program here, with
-/// a report and with every open transaction rolled back.
+/// The application of a real session. An error that no routine has caught ends the program here,
+/// with a report and with every open transaction rolled back.
 class Application : public QApplication
 {
     Q_OBJECT
@@ -16,5 +16,6 @@ public:
     void translateQt();
 };
 
-/// Names that folders, windows and the desktop know the program by; to be set before the object is made.
+/// Names that folders, windows and the desktop know the program by; to be set before the object is
+/// made.
 void nameApplication();

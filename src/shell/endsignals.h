@@ -4,8 +4,8 @@
 
 class QSocketNotifier;
 
-/// Turns SIGTERM, SIGINT and SIGHUP (the end of a session) into a signal of the event loop, so that the
-/// program can end in an orderly way.
+/// Turns SIGTERM, SIGINT and SIGHUP (the end of a session) into a signal of the event loop, so that
+/// the program can end in an orderly way.
 class EndSignals : public QObject
 {
     Q_OBJECT

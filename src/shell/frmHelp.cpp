@@ -12,9 +12,7 @@
 #include <QStandardPaths>
 #include <QUrl>
 
-frmHelp::frmHelp()
-    : Form(QStringLiteral("frmHelp"))
-    , mUi(std::make_unique<Ui::frmHelp>())
+frmHelp::frmHelp() : Form(QStringLiteral("frmHelp")), mUi(std::make_unique<Ui::frmHelp>())
 {
     mUi->setupUi(this);
     mUi->Picture1->setSource(QStringLiteral(":/icons/songcase.svg"));
@@ -25,10 +23,10 @@ frmHelp::~frmHelp() = default;
 
 QString frmHelp::guideAddress()
 {
-    const QString page = QLatin1String(gLanguage == languageDutch ? "nl" : "en") +
-                         QStringLiteral("/index.html");
-    const QString beside = QCoreApplication::applicationDirPath() +
-                           QStringLiteral("/../share/songcase/guide/") + page;
+    const QString page =
+        QLatin1String(gLanguage == languageDutch ? "nl" : "en") + QStringLiteral("/index.html");
+    const QString beside =
+        QCoreApplication::applicationDirPath() + QStringLiteral("/../share/songcase/guide/") + page;
     QString file = QFileInfo(beside).canonicalFilePath();
     if (file.isEmpty())
         file = QStandardPaths::locate(QStandardPaths::GenericDataLocation,

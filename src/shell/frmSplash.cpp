@@ -24,9 +24,7 @@ void setLight(QLabel *label, int pixels, int alpha)
 
 } // namespace
 
-frmSplash::frmSplash()
-    : Form(QStringLiteral("frmSplash"))
-    , mUi(std::make_unique<Ui::frmSplash>())
+frmSplash::frmSplash() : Form(QStringLiteral("frmSplash")), mUi(std::make_unique<Ui::frmSplash>())
 {
     mUi->setupUi(this);
     setWindowFlags(Qt::SplashScreen | Qt::FramelessWindowHint);

@@ -15,15 +15,14 @@ constexpr char raiseWord[] = "raise\n", raisedWord[] = "raised\n";
 
 QString nameFor(const QString &folder)
 {
-    const QByteArray hash =
-        QCryptographicHash::hash(QFileInfo(folder).absoluteFilePath().toUtf8(), QCryptographicHash::Sha1);
+    const QByteArray hash = QCryptographicHash::hash(QFileInfo(folder).absoluteFilePath().toUtf8(),
+                                                     QCryptographicHash::Sha1);
     return QStringLiteral("songcase-") + QString::fromLatin1(hash.toHex().left(16));
 }
 
 } // namespace
 
-SingleInstance::SingleInstance(const QString &programFolder)
-    : mServerName(nameFor(programFolder))
+SingleInstance::SingleInstance(const QString &programFolder) : mServerName(nameFor(programFolder))
 {
     const QString beside = QFileInfo(Desktop::current().settingsFile()).absolutePath();
     QDir().mkpath(beside);

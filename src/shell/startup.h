@@ -24,8 +24,8 @@ int storedLanguage();
 /// Reads the proxy globals; gives the text of the value UseProxy.
 QString ReadProxySettings();
 
-/// Opens the catalogue as gConnection. Throws ADODB::Error, which then stands in its Errors too, and
-/// gConnection is there but closed.
+/// Opens the catalogue as gConnection. Throws ADODB::Error, which then stands in its Errors too,
+/// and gConnection is there but closed.
 void openCatalogue(const QString &file, bool lastRunBroken);
 
 } // namespace startup

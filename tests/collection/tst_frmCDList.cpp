@@ -39,8 +39,7 @@ private slots:
 private:
     void fill();
     void show();
-    template <typename Control>
-    Control *control(const char *name) const
+    template <typename Control> Control *control(const char *name) const
     {
         return mScreen->findChild<Control *>(QLatin1String(name));
     }
@@ -71,8 +70,8 @@ void tst_frmCDList::cleanup()
     mDesktop.reset();
 }
 
-// Two compilations, three albums, two collections. Track 2 stands on compilation 2 and album 3; artist 3
-// has album 5 alone.
+// Two compilations, three albums, two collections. Track 2 stands on compilation 2 and album 3;
+// artist 3 has album 5 alone.
 void tst_frmCDList::fill()
 {
     mCatalogue->exec(QStringLiteral(R"(
@@ -217,7 +216,8 @@ void tst_frmCDList::deleteOfAnMP3Collection()
     mCatalogue->exec(QStringLiteral("insert into Artiesten values (9,'Nobody')"));
     show();
     page(3);
-    mDesktop->expectBox(QStringLiteral("yes-no [Delete] Are your sure to delete this MP3 collection?"), vbYes);
+    mDesktop->expectBox(
+        QStringLiteral("yes-no [Delete] Are your sure to delete this MP3 collection?"), vbYes);
     control<QPushButton>("cmdDelete")->click();
     QCOMPARE(mCatalogue->rows(QStringLiteral("select ID, Map from MP3Collections")), texts("1|/b"));
     QCOMPARE(mCatalogue->rows(QStringLiteral("select ID from MP3Files")), texts("1"));
@@ -234,7 +234,9 @@ void tst_frmCDList::aFailedDeleteTakesAllBack()
     mDesktop->expectBox(QStringLiteral("not this one"));
     mDesktop->expectBox(QStringLiteral("not this one"));
     control<QPushButton>("cmdDelete")->click();
-    QCOMPARE(mCatalogue->count(QStringLiteral("select count(*) from CompactDiscs where CDTitels_ID=2")), 1);
+    QCOMPARE(
+        mCatalogue->count(QStringLiteral("select count(*) from CompactDiscs where CDTitels_ID=2")),
+        1);
     QCOMPARE(mCatalogue->count(QStringLiteral("select count(*) from CDTitels")), 5);
     QVERIFY(mScreen->updatesEnabled());
 }
@@ -243,7 +245,8 @@ void tst_frmCDList::theRememberedRowIsSelectedAgain()
 {
     for (int i = 1; i <= 7; ++i)
         mCatalogue->exec(QStringLiteral("insert into CDTitels values (%1,'T%1',null,'V',null,null);"
-                                        "insert into CompactDiscs values (%1,%1,1,1,1,null)").arg(i));
+                                        "insert into CompactDiscs values (%1,%1,1,1,1,null)")
+                             .arg(i));
     show();
     auto *col = list("ColList");
     QTest::keyClick(col, Qt::Key_End);

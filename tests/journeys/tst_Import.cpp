@@ -14,7 +14,8 @@
 #include <QTabWidget>
 #include <QTest>
 
-/// A person reads text files into an empty catalogue and sees them in the browser; all through the menu.
+/// A person reads text files into an empty catalogue and sees them in the browser; all through the
+/// menu.
 class tst_Import : public QObject
 {
     Q_OBJECT
@@ -53,14 +54,17 @@ private slots:
 namespace
 {
 
-const QByteArray compilationNested = "The Best Of 1985\n2\n2\nDire Streets\nWalk Of Life\nRock\n1985\n"
-                                     "A-Hé\nTake On Me\n*\n*\n1\nDosikfu\nInto The Groove\nPop\n1985\n";
+const QByteArray compilationNested =
+    "The Best Of 1985\n2\n2\nDire Streets\nWalk Of Life\nRock\n1985\n"
+    "A-Hé\nTake On Me\n*\n*\n1\nDosikfu\nInto The Groove\nPop\n1985\n";
 const QByteArray compilationFlat = "The Best Of 1985\nDire Streets*Walk Of Life*Rock*1985\n"
                                    "A-Hé*Take On Me**\n\nDosikfu*Into The Groove*Pop*1985\n";
-const QByteArray albumNested = "Pink Freud\nThe Wail\n2\n2\nIn The Flash?\nRock\n1979\nThe Thin Eyes\nRock\n1979\n"
-                               "1\nHey Yo\nRock\n1979\n";
-const QByteArray albumFlat = "Pink Freud\nThe Wail\nIn The Flash?*Rock*1979\nThe Thin Eyes*Rock*1979\n*\n"
-                             "Hey Yo*Rock*1979\n";
+const QByteArray albumNested =
+    "Pink Freud\nThe Wail\n2\n2\nIn The Flash?\nRock\n1979\nThe Thin Eyes\nRock\n1979\n"
+    "1\nHey Yo\nRock\n1979\n";
+const QByteArray albumFlat =
+    "Pink Freud\nThe Wail\nIn The Flash?*Rock*1979\nThe Thin Eyes*Rock*1979\n*\n"
+    "Hey Yo*Rock*1979\n";
 
 } // namespace
 
@@ -103,7 +107,8 @@ void tst_Import::load(const char *countText, int count)
 void tst_Import::import(const QByteArray &content, bool albums, bool flat, int tracks)
 {
     read(content, albums, flat);
-    QCOMPARE(mProgram->control<DBListViewCTL>("frmImport", "ImportListView")->ListItems().Count(), tracks);
+    QCOMPARE(mProgram->control<DBListViewCTL>("frmImport", "ImportListView")->ListItems().Count(),
+             tracks);
     load("MsgNumImpTracks", tracks);
     QVERIFY(!mProgram->screen("frmImport"));
     QVERIFY(mProgram->entry("Import")->isEnabled());
@@ -126,10 +131,14 @@ void tst_Import::aFileOfEachFormat_data()
     QTest::addColumn<bool>("flat");
     for (const int language : {languageEnglish, languageDutch}) {
         const QByteArray in = language == languageDutch ? ", Dutch" : ", English";
-        QTest::newRow(QByteArray("compilations, nested").append(in)) << language << compilationNested << false << false;
-        QTest::newRow(QByteArray("compilations, flat").append(in)) << language << compilationFlat << false << true;
-        QTest::newRow(QByteArray("albums, nested").append(in)) << language << albumNested << true << false;
-        QTest::newRow(QByteArray("albums, flat").append(in)) << language << albumFlat << true << true;
+        QTest::newRow(QByteArray("compilations, nested").append(in))
+            << language << compilationNested << false << false;
+        QTest::newRow(QByteArray("compilations, flat").append(in))
+            << language << compilationFlat << false << true;
+        QTest::newRow(QByteArray("albums, nested").append(in))
+            << language << albumNested << true << false;
+        QTest::newRow(QByteArray("albums, flat").append(in))
+            << language << albumFlat << true << true;
     }
 }
 
@@ -205,13 +214,16 @@ void tst_Import::deleteAfterImport()
     import(albumNested, true, false, 3);
     import(compilationFlat, false, true, 3);
     mProgram->control<QTabWidget>("frmCDList", "CDTab")->setCurrentIndex(1);
-    mDesktop->expectBox(QStringLiteral("yes-no [Verwijderen] Wilt U inderdaad deze CD definitief verwijderen?"), vbYes);
+    mDesktop->expectBox(
+        QStringLiteral("yes-no [Verwijderen] Wilt U inderdaad deze CD definitief verwijderen?"),
+        vbYes);
     mProgram->control<QPushButton>("frmCDList", "cmdDelete")->click();
     QVERIFY(column("SngList", 1).isEmpty());
     mProgram->choose("mnuUpdate");
     QVERIFY(mProgram->end());
     openConnection(mDesktop->folder + QStringLiteral("/Compact4.orv"));
-    QCOMPARE(gConnection->housekeeping("select group_concat(Naam, '|') from (select Naam from Artiesten order by ID)"),
+    QCOMPARE(gConnection->housekeeping(
+                 "select group_concat(Naam, '|') from (select Naam from Artiesten order by ID)"),
              QStringLiteral("Dire Streets|A-hé|Dosikfu"));
     gConnection.reset();
 }

@@ -22,8 +22,8 @@
 #include <QTimer>
 #include <functional>
 
-/// What holds for every screen in both languages: each text comes from the table, is shown whole, and each
-/// control has a name that a screen reader can say.
+/// What holds for every screen in both languages: each text comes from the table, is shown whole,
+/// and each control has a name that a screen reader can say.
 class tst_Screens : public QObject
 {
     Q_OBJECT
@@ -38,8 +38,7 @@ namespace
 
 using Make = std::function<Form *()>;
 
-template <typename Screen>
-Make make()
+template <typename Screen> Make make()
 {
     return [] { return new Screen; };
 }
@@ -85,11 +84,13 @@ void tst_Screens::everyScreen_data()
 {
     QTest::addColumn<int>("language");
     QTest::addColumn<Make>("make");
-    const std::pair<const char *, Make> screens[] = {
-        {"frmSplash", make<frmSplash>()},           {"frmHelp", make<frmHelp>()},
-        {"frmCDList", make<frmCDList>()},           {"frmImportWizard", make<frmImportWizard>()},
-        {"frmImportBusy", make<frmImportBusy>()},   {"frmImport", make<frmImport>()},
-        {"frmImportDBBusy", make<frmImportDBBusy>()}};
+    const std::pair<const char *, Make> screens[] = {{"frmSplash", make<frmSplash>()},
+                                                     {"frmHelp", make<frmHelp>()},
+                                                     {"frmCDList", make<frmCDList>()},
+                                                     {"frmImportWizard", make<frmImportWizard>()},
+                                                     {"frmImportBusy", make<frmImportBusy>()},
+                                                     {"frmImport", make<frmImport>()},
+                                                     {"frmImportDBBusy", make<frmImportDBBusy>()}};
     for (const auto &[name, make] : screens) {
         QTest::newRow(QByteArray(name).append(", English")) << languageEnglish << make;
         QTest::newRow(QByteArray(name).append(", Dutch")) << languageDutch << make;
@@ -104,7 +105,8 @@ void tst_Screens::everyScreen()
     ScriptedDesktop desktop;
     TestCatalogue catalogue;
     Form *screen = make();
-    QCOMPARE(screen->Name(), QString::fromLatin1(QTest::currentDataTag()).section(QLatin1Char(','), 0, 0));
+    QCOMPARE(screen->Name(),
+             QString::fromLatin1(QTest::currentDataTag()).section(QLatin1Char(','), 0, 0));
     for (QTimer *timer : screen->findChildren<QTimer *>())
         timer->stop();
     screen->Show();
@@ -114,16 +116,18 @@ void tst_Screens::everyScreen()
     for (const QWidget *w : screen->findChildren<QWidget *>()) {
         const QByteArray name = w->objectName().toLatin1();
         const QString text = textOf(w);
-        QVERIFY2(!text.contains(QLatin1String("Unknown")) && !text.contains(QLatin1String("Onbekend")), name);
+        QVERIFY2(!text.contains(QLatin1String("Unknown")) &&
+                     !text.contains(QLatin1String("Onbekend")),
+                 name);
         if (isPartOfAnother(w) || !w->isVisible())
             continue;
-        QVERIFY2(!needsName(w) || hasName(w, screen), QByteArray(name).append(": no name for a screen reader"));
+        QVERIFY2(!needsName(w) || hasName(w, screen),
+                 QByteArray(name).append(": no name for a screen reader"));
         QVERIFY2(!isCut(w), QByteArray(name).append(": text cut: ").append(text.toUtf8()));
     }
     screen->Unload();
     QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
 }
-
 
 QTEST_MAIN(tst_Screens)
 #include "tst_Screens.moc"

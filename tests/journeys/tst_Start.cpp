@@ -1,7 +1,7 @@
 // Label: journey
 #include "catalogue/cataloguefile.h"
-#include "platform/desktop/programfolder.h"
 #include "platform/ado/connection.h"
+#include "platform/desktop/programfolder.h"
 #include "shell/services/clsRegistry.h"
 #include "shell/services/globals.h"
 #include "shell/services/messages.h"
@@ -42,7 +42,10 @@ private slots:
 
 private:
     static void languages();
-    void makeCatalogue() { cataloguefile::create(mDesktop->folder + QStringLiteral("/Compact4.orv")); }
+    void makeCatalogue()
+    {
+        cataloguefile::create(mDesktop->folder + QStringLiteral("/Compact4.orv"));
+    }
 
     std::unique_ptr<ScriptedDesktop> mDesktop;
 };
@@ -111,11 +114,14 @@ void tst_Start::aMissingCatalogueEndsTheProgram()
     writeFile(mDesktop->folder + QStringLiteral("/Compact3.orv"), "old");
     const QString file = mDesktop->folder + QStringLiteral("/Compact4.orv");
     mDesktop->expectBox(
-        dutch ? QStringLiteral("error [Bestand niet gevonden] Er kan geen verbinding met de database worden "
-                               "gemaakt!\rHet bestand ") +
-                    file + QStringLiteral(" is niet aangetroffen!\r Het programma kan derhalve niet starten!")
-              : QStringLiteral("error [File not found] Unable to connect with database!\rFile ") + file +
-                    QStringLiteral(" not found!\rProgram cannot start without it!"));
+        dutch ? QStringLiteral(
+                    "error [Bestand niet gevonden] Er kan geen verbinding met de database worden "
+                    "gemaakt!\rHet bestand ") +
+                    file +
+                    QStringLiteral(
+                        " is niet aangetroffen!\r Het programma kan derhalve niet starten!")
+              : QStringLiteral("error [File not found] Unable to connect with database!\rFile ") +
+                    file + QStringLiteral(" not found!\rProgram cannot start without it!"));
     Program program(*mDesktop);
     QVERIFY(!program.start());
     QVERIFY(Form::openForms().isEmpty());
@@ -205,17 +211,19 @@ void tst_Start::changeOfLanguage()
     makeCatalogue();
     storeLanguage(language);
     const bool dutch = language == languageDutch;
-    const char *own = dutch ? "mnuNederlands" : "mnuEngels", *other = dutch ? "mnuEngels" : "mnuNederlands";
+    const char *own = dutch ? "mnuNederlands" : "mnuEngels",
+               *other = dutch ? "mnuEngels" : "mnuNederlands";
     const int otherLanguage = dutch ? languageEnglish : languageDutch;
     {
         Program program(*mDesktop);
         QVERIFY(program.start());
         program.choose(own);
         QVERIFY2(mDesktop->boxes.isEmpty(), "the current language is no change");
-        mDesktop->expectBox(dutch ? QStringLiteral("information [Preferences] If you close and restart this "
-                                                   "program, the preferred language will be English.")
-                                  : QStringLiteral("information [Instellingen] De taalinstellingen worden "
-                                                   "van toepassing indien u dit programma afsluit"));
+        mDesktop->expectBox(
+            dutch ? QStringLiteral("information [Preferences] If you close and restart this "
+                                   "program, the preferred language will be English.")
+                  : QStringLiteral("information [Instellingen] De taalinstellingen worden "
+                                   "van toepassing indien u dit programma afsluit"));
         program.choose(other);
         QVERIFY(program.entry(other)->isChecked() && !program.entry(own)->isChecked());
         QCOMPARE(gLanguage, language);
@@ -256,8 +264,9 @@ void tst_Start::aboutAndHelp()
     auto *link = program.control<QLabel>("frmHelp", "Link");
     emit link->linkActivated(QStringLiteral("guide"));
     QCOMPARE(mDesktop->addresses.size(), 1);
-    QVERIFY(mDesktop->addresses.first().endsWith(
-        language == languageDutch ? QLatin1String("guide/nl/index.html") : QLatin1String("guide/en/index.html")));
+    QVERIFY(mDesktop->addresses.first().endsWith(language == languageDutch
+                                                     ? QLatin1String("guide/nl/index.html")
+                                                     : QLatin1String("guide/en/index.html")));
     QVERIFY(QFile::exists(QUrl(mDesktop->addresses.first()).toLocalFile()));
     mDesktop->browserThere = false;
     mDesktop->expectBox(QStringLiteral("error [] No browser detected!").mid(0, 5));
@@ -272,12 +281,20 @@ void tst_Start::keysOfTheMenu()
     storeLanguage(languageEnglish);
     Program program(*mDesktop);
     QVERIFY(program.start());
-    const std::pair<const char *, const char *> keys[] = {
-        {"Import", "Ctrl+Ins"},          {"mnuSave", "Ctrl+S"},        {"mnuConvertDatabase", "Shift+Ins"},
-        {"mnuSearchArtistsTitles", "Ctrl+F1"}, {"mnuCDInsert", "F2"},  {"mnuInsertEnkelCD", "F3"},
-        {"mnuMP3", "F4"},                {"mnuUpdate", "F5"},          {"mnuCDDB", "F6"},
-        {"mnuRegisterCDDB", "F7"},       {"mnuProxy", "F8"},           {"mnuHelp", "F1"},
-        {"Over", "Ctrl+I"},              {"mnuOverCDDB", "Ctrl+G"}};
+    const std::pair<const char *, const char *> keys[] = {{"Import", "Ctrl+Ins"},
+                                                          {"mnuSave", "Ctrl+S"},
+                                                          {"mnuConvertDatabase", "Shift+Ins"},
+                                                          {"mnuSearchArtistsTitles", "Ctrl+F1"},
+                                                          {"mnuCDInsert", "F2"},
+                                                          {"mnuInsertEnkelCD", "F3"},
+                                                          {"mnuMP3", "F4"},
+                                                          {"mnuUpdate", "F5"},
+                                                          {"mnuCDDB", "F6"},
+                                                          {"mnuRegisterCDDB", "F7"},
+                                                          {"mnuProxy", "F8"},
+                                                          {"mnuHelp", "F1"},
+                                                          {"Over", "Ctrl+I"},
+                                                          {"mnuOverCDDB", "Ctrl+G"}};
     for (const auto &[entry, key] : keys)
         QCOMPARE(program.entry(entry)->shortcut(), QKeySequence(QLatin1String(key)));
     QVERIFY(program.screen("frmCDList")->Unload());
@@ -292,11 +309,11 @@ void tst_Start::whatComesLaterIsDisabled()
     storeLanguage(languageEnglish);
     Program program(*mDesktop);
     QVERIFY(program.start());
-    for (const char *entry : {"Import", "mnuUpdate", "mnuHelp", "Over", "mnuEngels", "tbImport", "tbCollection",
-                              "tbCredits", "tbHelp"})
+    for (const char *entry : {"Import", "mnuUpdate", "mnuHelp", "Over", "mnuEngels", "tbImport",
+                              "tbCollection", "tbCredits", "tbHelp"})
         QVERIFY2(program.entry(entry)->isEnabled(), entry);
-    for (const char *entry : {"mnuSave", "mnuConvertDatabase", "mnuCDInsert", "mnuMP3", "mnuCDDB", "mnuProxy",
-                              "mnuOverCDDB", "tbSave", "tbQuicksearch", "tbCDDB"})
+    for (const char *entry : {"mnuSave", "mnuConvertDatabase", "mnuCDInsert", "mnuMP3", "mnuCDDB",
+                              "mnuProxy", "mnuOverCDDB", "tbSave", "tbQuicksearch", "tbCDDB"})
         QVERIFY2(!program.entry(entry)->isEnabled(), entry);
     QVERIFY(program.end());
 }

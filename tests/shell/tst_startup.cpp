@@ -44,11 +44,14 @@ void tst_startup::settingsAreReadAndMended_data()
     const QVariant none;
     QTest::newRow("first session") << "Session" << none << 1 << 1 << 1 << false;
     QTest::newRow("next session") << "Session" << QVariant(41) << 42 << 42 << 1 << false;
-    QTest::newRow("session as text") << "Session" << QVariant(QStringLiteral("6")) << 7 << 7 << 1 << false;
-    QTest::newRow("session is words") << "Session" << QVariant(QStringLiteral("x")) << 1 << 1 << 1 << false;
+    QTest::newRow("session as text")
+        << "Session" << QVariant(QStringLiteral("6")) << 7 << 7 << 1 << false;
+    QTest::newRow("session is words")
+        << "Session" << QVariant(QStringLiteral("x")) << 1 << 1 << 1 << false;
     QTest::newRow("Dutch") << "Language" << QVariant(19) << 19 << 1 << 19 << false;
     QTest::newRow("no such language") << "Language" << QVariant(5) << 1 << 1 << 1 << false;
-    QTest::newRow("language is words") << "Language" << QVariant(QStringLiteral("abc")) << 1 << 1 << 1 << false;
+    QTest::newRow("language is words")
+        << "Language" << QVariant(QStringLiteral("abc")) << 1 << 1 << 1 << false;
     QTest::newRow("generation 3") << "DBVersion" << QVariant(3) << 4 << 1 << 1 << true;
     QTest::newRow("generation 4") << "DBVersion" << QVariant(4) << 4 << 1 << 1 << false;
     QTest::newRow("generation 5") << "DBVersion" << QVariant(5) << 5 << 1 << 1 << false;
@@ -76,7 +79,8 @@ void tst_startup::anOlderCatalogueOnAFirstStart()
     for (const char *name : {"Compact.orv", "Compact3.orv", "compact4.orv"}) {
         ScriptedDesktop desktop;
         writeFile(desktop.folder + QLatin1Char('/') + QLatin1String(name), "old");
-        QCOMPARE(startup::readSettings(desktop.folder).conversionPending, qstrcmp(name, "compact4.orv") != 0);
+        QCOMPARE(startup::readSettings(desktop.folder).conversionPending,
+                 qstrcmp(name, "compact4.orv") != 0);
     }
 }
 

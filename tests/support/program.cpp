@@ -11,8 +11,7 @@
 #include <QTimer>
 
 Program::Program(ScriptedDesktop &desktop)
-    : mDesktop(desktop)
-    , mFrame(std::make_unique<MainScreen>())
+    : mDesktop(desktop), mFrame(std::make_unique<MainScreen>())
 {
 }
 
@@ -52,8 +51,8 @@ void Program::choose(const char *name)
 {
     QAction *action = entry(name);
     if (!action || !action->isEnabled())
-        QTest::qFail(qPrintable(QStringLiteral("Not to be chosen: ") + QLatin1String(name)), __FILE__,
-                     __LINE__);
+        QTest::qFail(qPrintable(QStringLiteral("Not to be chosen: ") + QLatin1String(name)),
+                     __FILE__, __LINE__);
     else
         action->trigger();
 }

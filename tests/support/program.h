@@ -7,8 +7,8 @@
 
 class QAction;
 
-/// The whole program as a person runs it: the frame with its real menu, on the folder and settings of the
-/// scripted desktop. The three seconds of the splash are not waited for.
+/// The whole program as a person runs it: the frame with its real menu, on the folder and settings
+/// of the scripted desktop. The three seconds of the splash are not waited for.
 class Program
 {
 public:
@@ -29,10 +29,11 @@ public:
     Form *screen(const char *name) const;
 
     /// A control of a screen by its object name. Fails the test if it is not there.
-    template <typename Control>
-    Control *control(const char *screenName, const char *name) const
+    template <typename Control> Control *control(const char *screenName, const char *name) const
     {
-        auto *found = screen(screenName) ? screen(screenName)->findChild<Control *>(QLatin1String(name)) : nullptr;
+        auto *found = screen(screenName)
+                          ? screen(screenName)->findChild<Control *>(QLatin1String(name))
+                          : nullptr;
         if (!found)
             missing(screenName, name);
         return found;

@@ -32,8 +32,7 @@ private:
 void openConnection(const QString &file);
 
 /// A list of texts, given as UTF-8.
-template <typename... Text>
-QStringList texts(Text... text)
+template <typename... Text> QStringList texts(Text... text)
 {
     return {QString::fromUtf8(text)...};
 }

@@ -1,6 +1,5 @@
 #include "platform/desktop/desktop.h"
 
-
 namespace
 {
 

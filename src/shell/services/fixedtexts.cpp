@@ -2,8 +2,8 @@
 
 #include <iterator>
 
-// The texts of the program by key, English and Dutch. "\r" is the one line break that they use; boxes
-// and labels show it as such. Misspellings are as the program has always shown them.
+// The texts of the program by key, English and Dutch. "\r" is the one line break that they use;
+// boxes and labels show it as such. Misspellings are as the program has always shown them.
 
 namespace messagetable
 {

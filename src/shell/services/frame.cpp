@@ -2,7 +2,6 @@
 
 #include "platform/desktop/form.h"
 
-
 namespace
 {
 
