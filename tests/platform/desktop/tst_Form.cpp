@@ -37,6 +37,7 @@ private slots:
     void questionOnlyItsButtonsAnswer_data();
     void questionOnlyItsButtonsAnswer();
     void boxesShowPlainText();
+    void boxesWithoutATitle();
     void sentKeysFollowTheFocus();
 
 private:
@@ -197,14 +198,23 @@ void tst_Form::hostedOnesAreBroughtUp()
             form->show();
         }
         void bringUp(Form *) override { TestForm::log += QStringLiteral("up "); }
-        QPoint origin() const override { return {}; }
+        QPoint origin() const override { return {100, 50}; }
     } host;
     Form::setHost(&host);
     TestForm form;
     form.Show();
     form.Show();
-    Form::setHost(nullptr);
     QCOMPARE(TestForm::log.remove(QStringLiteral("activate ")), QStringLiteral("load adopt up "));
+    auto *modal = new TestForm;
+    modal->setPlace({10, 20});
+    QPoint place;
+    mDesktop->expectModal(QStringLiteral("frmTest"), [&](Form &f) {
+        place = f.pos();
+        f.Unload();
+    });
+    modal->ShowModal();
+    Form::setHost(nullptr);
+    QCOMPARE(place, QPoint(110, 70));
 }
 
 void tst_Form::defaultInstanceAnew()
@@ -374,6 +384,15 @@ void tst_Form::boxesShowPlainText()
     real.messageBox(BoxKind::Error, BoxButtons::Ok, QStringLiteral("<b>\rnext"), QString());
     QCOMPARE(text, QStringLiteral("<b>\nnext"));
     QCOMPARE(format, Qt::PlainText);
+}
+
+void tst_Form::boxesWithoutATitle()
+{
+    setBoxTitle(QStringLiteral("The program"));
+    mDesktop->expectBox(QStringLiteral("error [The program] a"));
+    mDesktop->expectBox(QStringLiteral("information [b] a"));
+    errorBox(QStringLiteral("a"));
+    informationBox(QStringLiteral("a"), QStringLiteral("b"));
 }
 
 void tst_Form::sentKeysFollowTheFocus()
