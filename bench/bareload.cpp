@@ -199,7 +199,7 @@ void createNocaseCatalogue(const std::string &file)
     {
         RawDatabase from(model), to(file);
         RawStatement schema(from, "select replace(sql, 'SONGCASE', 'NOCASE') from sqlite_schema "
-                                  "where sql is not null order by type desc");
+                                  "where name not like 'sqlite_%' order by type desc");
         while (schema.step())
             to.exec(reinterpret_cast<const char *>(sqlite3_column_text(schema.handle(), 0)));
     }

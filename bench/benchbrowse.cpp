@@ -1,15 +1,15 @@
 #include "browsepages.h"
 #include "cases.h"
-#include "opencatalogue.h"
 #include "platform/ado/recordset.h"
 #include "shell/services/globals.h"
+#include "shell/startup.h"
 
 namespace
 {
 
 void browse(benchmark::State &state, const benchdata::Scale &scale)
 {
-    openCatalogue(QString::fromStdString(benchdata::catalogue(scale)));
+    startup::openCatalogue(QString::fromStdString(benchdata::catalogue(scale)), false);
     for (auto _ : state)
         benchmark::DoNotOptimize(loadBrowsePages().tracks);
     gConnection.reset();
@@ -19,7 +19,7 @@ void openAndCheck(benchmark::State &state, const benchdata::Scale &scale)
 {
     const auto file = QString::fromStdString(benchdata::catalogue(scale));
     for (auto _ : state) {
-        openCatalogue(file);
+        startup::openCatalogue(file, false);
         gConnection.reset();
     }
 }
@@ -27,11 +27,11 @@ void openAndCheck(benchmark::State &state, const benchdata::Scale &scale)
 // A click on a column of the albums: 1 the artist, 2 the title.
 void sortAlbums(benchmark::State &state, const benchdata::Scale &scale)
 {
-    openCatalogue(QString::fromStdString(benchdata::catalogue(scale)));
+    startup::openCatalogue(QString::fromStdString(benchdata::catalogue(scale)), false);
     const BrowsePages pages = loadBrowsePages();
     for (auto _ : state)
-        benchmark::DoNotOptimize(sortedBy(*pages.albums, int(state.range(0))).data());
-    state.SetItemsProcessed(state.iterations() * pages.albums->rowCount());
+        benchmark::DoNotOptimize(sortedRows(*pages.albums.rows, int(state.range(0))).data());
+    state.SetItemsProcessed(state.iterations() * pages.albums.rows->rowCount());
     gConnection.reset();
 }
 

@@ -6,7 +6,9 @@
 #include <QString>
 #include <cstdlib>
 #include <filesystem>
+#include <fstream>
 #include <functional>
+#include <iterator>
 #include <unistd.h>
 
 namespace fs = std::filesystem;
@@ -30,10 +32,24 @@ fs::path folder()
     return folder;
 }
 
+// Names the generators and the schema: files of other ones are not taken.
+std::string version()
+{
+    static const std::string version = [] {
+        const fs::path empty = folder() / ("schema-" + std::to_string(getpid()));
+        cataloguefile::create(QString::fromStdString(empty.string()));
+        std::ifstream file(empty, std::ios::binary);
+        const std::string bytes(std::istreambuf_iterator<char>(file), {});
+        fs::remove(empty);
+        return generation + '-' + std::to_string(std::hash<std::string>()(bytes));
+    }();
+    return version;
+}
+
 // Under another name until it is whole.
 std::string made(const std::string &name, const std::function<void(const std::string &)> &make)
 {
-    const fs::path file = folder() / (generation + '-' + name);
+    const fs::path file = folder() / (version() + '-' + name);
     if (!fs::exists(file)) {
         const fs::path half = file.string() + ".half";
         fs::remove(half);

@@ -1,9 +1,9 @@
 #include "cases.h"
 #include "catalogue/cleanorphans.h"
-#include "opencatalogue.h"
 #include "platform/ado/connection.h"
 #include "rawdatabase.h"
 #include "shell/services/globals.h"
+#include "shell/startup.h"
 
 namespace
 {
@@ -14,7 +14,7 @@ void clean(benchmark::State &state, const std::string &catalogue)
 {
     for (auto _ : state) {
         state.PauseTiming();
-        openCatalogue(QString::fromStdString(benchdata::scratchCopy(catalogue)));
+        startup::openCatalogue(QString::fromStdString(benchdata::scratchCopy(catalogue)), false);
         state.ResumeTiming();
         CleanOrphans();
         state.PauseTiming();

@@ -1,9 +1,9 @@
 #include "cases.h"
-#include "opencatalogue.h"
 #include "platform/ado/dialect.h"
 #include "platform/ado/recordset.h"
 #include "rawdatabase.h"
 #include "shell/services/globals.h"
+#include "shell/startup.h"
 
 namespace
 {
@@ -22,7 +22,8 @@ const char *const typical[] = {
 // transaction, or both would measure the locks of the file.
 void find(benchmark::State &state)
 {
-    openCatalogue(QString::fromStdString(benchdata::catalogue(benchdata::scales().front())));
+    startup::openCatalogue(
+        QString::fromStdString(benchdata::catalogue(benchdata::scales().front())), false);
     const QString statement =
         QString(findArtist).replace(QLatin1String("%1"), QLatin1String("Nobody At All"));
     const ADODB::Transaction transaction(*gConnection);

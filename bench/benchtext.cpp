@@ -1,8 +1,9 @@
 #include "bareload.h"
 #include "cases.h"
-#include "opencatalogue.h"
+#include "chooseimport.h"
 #include "platform/ado/recordset.h"
 #include "shell/services/globals.h"
+#include "shell/startup.h"
 #include "textimport/catalogueload.h"
 #include "textimport/filereading.h"
 
@@ -20,7 +21,7 @@ void readInto(char format)
 
 void readText(benchmark::State &state, char format)
 {
-    openCatalogue(QString::fromStdString(benchdata::emptyCatalogue()));
+    startup::openCatalogue(QString::fromStdString(benchdata::emptyCatalogue()), false);
     for (auto _ : state)
         readInto(format);
     state.SetItemsProcessed(state.iterations() * gImportRecords->RecordCount());
@@ -33,7 +34,7 @@ void loadText(benchmark::State &state, char format, const std::string &catalogue
 {
     for (auto _ : state) {
         state.PauseTiming();
-        openCatalogue(QString::fromStdString(benchdata::scratchCopy(catalogue)));
+        startup::openCatalogue(QString::fromStdString(benchdata::scratchCopy(catalogue)), false);
         readInto(format);
         CatalogueLoad load;
         load.ask = [](const QString &) { return vbYes; };

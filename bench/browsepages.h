@@ -1,23 +1,21 @@
 #pragma once
 
-#include <QtGlobal>
+#include "controls/sortedrows.h"
+
 #include <memory>
-#include <vector>
 
-namespace ADODB
-{
-class Rows;
-}
-
-/// The pages of the collection browser as they are after a load.
-struct BrowsePages {
-    std::shared_ptr<const ADODB::Rows> compilations, albums, collections;
-    std::vector<qsizetype> compilationOrder, albumOrder, collectionOrder; // rows, as shown
-    long long tracks = 0;
+/// A list of the collection browser: its rows, and their order on the screen.
+struct BrowsePage {
+    std::shared_ptr<const ADODB::Rows> rows;
+    std::vector<std::uint32_t> order;
 };
 
-/// Reads and sorts all pages from gConnection, as the browser does at its load and at each refresh.
-BrowsePages loadBrowsePages();
+/// What a load of the browser brings in.
+struct BrowsePages {
+    BrowsePage compilations, albums, collections;
+    qint64 tracks = 0;
+};
 
-/// The rows in the order of a text column, ascending, equal ones as they stand.
-std::vector<qsizetype> sortedBy(const ADODB::Rows &rows, int column);
+/// Reads and sorts all pages from gConnection, as the browser does when it is loaded and at each
+/// refresh; what is left out is the drawing.
+BrowsePages loadBrowsePages();

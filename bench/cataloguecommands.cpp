@@ -2,8 +2,8 @@
 #include "catalogue/cataloguefile.h"
 #include "catalogue/cleanorphans.h"
 #include "measure.h"
-#include "opencatalogue.h"
 #include "platform/ado/recordset.h"
+#include "shell/startup.h"
 #include "workcommands.h"
 
 namespace
@@ -12,7 +12,7 @@ namespace
 void open(const QString &file)
 {
     measured("open", [&] {
-        openCatalogue(file);
+        startup::openCatalogue(file, false);
         return std::string();
     });
 }
@@ -32,9 +32,10 @@ void browse(const QStringList &arguments)
     open(arguments[0]);
     measured("browse", [] {
         const BrowsePages pages = loadBrowsePages();
-        return count("compilations", pages.compilations->rowCount()) +
-               count("albums", pages.albums->rowCount()) +
-               count("collections", pages.collections->rowCount()) + count("tracks", pages.tracks);
+        return count("compilations", pages.compilations.rows->rowCount()) +
+               count("albums", pages.albums.rows->rowCount()) +
+               count("collections", pages.collections.rows->rowCount()) +
+               count("tracks", pages.tracks);
     });
 }
 

@@ -12,7 +12,8 @@ namespace
 
 constexpr double compilationShare = 0.3, boxSetShare = 0.08, sharedShare = 0.25;
 
-/// Indexes are taken away while rows are written and made again from all rows at once.
+/// Indexes are taken away while rows are written and made again from all rows at once; what the
+/// catalogue says of their statistics would go with them and is put back too.
 class WithoutIndexes
 {
 public:
@@ -25,9 +26,14 @@ public:
             drop += "drop index " + text(indexes, 0) + ';';
             mCreate += text(indexes, 1) + ';';
         }
-        database.exec(drop);
+        database.exec("create temp table Kept as select * from sqlite_stat1;" + drop);
     }
-    void putBack() { mDatabase.exec(mCreate); }
+
+    void putBack()
+    {
+        mDatabase.exec(mCreate + "delete from sqlite_stat1;"
+                                 "insert into sqlite_stat1 select * from Kept");
+    }
 
 private:
     static std::string text(RawStatement &row, int column)

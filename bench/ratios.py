@@ -83,9 +83,10 @@ class Bench:
         return ["sqlite3", "-cmd", f".load {self.extension} sqlite3_songcase_init", *options, file, sql]
 
     def made(self, name, *command):
-        """A file of the data folder; made by songcase-generate if it is not there."""
+        """A file of the data folder; made if it is not there, or older than the generator."""
         file = os.path.join(self.data, name)
-        if not os.path.exists(file):
+        generator = self.program("songcase-generate")[0]
+        if not os.path.exists(file) or os.path.getmtime(file) < os.path.getmtime(generator):
             half = file + ".half"
             with contextlib.suppress(FileNotFoundError):
                 os.remove(half)

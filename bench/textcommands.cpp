@@ -1,8 +1,9 @@
 #include "catalogue/cataloguefile.h"
+#include "chooseimport.h"
 #include "measure.h"
-#include "opencatalogue.h"
 #include "platform/ado/recordset.h"
 #include "shell/services/globals.h"
+#include "shell/startup.h"
 #include "textimport/catalogueload.h"
 #include "textimport/filereading.h"
 #include "workcommands.h"
@@ -34,14 +35,14 @@ void readText(const QStringList &arguments)
     const QTemporaryDir folder;
     const QString catalogue = folder.filePath(QStringLiteral("empty.orv"));
     cataloguefile::create(catalogue);
-    openCatalogue(catalogue);
+    startup::openCatalogue(catalogue, false);
     read(arguments[0], arguments[1]);
     gConnection.reset();
 }
 
 void loadText(const QStringList &arguments)
 {
-    openCatalogue(arguments[0]);
+    startup::openCatalogue(arguments[0], false);
     read(arguments[1], arguments[2]);
     measured("load", [] {
         CatalogueLoad load;

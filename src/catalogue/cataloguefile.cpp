@@ -18,7 +18,8 @@ namespace
 
 // Text columns carry the collation, so that each comparison and each index of theirs goes by it.
 // CD_Type is one of two letters and is compared without. Indexes stand on every column that
-// statements search or join by.
+// statements search or join by; further columns behind those spare the lists of the browser and the
+// search the way to the rows.
 constexpr char schema[] = R"sql(
 create table Artiesten(ID integer primary key, Naam text collate SONGCASE);
 create table Tracks(ID integer primary key, Artiest_ID integer, Titel text collate SONGCASE,
@@ -32,12 +33,27 @@ create table MP3Collections(ID integer primary key, Map text collate SONGCASE,
 create table MP3Files(ID integer primary key, Volgnummer integer, FileName text collate SONGCASE,
                       CollectionId integer);
 create index ArtiestenNaam on Artiesten(Naam);
-create index TracksArtiest on Tracks(Artiest_ID, Titel);
-create index CDTitelsArtiest on CDTitels(Artiest_ID);
-create index CDTitelsTitel on CDTitels(Titel);
+create index TracksArtiest on Tracks(Artiest_ID, Titel, Genre, Hitjaar);
+create index CDTitelsArtiest on CDTitels(Artiest_ID, Titel);
+create index CDTitelsTitel on CDTitels(Titel, CD_Type, Artiest_ID);
 create index CompactDiscsTitel on CompactDiscs(CDTitels_ID, DiskNo, TrackNo);
 create index CompactDiscsTrack on CompactDiscs(Track_ID);
 create index MP3FilesCollection on MP3Files(CollectionId, Volgnummer);
+)sql";
+
+// What the engine is to believe of the sizes: rows, then how many of them share the first column of
+// an index, the first two and so on. Told once, a collection's shape gives the same plans for every
+// catalogue and each day; without it a search for an artist reads all discs.
+constexpr char statistics[] = R"sql(
+analyze;
+insert into sqlite_stat1(tbl, idx, stat) values
+    ('Artiesten', 'ArtiestenNaam', '2000 1'),
+    ('Tracks', 'TracksArtiest', '40000 20 1 1 1'),
+    ('CDTitels', 'CDTitelsArtiest', '2500 2 1'),
+    ('CDTitels', 'CDTitelsTitel', '2500 1 1 1'),
+    ('CompactDiscs', 'CompactDiscsTitel', '45000 20 15 1'),
+    ('CompactDiscs', 'CompactDiscsTrack', '45000 1'),
+    ('MP3Files', 'MP3FilesCollection', '2000 12 1');
 )sql";
 
 constexpr const char *tables[] = {"Artiesten",    "Tracks",         "CDTitels",
@@ -91,6 +107,7 @@ void create(const QString &file)
     run(pragma("application_id", applicationId).constData());
     run(pragma("user_version", currentVersion()).constData());
     run(schema);
+    run(statistics);
     run("commit");
     sqlite3_close(db);
     if (code != SQLITE_OK) {

@@ -1,0 +1,12 @@
+#include "chooseimport.h"
+
+#include "shell/services/globals.h"
+
+void chooseImport(char format, const QString &file)
+{
+    gImportFile = file;
+    gImportCompilationNested = format == 'A';
+    gImportAlbumNested = format == 'B';
+    gImportCompilationFlat = format == 'C';
+    gImportAlbumFlat = format == 'D';
+}
