@@ -12,12 +12,11 @@ namespace
 const auto nextCompactDiscId = QStringLiteral("select max(id+1) as ID from CompactDiscs");
 const auto nextCdTitelId = QStringLiteral("select max(id+1) as ID from CDtitels");
 
-// By design: this word is Dutch in both languages where a reader does not take it from the table.
-QString progressWord(FilePart part)
+// By design: where a reader does not take the word behind the percentage from the table, it is
+// Dutch in both languages.
+bool wordIsFromTable(FilePart part)
 {
-    const bool fromTable =
-        gImportCompilationNested || (gImportAlbumNested && part == FilePart::Tracks);
-    return fromTable ? GetMessage("lblRead") : QStringLiteral("% ingelezen");
+    return gImportCompilationNested || (gImportAlbumNested && part == FilePart::Tracks);
 }
 
 } // namespace
@@ -64,9 +63,11 @@ void FileReading::tell(FilePart part)
 {
     const int percent =
         mLineTotal == 0 ? 100 : int(qMin<qint64>(100, qint64(mLineNumber) * 100 / mLineTotal));
-    if (!show || (percent == mPercentShown && part == mPartShown))
+    const bool fromTable = wordIsFromTable(part);
+    if (!show || (percent == mPercentShown && fromTable == mFromTableShown))
         return;
     mPercentShown = percent;
-    mPartShown = part;
-    show(percent, QString::number(percent) + progressWord(part));
+    mFromTableShown = fromTable;
+    show(percent, QString::number(percent) +
+                      (fromTable ? GetMessage("lblRead") : QStringLiteral("% ingelezen")));
 }

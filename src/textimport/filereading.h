@@ -26,5 +26,5 @@ private:
 
     int mLineNumber = 0, mLineTotal = 0;
     int mPercentShown = -1;
-    FilePart mPartShown = FilePart::Head;
+    bool mFromTableShown = false;
 };

@@ -1,0 +1,31 @@
+#pragma once
+
+#include "shell/services/frame.h"
+
+#include <QStringList>
+#include <QWidget>
+
+/// What the wizard leaves behind: the file and one of the four formats. A and B have one field per
+/// row, C and D one track; A and C hold compilations, B and D albums.
+void chooseImport(char format, const QString &file);
+
+/// The rows of gImportRecords, values joined by "|".
+QStringList importRows();
+
+/// A frame of which only the Import entry and the pointer matter.
+class TestFrame : public Frame
+{
+public:
+    TestFrame() { setCurrent(this); }
+    ~TestFrame() override { setCurrent(nullptr); }
+
+    QWidget *window() override { return &mWindow; }
+    QSize size() const override { return {900, 600}; }
+    void setImportEnabled(bool enabled) override { importEnabled = enabled; }
+    bool hourglass() const { return mWindow.cursor().shape() == Qt::WaitCursor; }
+
+    bool importEnabled = true;
+
+private:
+    QWidget mWindow;
+};
