@@ -1,17 +1,15 @@
 #include "controls/DBListViewCTL.h"
 
-#include "controls/keycodes.h"
 #include "controls/listmodel.h"
 #include "controls/rowdelegate.h"
 #include "controls/rowdrag.h"
+#include "controls/rowselection.h"
 
 #include <QAccessible>
 #include <QApplication>
 #include <QClipboard>
 #include <QHeaderView>
-#include <QMouseEvent>
 #include <QPainter>
-#include <QPointer>
 #include <QScrollBar>
 #include <QStyleOption>
 
@@ -22,21 +20,7 @@ namespace
 
 constexpr int defaultColumnWidth = 96;
 constexpr int dropShade = 80; // of 255, over the row
-
-int buttonOf(Qt::MouseButton button)
-{
-    if (button == Qt::RightButton)
-        return 2;
-    return button == Qt::LeftButton ? 1 : 4;
-}
-
-/// F1 to F8 and the commands on Insert are the menu's.
-bool isMenuKey(const QKeyEvent &event)
-{
-    const bool insert = event.key() == Qt::Key_Insert;
-    return (event.key() >= Qt::Key_F1 && event.key() <= Qt::Key_F8) ||
-           (insert && shiftStateOf(event.modifiers()) != 0);
-}
+constexpr std::size_t mostRanges = 12000;
 
 qsizetype rowsIn(const QItemSelection &selection)
 {
@@ -46,17 +30,16 @@ qsizetype rowsIn(const QItemSelection &selection)
     return rows;
 }
 
-bool isPrintable(const QString &text)
-{
-    return !text.isEmpty() && text.front().isPrint();
-}
-
 } // namespace
 
 DBListViewCTL::DBListViewCTL(QWidget *parent)
     : QTableView(parent), mModel(new ListModel(this)), mDrag(new RowDrag(this))
 {
     setModel(mModel);
+    auto *rows = new RowSelection(mModel, this);
+    delete selectionModel();
+    setSelectionModel(rows);
+    connect(rows, &RowSelection::dropped, viewport(), qOverload<>(&QWidget::update));
     setItemDelegate(new RowDelegate(this));
     setSelectionBehavior(SelectRows);
     setSelectionMode(ExtendedSelection);
@@ -87,6 +70,9 @@ void DBListViewCTL::setUpHeaders()
     head->setSectionsClickable(true);
     head->setSortIndicatorShown(true);
     showSortMark();
+    // To draw their sections as selected the headers would ask for each row whether it is.
+    for (QHeaderView *header : {head, verticalHeader()})
+        header->setSelectionModel(new QItemSelectionModel(mModel, header));
     // A table selects a whole column otherwise.
     disconnect(head, &QHeaderView::sectionPressed, this, nullptr);
     disconnect(head, &QHeaderView::sectionEntered, this, nullptr);
@@ -183,8 +169,11 @@ void DBListViewCTL::setRowSelected(int row, bool selected)
     }
     const QItemSelection rows(mModel->index(top, 0), mModel->index(bottom, 0));
     selectionModel()->select(rows, command | QItemSelectionModel::Rows);
-    if (selected && !currentIsSelected)
+    if (selected && !currentIsSelected) {
+        setAutoScroll(false);
         selectionModel()->setCurrentIndex(shownIndex(row), QItemSelectionModel::NoUpdate);
+        setAutoScroll(true);
+    }
 }
 
 void DBListViewCTL::setDropHighlight(const ListItem &item)
@@ -221,7 +210,7 @@ void DBListViewCTL::applyOrder()
         const std::vector<bool> selected = selectedRecords();
         selectionModel()->reset();
         mModel->sortBy(column);
-        selectRecords(selected);
+        selectRecords(selected, rowOf(current));
         if (current)
             selectionModel()->setCurrentIndex(mModel->index(rowOf(current), cell.column()),
                                               QItemSelectionModel::NoUpdate);
@@ -242,21 +231,30 @@ std::vector<bool> DBListViewCTL::selectedRecords() const
     return selected;
 }
 
-void DBListViewCTL::selectRecords(const std::vector<bool> &selected)
+void DBListViewCTL::selectRecords(const std::vector<bool> &selected, int current)
 {
     const auto isSelected = [&](int row) { return selected[std::size_t(mModel->recordAt(row))]; };
-    QItemSelection ranges;
     const int rows = int(selected.size());
-    for (int top = 0; top < rows; ++top) {
-        if (!isSelected(top))
+    std::vector<std::pair<int, int>> ranges; // first row, row behind the last
+    for (int row = 0; row < rows; ++row) {
+        if (!isSelected(row))
             continue;
-        int end = top + 1;
-        while (end < rows && isSelected(end))
-            ++end;
-        ranges.select(mModel->index(top, 0), mModel->index(end - 1, mModel->columnCount() - 1));
-        top = end;
+        if (!ranges.empty() && ranges.back().second == row)
+            ++ranges.back().second;
+        else
+            ranges.emplace_back(row, row + 1);
     }
-    selectionModel()->select(ranges, QItemSelectionModel::Select);
+    // By design: a selection in more pieces would hold the list up for seconds at each paint.
+    if (ranges.size() > mostRanges) {
+        ranges.clear();
+        if (current >= 0)
+            ranges.emplace_back(current, current + 1);
+    }
+    QItemSelection selection;
+    for (const auto &[top, end] : ranges)
+        selection.append(
+            {mModel->index(top, 0), mModel->index(end - 1, mModel->columnCount() - 1)});
+    selectionModel()->select(selection, QItemSelectionModel::Select);
 }
 
 void DBListViewCTL::showSortMark()
@@ -317,6 +315,7 @@ void DBListViewCTL::setDragIcon(const QCursor &cursor)
 // Sideways the list stays where the user has put it.
 void DBListViewCTL::scrollTo(const QModelIndex &index, ScrollHint hint)
 {
+    executeDelayedItemsLayout(); // rows that have come since the last paint can be scrolled to
     const int left = horizontalScrollBar()->value();
     QTableView::scrollTo(shownIndex(index.row()), hint);
     horizontalScrollBar()->setValue(left);
@@ -363,88 +362,6 @@ void DBListViewCTL::selectionChanged(const QItemSelection &selected, const QItem
     QAccessible::updateAccessibility(&event);
 }
 
-void DBListViewCTL::keyPressEvent(QKeyEvent *event)
-{
-    const QPointer<DBListViewCTL> self(this);
-    if (mDrag->running() && event->key() == Qt::Key_Escape) {
-        mDrag->end();
-        return;
-    }
-    if (isMenuKey(*event)) {
-        event->ignore();
-        return;
-    }
-    if (const int code = keyCodeOf(event->key()))
-        emit KeyDown(code, shiftStateOf(event->modifiers()));
-    if (self && isEnabled() && !actOnKey(event))
-        QTableView::keyPressEvent(event);
-}
-
-bool DBListViewCTL::actOnKey(QKeyEvent *event)
-{
-    const bool plain = shiftStateOf(event->modifiers()) == 0;
-    const bool typing =
-        !mTyped.isEmpty() && !mTypedAt.hasExpired(QApplication::keyboardInputInterval());
-    if (event->matches(QKeySequence::Copy)) {
-        copySelected();
-    } else if (event->key() == Qt::Key_Space && plain && typing) {
-        keyboardSearch(event->text());
-    } else if (event->key() == Qt::Key_Space && plain && CheckBoxes()) {
-        toggleCheck(currentIndex());
-    } else if (event->key() == Qt::Key_Left && plain) {
-        horizontalScrollBar()->triggerAction(QScrollBar::SliderSingleStepSub);
-    } else if (event->key() == Qt::Key_Right && plain) {
-        horizontalScrollBar()->triggerAction(QScrollBar::SliderSingleStepAdd);
-    } else if (!event->text().isEmpty() && !isPrintable(event->text()) &&
-               !event->matches(QKeySequence::SelectAll) && event->key() != Qt::Key_Return &&
-               event->key() != Qt::Key_Enter) {
-        event->ignore(); // Esc, Delete and their like would be taken for typing
-    } else {
-        return false;
-    }
-    return true;
-}
-
-void DBListViewCTL::keyReleaseEvent(QKeyEvent *event)
-{
-    QTableView::keyReleaseEvent(event);
-    const int code = keyCodeOf(event->key());
-    if (code != 0 && !event->isAutoRepeat() && !isMenuKey(*event))
-        emit KeyUp(code, shiftStateOf(event->modifiers()));
-}
-
-void DBListViewCTL::keyboardSearch(const QString &typed)
-{
-    const bool continues =
-        !mTyped.isEmpty() && !mTypedAt.hasExpired(QApplication::keyboardInputInterval());
-    if (!isPrintable(typed) || (!continues && typed.trimmed().isEmpty()))
-        return;
-    mTyped = continues ? QString(mTyped + typed) : typed;
-    mTypedAt.start();
-    // One letter typed again and again visits all rows that start with it.
-    const bool one = std::all_of(mTyped.begin(), mTyped.end(), [this](QChar c) {
-        return c.toCaseFolded() == mTyped[0].toCaseFolded();
-    });
-    const int current = currentIndex().row();
-    const int found =
-        one ? searchFrom(current + 1, mTyped.left(1)) : searchFrom(std::max(current, 0), mTyped);
-    if (found >= 0)
-        makeCurrent(found);
-}
-
-int DBListViewCTL::searchFrom(int row, const QString &text) const
-{
-    const bool sorted = mSorted && mSortKey < mModel->columnCount() && !isColumnHidden(mSortKey);
-    const int column = sorted ? mSortKey : shownIndex(0).column();
-    const int rows = mModel->rowCount();
-    for (int i = 0; i < rows; ++i) {
-        const int at = (row + i) % rows;
-        if (mModel->startsWith(mModel->recordAt(at), column, text))
-            return at;
-    }
-    return -1;
-}
-
 void DBListViewCTL::copySelected() const
 {
     std::vector<std::pair<int, int>> ranges;
@@ -475,94 +392,6 @@ void DBListViewCTL::appendLine(QString &text, int record) const
         text += cell;
     }
     text += u'\n';
-}
-
-void DBListViewCTL::toggleCheck(const QModelIndex &index)
-{
-    const QModelIndex cell = index.siblingAtColumn(mModel->checkColumn());
-    const bool checked = cell.data(Qt::CheckStateRole).toInt() == Qt::Checked;
-    mModel->setData(cell, checked ? Qt::Unchecked : Qt::Checked, Qt::CheckStateRole);
-}
-
-bool DBListViewCTL::onCheckBox(const QModelIndex &index, QPoint at) const
-{
-    if (!index.isValid() || index.column() != mModel->checkColumn())
-        return false;
-    QStyleOptionViewItem option;
-    initViewItemOption(&option);
-    option.rect = visualRect(index);
-    option.features |= QStyleOptionViewItem::HasCheckIndicator;
-    return style()
-        ->subElementRect(QStyle::SE_ItemViewItemCheckIndicator, &option, this)
-        .contains(at);
-}
-
-void DBListViewCTL::mousePressEvent(QMouseEvent *event)
-{
-    const QPointer<DBListViewCTL> self(this);
-    const QPoint at = event->position().toPoint();
-    emit MouseDown(buttonOf(event->button()), shiftStateOf(event->modifiers()), at.x(), at.y());
-    if (!self || mDrag->running())
-        return;
-    const QModelIndex index = indexAt(at);
-    mCheckPressed = event->button() == Qt::LeftButton && onCheckBox(index, at);
-    if (mCheckPressed) {
-        toggleCheck(index);
-        return;
-    }
-    QTableView::mousePressEvent(event);
-    if (index.isValid())
-        emit ItemClick(itemAt(index.row()));
-}
-
-void DBListViewCTL::mouseMoveEvent(QMouseEvent *event)
-{
-    if (mDrag->running())
-        mDrag->pointerMoved(event->position().toPoint());
-    else if (!mCheckPressed)
-        QTableView::mouseMoveEvent(event);
-}
-
-void DBListViewCTL::mouseReleaseEvent(QMouseEvent *event)
-{
-    if (mDrag->running())
-        mDrag->released(event->position().toPoint());
-    else if (!mCheckPressed)
-        QTableView::mouseReleaseEvent(event);
-    mCheckPressed = false;
-}
-
-void DBListViewCTL::mouseDoubleClickEvent(QMouseEvent *event)
-{
-    const QModelIndex index = indexAt(event->position().toPoint());
-    if (event->button() == Qt::LeftButton && onCheckBox(index, event->position().toPoint())) {
-        mCheckPressed = true;
-        toggleCheck(index);
-        return;
-    }
-    QTableView::mouseDoubleClickEvent(event);
-    if (event->button() == Qt::LeftButton && index.isValid())
-        emit DblClick();
-}
-
-void DBListViewCTL::focusInEvent(QFocusEvent *event)
-{
-    QTableView::focusInEvent(event);
-    if (event->reason() != Qt::PopupFocusReason)
-        emit GotFocus();
-}
-
-void DBListViewCTL::focusOutEvent(QFocusEvent *event)
-{
-    QTableView::focusOutEvent(event);
-    if (event->reason() != Qt::PopupFocusReason)
-        emit LostFocus();
-}
-
-void DBListViewCTL::hideEvent(QHideEvent *event)
-{
-    mDrag->end();
-    QTableView::hideEvent(event);
 }
 
 void DBListViewCTL::changeEvent(QEvent *event)

@@ -62,7 +62,7 @@ public:
 signals:
     void ItemClick(ListItem item);
     void ItemCheck(ListItem item); // the user has changed a check mark
-    void ColumnClick(int index);   // from 1
+    void ColumnClick(int index);   // from 1; by mouse, or Ctrl+1 to 9 for those that show
     void DblClick();
 
     // keyCode as in keycodes.h; shift: 1 Shift, 2 Ctrl, 4 Alt; button: 1 left, 2 right, 4 middle.
@@ -76,6 +76,7 @@ signals:
 
 protected:
     QModelIndex moveCursor(CursorAction action, Qt::KeyboardModifiers modifiers) override;
+    void currentChanged(const QModelIndex &current, const QModelIndex &previous) override;
     void selectionChanged(const QItemSelection &selected, const QItemSelection &old) override;
     void keyPressEvent(QKeyEvent *event) override;
     void keyReleaseEvent(QKeyEvent *event) override;
@@ -107,11 +108,12 @@ private:
     void columnsChanged();
     void applyOrder();
     std::vector<bool> selectedRecords() const;
-    void selectRecords(const std::vector<bool> &selected);
+    void selectRecords(const std::vector<bool> &selected, int current);
     void showSortMark();
     void copySelected() const;
     void appendLine(QString &text, int record) const;
     bool actOnKey(QKeyEvent *event);
+    void clickShownColumn(int nth);
     void toggleCheck(const QModelIndex &index);
     bool onCheckBox(const QModelIndex &index, QPoint at) const;
     int searchFrom(int row, const QString &text) const;

@@ -68,6 +68,20 @@ bool ListModel::startsWith(int record, int column, const QString &start) const
     return text(record, column).startsWith(start, Qt::CaseInsensitive);
 }
 
+// Goes by records, since these lie in memory one behind the other: in the order of a sorted list a
+// million rows would take a second.
+int ListModel::findStart(int column, const QString &start, int fromRow) const
+{
+    const int rows = rowCount();
+    int nearest = rows;
+    for (int record = 0; record < rows && nearest > 0; ++record) {
+        const int distance = (rowOf(record) - fromRow + rows) % rows;
+        if (distance < nearest && startsWith(record, column, start))
+            nearest = distance;
+    }
+    return nearest < rows ? (fromRow + nearest) % rows : -1;
+}
+
 void ListModel::sortBy(int column)
 {
     if (hasOrderOf(column))

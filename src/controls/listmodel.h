@@ -38,8 +38,9 @@ public:
     Marks marks(int record) const { return mMarks.value(record); }
     void setMarks(int record, const Marks &marks);
 
-    /// Whether the text of a cell begins so, without regard to case.
-    bool startsWith(int record, int column, const QString &start) const;
+    /// The next row, from this one on and then from the top, whose text in a column starts so,
+    /// without regard to case; -1 if there is none.
+    int findStart(int column, const QString &start, int fromRow) const;
 
     /// Shows the rows ascending by a column, in the recordset's order if it is -1.
     void sortBy(int column);
@@ -61,6 +62,7 @@ signals:
     void checkToggled(int record); // through setData(), by the user
 
 private:
+    bool startsWith(int record, int column, const QString &start) const;
     void setOrder(std::vector<std::uint32_t> order);
     void rowChanged(int record);
 

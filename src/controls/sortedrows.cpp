@@ -2,8 +2,12 @@
 
 #include "platform/text/collation.h"
 
+#include <QtEndian>
+
 #include <algorithm>
+#include <bit>
 #include <charconv>
+#include <cstring>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -13,18 +17,24 @@ namespace
 
 using Row = std::uint32_t;
 
-/// A row with what decides its place first: a value, or the start of its text as a number.
+/// A row with what decides its place first: a value, or the next eight letters of its text as a
+/// number, and what is left of the text behind them. The text is kept here because looking it up
+/// in the rows is what costs most.
 struct Entry {
     std::uint64_t key;
+    const char *rest;
+    std::uint32_t restSize : 31;
+    std::uint32_t accented : 1; // letters with accents so far
     Row row;
-    std::uint32_t used; // bytes of the text that the keys so far stand for
 };
 using Entries = std::vector<Entry>;
 
-bool byKey(const Entry &a, const Entry &b)
-{
-    return a.key != b.key ? a.key < b.key : a.row < b.row;
-}
+struct ByKey {
+    bool operator()(const Entry &a, const Entry &b) const
+    {
+        return a.key != b.key ? a.key < b.key : a.row < b.row;
+    }
+};
 
 std::optional<qint64> wholeNumber(std::string_view s)
 {
@@ -87,113 +97,138 @@ private:
 };
 
 /// Rows by their texts. Those with Latin letters alone are sorted eight letters at a time, the
-/// others by the start of their sort keys; only rows that are alike so far are compared as texts.
+/// others by sort keys, which take longer to make; then the two are merged.
 class TextSort
 {
 public:
     explicit TextSort(const ColumnTexts &texts) : mTexts(texts) {}
 
-    std::vector<Row> sorted()
+    std::vector<Row> sorted() const
     {
         std::vector<Row> result;
         result.reserve(mTexts.count());
-        Entries latin, others;
-        latin.reserve(mTexts.count());
+        Entries entries;
+        entries.reserve(mTexts.count());
         for (Row row = 0; row < mTexts.count(); ++row) {
-            if (Entry entry{0, row, 0}; mTexts[row].empty())
+            if (const auto text = mTexts[row]; text.empty())
                 result.push_back(row);
-            else if (nextKey(entry))
-                latin.push_back(entry);
             else
-                others.push_back({mCollation.sortKeyStart(mTexts[row]), row, 0});
+                entries.push_back({0, text.data(), std::uint32_t(text.size()), 0, row});
         }
-        sortLatin(latin.data(), latin.data() + latin.size(), 0);
-        sortOthers(others);
-        merge(latin, others, result);
+        sortRest(entries.data(), entries.data() + entries.size(), 0);
+        for (const Entry &entry : entries)
+            result.push_back(entry.row);
         return result;
     }
 
 private:
-    static constexpr int deepest = 64; // runs of texts alike for longer are compared as they are
+    static constexpr int deepest = 64; // beyond so many times eight letters texts are compared
 
-    bool nextKey(Entry &entry) const
+    /// False if the rest of the text has to be sorted by its sort key.
+    bool takeKey(Entry &entry) const
     {
-        const auto rest = mTexts[entry.row].substr(entry.used);
         std::size_t used = 0;
-        const bool latin = mCollation.sortPrefix(rest, entry.key, used);
-        entry.used += std::uint32_t(used);
+        const bool latin = mCollation.sortPrefix({entry.rest, entry.restSize}, entry.key, used);
+        const auto letters = 8 - std::size_t(std::countr_zero(entry.key)) / 8;
+        entry.accented |= used > letters;
+        entry.rest += used;
+        entry.restSize -= std::uint32_t(used);
         return latin;
     }
 
-    bool before(Row a, Row b) const
+    bool before(const Entry &a, const Entry &b) const
     {
-        const auto x = mTexts[a], y = mTexts[b];
+        const auto x = mTexts[a.row], y = mTexts[b.row];
         const int order = x == y ? 0 : mCollation.compare(x, y);
-        return order != 0 ? order < 0 : a < b;
+        return order != 0 ? order < 0 : a.row < b.row;
     }
 
-    void sortAsTexts(Entry *from, Entry *to) const
+    /// Sorts entries whose texts have been alike up to their rests.
+    void sortRest(Entry *from, Entry *to, int depth) const
     {
-        std::sort(from, to,
-                  [this](const Entry &a, const Entry &b) { return before(a.row, b.row); });
-    }
-
-    /// Calls a function for each run of two or more entries with one key.
-    template <typename Function> static void forRuns(Entry *from, Entry *to, Function function)
-    {
-        while (from < to) {
-            Entry *end = from + 1;
-            while (end < to && end->key == from->key)
-                ++end;
-            if (end - from > 1)
-                function(from, end);
-            from = end;
+        Entries others;
+        Entry *end = from;
+        for (Entry *entry = from; entry < to; ++entry) {
+            if (takeKey(*entry))
+                *end++ = *entry;
+            else
+                others.push_back(*entry);
+        }
+        sortLatin(from, end, depth);
+        if (!others.empty()) {
+            sortBySortKeys(others);
+            mergeIn(from, end, others);
         }
     }
 
     void sortLatin(Entry *from, Entry *to, int depth) const
     {
-        std::sort(from, to, byKey);
-        forRuns(from, to, [&](Entry *a, Entry *b) { refine(a, b, depth + 1); });
+        if (!std::is_sorted(from, to, ByKey()))
+            std::sort(from, to, ByKey());
+        while (from < to) {
+            Entry *end = from + 1;
+            while (end < to && end->key == from->key)
+                ++end;
+            if (end - from > 1)
+                sortRun(from, end, depth);
+            from = end;
+        }
     }
 
-    void refine(Entry *from, Entry *to, int depth) const
+    /// Sorts entries with the same key.
+    void sortRun(Entry *from, Entry *to, int depth) const
     {
-        const auto first = mTexts[from->row];
-        if (std::all_of(from + 1, to, [&](const Entry &e) { return mTexts[e.row] == first; }))
-            return; // sorted by row already
         const bool ended = (from->key & 0xFF) == 0;
-        if (!ended && depth < deepest &&
-            std::all_of(from, to, [this](Entry &entry) { return nextKey(entry); }))
-            sortLatin(from, to, depth);
-        else
+        if (!ended && depth < deepest)
+            sortRest(from, to, depth + 1);
+        else if (!ended || std::any_of(from, to, [](const Entry &e) { return e.accented; }))
             sortAsTexts(from, to);
     }
 
-    void sortOthers(Entries &others) const
+    void sortAsTexts(Entry *from, Entry *to) const
     {
-        std::sort(others.begin(), others.end(), byKey);
-        forRuns(others.data(), others.data() + others.size(),
-                [this](Entry *from, Entry *to) { sortAsTexts(from, to); });
+        const auto less = [this](const Entry &a, const Entry &b) { return before(a, b); };
+        if (!std::is_sorted(from, to, less)) // mostly they are all the same
+            std::sort(from, to, less);
     }
 
-    /// Looks for the place of each of the others in growing steps: there are mostly few of them.
-    void merge(const Entries &latin, const Entries &others, std::vector<Row> &result) const
+    void sortBySortKeys(Entries &entries) const
     {
-        const auto less = [this](const Entry &a, const Entry &b) { return before(a.row, b.row); };
-        auto at = latin.begin();
-        const auto takeTo = [&](Entries::const_iterator end) {
-            for (; at != end; ++at)
-                result.push_back(at->row);
-        };
-        for (const Entry &other : others) {
-            std::ptrdiff_t step = 1;
-            while (step < latin.end() - at && less(at[step], other))
-                step *= 2;
-            takeTo(std::lower_bound(at, at + std::min(step, latin.end() - at), other, less));
-            result.push_back(other.row);
+        std::string keys;
+        for (Entry &entry : entries) {
+            entry.key = keys.size();
+            mCollation.appendSortKey(mTexts[entry.row], keys);
         }
-        takeTo(latin.end());
+        for (Entry &entry : entries) {
+            entry.rest = keys.data() + entry.key;
+            char start[sizeof entry.key] = {};
+            std::memcpy(start, entry.rest, strnlen(entry.rest, sizeof start));
+            entry.key = qFromBigEndian<quint64>(start);
+        }
+        std::sort(entries.begin(), entries.end(), [](const Entry &a, const Entry &b) {
+            if (a.key != b.key)
+                return a.key < b.key;
+            const int order = std::strcmp(a.rest, b.rest);
+            return order != 0 ? order < 0 : a.row < b.row;
+        });
+    }
+
+    /// Merges the others, which fit behind the end, into [from, end), from the last one on. Looks
+    /// for the place of each in growing steps: there are mostly few of them.
+    void mergeIn(Entry *from, Entry *end, const Entries &others) const
+    {
+        const auto less = [this](const Entry &a, const Entry &b) { return before(a, b); };
+        Entry *to = end + others.size();
+        for (auto other = others.rbegin(); other != others.rend(); ++other) {
+            std::ptrdiff_t step = 1;
+            while (step <= end - from && less(*other, end[-step]))
+                step *= 2;
+            Entry *place =
+                std::upper_bound(std::max(from, end - step), end - step / 2, *other, less);
+            to = std::move_backward(place, end, to);
+            *--to = *other;
+            end = place;
+        }
     }
 
     const ColumnTexts &mTexts;
@@ -207,16 +242,16 @@ std::optional<std::vector<Row>> byNumber(const ColumnTexts &texts)
     Entries numbers;
     for (Row row = 0; row < texts.count(); ++row) {
         if (texts.isInteger(row)) {
-            numbers.push_back({sortableNumber(texts.integer(row)), row, 0});
+            numbers.push_back({sortableNumber(texts.integer(row)), nullptr, 0, 0, row});
         } else if (const auto text = texts[row]; text.empty()) {
             result.push_back(row);
         } else if (const auto value = wholeNumber(text)) {
-            numbers.push_back({sortableNumber(*value), row, 0});
+            numbers.push_back({sortableNumber(*value), nullptr, 0, 0, row});
         } else {
             return {};
         }
     }
-    std::sort(numbers.begin(), numbers.end(), byKey);
+    std::sort(numbers.begin(), numbers.end(), ByKey());
     for (const Entry &entry : numbers)
         result.push_back(entry.row);
     return result;

@@ -4,7 +4,7 @@
 #include <stdexcept>
 #include <string>
 #include <unicode/ucol.h>
-#include <unicode/uiter.h>
+#include <unicode/ustring.h>
 #include <vector>
 
 namespace text
@@ -155,18 +155,26 @@ bool Collation::sortPrefix(std::string_view s, std::uint64_t &prefix, std::size_
     return !mayJoin(s, used);
 }
 
-std::uint64_t Collation::sortKeyStart(std::string_view s) const
+void Collation::appendSortKey(std::string_view s, std::string &keys) const
 {
-    UCharIterator characters;
-    uiter_setUTF8(&characters, s.data(), int32_t(s.size()));
-    std::array<std::uint8_t, 8> bytes{};
-    std::array<std::uint32_t, 2> state{};
+    std::u16string units(s.size(), u'\0');
     UErrorCode status = U_ZERO_ERROR;
-    ucol_nextSortKeyPart(mCollator, &characters, state.data(), bytes.data(), bytes.size(), &status);
-    std::uint64_t start = 0;
-    for (const std::uint8_t byte : bytes)
-        start = start << 8 | byte;
-    return start;
+    int32_t length = 0;
+    u_strFromUTF8WithSub(units.data(), int32_t(units.size()), &length, s.data(), int32_t(s.size()),
+                         0xFFFD, nullptr, &status);
+    const std::size_t start = keys.size();
+    const auto room = [&] { return int32_t(keys.size() - start); };
+    const auto write = [&] {
+        return ucol_getSortKey(mCollator, units.data(), length,
+                               reinterpret_cast<std::uint8_t *>(keys.data() + start), room());
+    };
+    keys.resize(start + s.size() * 2 + 8);
+    int32_t size = write();
+    if (size > room()) {
+        keys.resize(start + std::size_t(size));
+        size = write();
+    }
+    keys.resize(start + std::size_t(size));
 }
 
 } // namespace text

@@ -2,6 +2,7 @@
 
 #include <array>
 #include <cstdint>
+#include <string>
 #include <string_view>
 
 struct UCollator;
@@ -27,9 +28,9 @@ public:
     /// False if the text has no such number: it holds more than Latin letters and ASCII.
     bool sortPrefix(std::string_view s, std::uint64_t &prefix, std::size_t &used) const;
 
-    /// The same for any text, more slowly: the first eight bytes of its sort key. Not to be mixed
-    /// with those of sortPrefix(); equal ones leave it to compare().
-    std::uint64_t sortKeyStart(std::string_view s) const;
+    /// Appends the bytes that sort, byte by byte, as the text does, 0 at the end and nowhere else.
+    /// For any text, but slower to make than sortPrefix().
+    void appendSortKey(std::string_view s, std::string &keys) const;
 
     /// The version of the order's tables, 24 bits. Indexes made under another one are not usable.
     std::uint32_t version() const { return mVersion; }
