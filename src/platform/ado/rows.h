@@ -57,7 +57,10 @@ private:
     using Cell = std::uint64_t;
     const Cell &cell(qsizetype row, int column) const { return mCells[row * mColumns + column]; }
     Cell &cell(qsizetype row, int column) { return mCells[row * mColumns + column]; }
+    char *room(std::size_t need);
+    Cell used(std::size_t bytes, Kind kind);
     Cell store(const void *bytes, std::size_t size, Kind kind);
+    Cell storeText(QStringView text);
     const char *stored(Cell c) const;
 
     std::shared_ptr<const FieldList> mFields;

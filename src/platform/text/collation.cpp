@@ -101,7 +101,7 @@ void Collation::rankAccented()
 }
 
 // The character at a place, which moves on behind it; 0 if its order is not known here.
-unsigned Collation::latinAt(std::string_view s, std::size_t &at)
+inline unsigned Collation::latinAt(std::string_view s, std::size_t &at)
 {
     const unsigned c = static_cast<unsigned char>(s[at++]);
     if (c < 0x80)
@@ -114,7 +114,11 @@ unsigned Collation::latinAt(std::string_view s, std::size_t &at)
 
 int Collation::compare(std::string_view a, std::string_view b) const
 {
-    std::size_t i = 0, j = 0;
+    const std::size_t both = std::min(a.size(), b.size());
+    std::size_t i = 0;
+    while (i < both && a[i] == b[i] && !(a[i] & 0x80))
+        ++i;
+    std::size_t j = i;
     int byAccent = 0; // counts if nothing else tells the two apart
     while (i < a.size() && j < b.size()) {
         const unsigned x = latinAt(a, i), y = latinAt(b, j);
