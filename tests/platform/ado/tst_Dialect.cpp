@@ -18,9 +18,6 @@ private slots:
     void refuses_data();
     void refuses();
     void takesUpAfterARefusal();
-    void sameFromMemory_data() { rewrites_data(); }
-    void sameFromMemory();
-    void neverTakesOneForAnother();
 };
 
 namespace
@@ -184,74 +181,6 @@ void tst_Dialect::takesUpAfterARefusal()
     dialect.translate(QStringLiteral("select 'a', 2 from t"));
     QCOMPARE(dialect.sql(), std::string("select ?, ? from t"));
     QCOMPARE(literalsOf(dialect), QStringLiteral("ta|2"));
-}
-
-// Statements seen before are recognised; what comes of them must not differ.
-void tst_Dialect::sameFromMemory()
-{
-    QFETCH(QString, statement);
-    Dialect dialect;
-    for (int i = 0; i < 3; ++i) {
-        dialect.translate(statement);
-        QTEST(QString::fromStdString(dialect.sql()), "sql");
-        QTEST(literalsOf(dialect), "literals");
-    }
-}
-
-// Pairs that agree for long, both ways round: the second must come out as it does when it is alone.
-void tst_Dialect::neverTakesOneForAnother()
-{
-    const char *alike[] = {
-        "select a from t where b='x' and c=1",
-        "select a from t where b='x' and c='1'",
-        "select a from t where b='x'' and c=1'",
-        "select a from t where b=\"x\" and c=1",
-        "select a from t where b='x' and c=1.5",
-        "select a from t where b='x' and c=1.",
-        "select a from t where b='x' and c=-1",
-        "select a from t where b='x' and c=1 or 2=2",
-        "select a from t where b='x' and c=1 --",
-        "select a from t where b='x' and c=1;",
-        "select a from t where b='x' and c=1; drop table t",
-        "select a from t where b='x'y' and c=1",
-        "select a from t where b='x' and c=1x",
-        "select a from t where b='x' and c=1e5",
-        "select a from t where b='x' and c=1e",
-        "select a from t where b='x' and c1",
-        "select a from t where b='x' and c.5",
-        "select a from t where b='x' order by 1",
-        "select a from t where b='x' order by 12",
-        "insert into t values ('x',1)",
-        "insert into t values ('x',1),('y',2)",
-        "insert into t values ('x',1)) ",
-        "insert into t values ('x'',1)",
-        "insert into t values ('x','y',1)",
-        "select max(id+1) from t",
-        "select max(id+2) from t",
-    };
-    const auto outcome = [](Dialect &dialect, const char *statement) -> QString {
-        try {
-            dialect.translate(QString::fromLatin1(statement));
-            return QString::fromStdString(dialect.sql()) + u'\n' + literalsOf(dialect);
-        } catch (const Error &) {
-            return QStringLiteral("refused");
-        }
-    };
-    for (const char *first : alike) {
-        for (const char *second : alike) {
-            Dialect seasoned, fresh;
-            outcome(seasoned, first);
-            QCOMPARE(outcome(seasoned, second), outcome(fresh, second));
-        }
-    }
-    Dialect seasoned; // all of them, and more than are kept
-    for (int round = 0; round < 2; ++round) {
-        for (const char *statement : alike) {
-            Dialect fresh;
-            QCOMPARE(outcome(seasoned, statement), outcome(fresh, statement));
-            outcome(seasoned, qPrintable(QStringLiteral("select x%1").arg(round)));
-        }
-    }
 }
 
 QTEST_APPLESS_MAIN(tst_Dialect)

@@ -70,6 +70,13 @@ void tst_StatementShapes::answersAsIfNew_data()
     row("the same ordinals", "select a from T where b=1 order by 1",
         "select a from T where b=2 order by 1");
     row("a text behind a number", "select 1", "select 1'x'");
+    row("a number that a word swallows", "select a.5", "select a5");
+    row("another sum", "select max(id+2) from T", "select max(id+1) from T");
+    row("a sign before it", "select a from T where b=1", "select a from T where b=-1");
+    row("ordinals that begin alike", "select a from T where b='x' order by 1",
+        "select a from T where b='x' order by 12");
+    row("a parenthesis more", insert, "insert into T(a,b) values (1,'x'))");
+    row("a value more", insert, "insert into T(a,b) values (1,'x','y')");
     row("nothing in it", "select ''", "select ''''");
     row("a shape", "SHAPE { select a from T where b=1 } as X compute X by a",
         "SHAPE { select a from T where b=2 } as X compute X by a");
