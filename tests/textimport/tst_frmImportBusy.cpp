@@ -84,18 +84,18 @@ void tst_frmImportBusy::refusals_data()
     };
     row("a fault in the data", languageEnglish, 'C', "x\n*b**\n",
         texts("error [File error] Error at line 2: Found empty line, whereas artist is obligatory!",
-              "error [] Error at line 2: Invalid file format!"));
+              "error [Songcase] Error at line 2: Invalid file format!"));
     row("a fault in the data, Dutch", languageDutch, 'A', "x\n\n",
         texts(
             "error [Bestandsfout] Fout op regel 2: Er werd een getal verwacht maar niet gevonden!",
-            "error [] Fout op regel 2: Onjuist bestandsformaat"));
+            "error [Songcase] Fout op regel 2: Onjuist bestandsformaat"));
     row("a star in an album title", languageEnglish, 'D', "p\n*x\n",
         texts("error [File error] Error at line 2: Hoofdtitel mag het teken * niet bevatten!",
-              "error [] Error at line 2: Invalid file format!"));
+              "error [Songcase] Error at line 2: Invalid file format!"));
     row("a missing star", languageEnglish, 'C', "x\na*b\n",
-        texts("error [] Error at line 2: Invalid file format!"));
+        texts("error [Songcase] Error at line 2: Invalid file format!"));
     row("no track", languageEnglish, 'C', "x\ny\n",
-        texts("error [] Error at line 2: Invalid file format!"));
+        texts("error [Songcase] Error at line 2: Invalid file format!"));
 }
 
 void tst_frmImportBusy::refusals()
@@ -105,8 +105,6 @@ void tst_frmImportBusy::refusals()
     QFETCH(QByteArray, content);
     QFETCH(QStringList, boxes);
     gLanguage = language;
-    const QString title = QGuiApplication::applicationDisplayName();
-    boxes.replaceInStrings(QStringLiteral("[]"), QStringLiteral("[%1]").arg(title));
     for (const QString &box : boxes)
         mDesktop->expectBox(box);
     read(format, content);
