@@ -222,7 +222,7 @@ void Connection::Open(const QString &, const QString &, const QString &connectio
         sqlite3_db_config(mEngine->db, SQLITE_DBCONFIG_DQS_DML, 0, nullptr);
         check(registerFunctions(mEngine->db));
         check(mEngine->exec("PRAGMA synchronous=FULL; PRAGMA temp_store=MEMORY; "
-                            "PRAGMA cache_size=-16000; PRAGMA cell_size_check=ON;"));
+                            "PRAGMA cache_size=-64000; PRAGMA cell_size_check=ON;"));
     } catch (const Error &) {
         mEngine.reset();
         throw;

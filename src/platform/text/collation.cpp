@@ -114,6 +114,8 @@ inline unsigned Collation::latinAt(std::string_view s, std::size_t &at)
 
 int Collation::compare(std::string_view a, std::string_view b) const
 {
+    if (a == b)
+        return 0;
     const std::size_t both = std::min(a.size(), b.size());
     std::size_t i = 0;
     while (i < both && a[i] == b[i] && !(a[i] & 0x80))

@@ -109,8 +109,10 @@ template <typename Fold>
 std::size_t findPiece(std::string_view text, std::size_t at, std::string_view piece, Fold fold)
 {
     const char first = piece.front();
+    const char capital = char(first >= 'a' && first <= 'z' ? first - 32 : first);
     for (; at < text.size(); ++at) {
-        if (first == anyOne ? (text[at] & 0xC0) == 0x80 : fold(text[at]) != first)
+        const char c = text[at];
+        if (first == anyOne ? (c & 0xC0) == 0x80 : c != first && c != capital)
             continue;
         if (const auto end = pieceEnd(text, at, piece, fold); end != npos)
             return end;
@@ -136,6 +138,12 @@ bool endsWithPiece(std::string_view text, std::size_t from, std::string_view pie
     return pieceEnd(text, at, piece, fold) == text.size();
 }
 
+// The characters outside of ASCII that are folded into it: the long s and the Kelvin sign.
+bool holdsHiddenAscii(std::string_view text)
+{
+    return text.find("\xC5\xBF") != npos || text.find("\xE2\x84\xAA") != npos;
+}
+
 } // namespace
 
 LikePattern::LikePattern(std::string_view pattern)
@@ -155,6 +163,9 @@ LikePattern::LikePattern(std::string_view pattern)
     }
     if (!piece.empty())
         mPieces.push_back(piece);
+    mAscii = isAscii(folded);
+    mPlain = mAscii && folded.find('_') == std::string::npos;
+    mMayHide = folded.find_first_of("sk") != std::string::npos;
 }
 
 template <typename Fold> bool LikePattern::matchesAll(std::string_view text, Fold fold) const
@@ -177,10 +188,20 @@ template <typename Fold> bool LikePattern::matchesAll(std::string_view text, Fol
     return mOpenEnd || endsWithPiece(text, at, mPieces.back(), fold);
 }
 
+// Letters of ASCII can be looked for in the bytes of any text as they stand. Only for others, and
+// for
+// "_", which has to know where characters begin, is the text folded first.
 bool LikePattern::matches(std::string_view text) const
 {
-    if (isAscii(text))
-        return matchesAll(text, [](char c) { return asciiFold[static_cast<unsigned char>(c)]; });
+    const auto ascii = [](char c) { return asciiFold[static_cast<unsigned char>(c)]; };
+    if (mPlain) {
+        if (matchesAll(text, ascii))
+            return true;
+        if (!mMayHide || !holdsHiddenAscii(text))
+            return false;
+    } else if (isAscii(text)) {
+        return mAscii && matchesAll(text, ascii);
+    }
     thread_local std::string folded;
     foldInto(folded, text);
     return matchesAll(std::string_view(folded), [](char c) { return c; });

@@ -22,6 +22,9 @@ private:
 
     std::vector<std::string> mPieces; // between the "%" signs, folded; "_" is the byte anyOne
     bool mOpenStart = false, mOpenEnd = false;
+    bool mAscii = true;    // no character of the pattern is outside of ASCII
+    bool mPlain = true;    // and none is "_"
+    bool mMayHide = false; // an s or k, which others fold into
 };
 
 } // namespace text
