@@ -2,8 +2,8 @@
 #include "catalogue/cataloguefile.h"
 #include "catalogue/cleanorphans.h"
 #include "measure.h"
+#include "opencatalogue.h"
 #include "platform/ado/recordset.h"
-#include "shell/startup.h"
 #include "workcommands.h"
 
 namespace
@@ -12,7 +12,7 @@ namespace
 void open(const QString &file)
 {
     measured("open", [&] {
-        startup::openCatalogue(file, false);
+        openForWork(file);
         return std::string();
     });
 }

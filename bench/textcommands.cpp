@@ -1,9 +1,9 @@
 #include "catalogue/cataloguefile.h"
 #include "chooseimport.h"
 #include "measure.h"
+#include "opencatalogue.h"
 #include "platform/ado/recordset.h"
 #include "shell/services/globals.h"
-#include "shell/startup.h"
 #include "textimport/catalogueload.h"
 #include "textimport/filereading.h"
 #include "workcommands.h"
@@ -35,14 +35,14 @@ void readText(const QStringList &arguments)
     const QTemporaryDir folder;
     const QString catalogue = folder.filePath(QStringLiteral("empty.orv"));
     cataloguefile::create(catalogue);
-    startup::openCatalogue(catalogue, false);
+    openForWork(catalogue);
     read(arguments[0], arguments[1]);
     gConnection.reset();
 }
 
 void loadText(const QStringList &arguments)
 {
-    startup::openCatalogue(arguments[0], false);
+    openForWork(arguments[0]);
     read(arguments[1], arguments[2]);
     measured("load", [] {
         CatalogueLoad load;

@@ -1,0 +1,14 @@
+#include "opencatalogue.h"
+
+#include "catalogue/cataloguefile.h"
+#include "catalogue/connect.h"
+#include "platform/ado/connection.h"
+#include "shell/services/globals.h"
+
+void openForWork(const QString &file)
+{
+    cataloguefile::inspect(file);
+    gConnection = std::make_unique<ADODB::Connection>();
+    configureConnection(*gConnection, file);
+    gConnection->Open();
+}
