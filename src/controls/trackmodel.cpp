@@ -321,6 +321,6 @@ QVariant TrackModel::headerData(int section, Qt::Orientation orientation, int ro
 
 Qt::ItemFlags TrackModel::flags(const QModelIndex &index) const
 {
-    return QAbstractTableModel::flags(index) |
-           (index.column() == 0 ? Qt::NoItemFlags : Qt::ItemIsEditable);
+    const Qt::ItemFlags flags = QAbstractTableModel::flags(index);
+    return index.column() > 0 ? flags | Qt::ItemIsEditable : flags;
 }
