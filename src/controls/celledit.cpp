@@ -5,7 +5,8 @@
 #include <QAction>
 #include <QKeyEvent>
 #include <QListWidget>
-#include <QStyle>
+#include <QPainter>
+#include <QStyleOption>
 #include <algorithm>
 
 namespace
@@ -67,10 +68,26 @@ CellEdit::~CellEdit()
 void CellEdit::setList(const QStringList &list, const QString &arrowName)
 {
     mList = list;
-    QAction *arrow = addAction(style()->standardIcon(QStyle::SP_ArrowDown), TrailingPosition);
+    QAction *arrow = addAction(arrowIcon(), TrailingPosition);
     arrow->setText(arrowName);
     arrow->setToolTip(arrowName);
     connect(arrow, &QAction::triggered, this, [this] { showSuggestions(mList); });
+}
+
+// The style's own arrow, in the colours of the palette.
+QIcon CellEdit::arrowIcon() const
+{
+    const int side = fontMetrics().height();
+    QPixmap picture(QSize(side, side) * devicePixelRatio());
+    picture.setDevicePixelRatio(devicePixelRatio());
+    picture.fill(Qt::transparent);
+    QPainter painter(&picture);
+    QStyleOption option;
+    option.initFrom(this);
+    option.state |= QStyle::State_Enabled;
+    option.rect = QRect(side / 4, side / 4, side / 2, side / 2);
+    style()->drawPrimitive(QStyle::PE_IndicatorArrowDown, &option, &painter, this);
+    return picture;
 }
 
 // All keys come through here first, before Tab is taken for a change of the focus.

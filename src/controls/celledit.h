@@ -36,6 +36,7 @@ protected:
     void hideEvent(QHideEvent *event) override;
 
 private:
+    QIcon arrowIcon() const;
     bool takeKey(QKeyEvent *event);
     bool takeListKey(QKeyEvent *event);
     void suggest();

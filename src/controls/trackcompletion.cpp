@@ -28,8 +28,8 @@ QString selectArtists(const QString &start)
 
 QString selectTitles(const QString &artists, const QString &start)
 {
-    return Literal("select distinct trk.Titel from Tracks trk where trk.Artiest_ID in (") +
-           artists + Literal(") and ") + beginsWith(Literal("trk.Titel"), start) +
+    return Literal("select distinct trk.Titel from Tracks trk where trk.Artiest_ID = (") + artists +
+           Literal(") and ") + beginsWith(Literal("trk.Titel"), start) +
            Literal(" order by trk.Titel");
 }
 

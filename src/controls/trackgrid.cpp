@@ -2,7 +2,9 @@
 
 #include "catalogue/genres.h"
 #include "catalogue/hityear.h"
+#include "controls/columnshares.h"
 #include "controls/trackcompletion.h"
+#include "controls/trackmessages.h"
 #include "controls/trackmodel.h"
 #include "platform/ado/connection.h"
 #include "platform/desktop/desktop.h"
@@ -13,13 +15,13 @@
 #include <QHeaderView>
 #include <QKeyEvent>
 #include <QRegularExpression>
-#include <QScopedValueRollback>
 #include <algorithm>
 
 namespace
 {
 
 constexpr int numberColumn = 0;
+constexpr int widestNumber = 5; // digits of numbers and years
 
 bool isEnter(int key)
 {
@@ -52,16 +54,17 @@ TrackGrid::TrackGrid(Columns columns, QWidget *parent)
       mModel(new TrackModel(mWithArtist, this)),
       mDelegate(
           new TrackDelegate([this](const QModelIndex &index) { return describe(index); }, this)),
-      mShares(mWithArtist ? QList<int>{0, 3, 4, 2, 0} : QList<int>{0, 5, 2, 0})
+      mShares(nullptr)
 {
     setModel(mModel);
     setItemDelegate(mDelegate);
+    mShares = new ColumnShares(
+        this, mWithArtist ? QList<int>{0, 3, 4, 2, 0} : QList<int>{0, 5, 2, 0}, widestNumber);
     setUpView();
     setLanguage(languageEnglish);
     go(0, 1);
     connect(mDelegate, &TrackDelegate::cancelled, this, &TrackGrid::cancelEdit);
     connect(mDelegate, &TrackDelegate::gridKey, this, &TrackGrid::actOnEditKey);
-    connect(horizontalHeader(), &QHeaderView::sectionResized, this, &TrackGrid::keepRatio);
     connect(qApp, &QApplication::focusChanged, this,
             [this](QWidget *, QWidget *now) { followFocus(now); });
 }
@@ -78,9 +81,7 @@ void TrackGrid::setUpView()
     horizontalHeader()->setHighlightSections(false);
     horizontalHeader()->setSectionsClickable(false);
     horizontalHeader()->setDefaultAlignment(Qt::AlignLeft | Qt::AlignVCenter);
-    horizontalHeader()->setSectionResizeMode(numberColumn, QHeaderView::Fixed);
-    horizontalHeader()->setSectionResizeMode(lastColumn(), QHeaderView::Fixed);
-    shareWidth();
+    layOut();
 }
 
 void TrackGrid::setLanguage(int language)
@@ -93,7 +94,7 @@ void TrackGrid::setLanguage(int language)
     }
     mModel->setHeads(heads);
     setAccessibleName(message("xTracks"));
-    shareWidth();
+    layOut();
 }
 
 QString TrackGrid::message(const char *key) const
@@ -101,55 +102,23 @@ QString TrackGrid::message(const char *key) const
     return GetMessage(QLatin1String(key), mLanguage);
 }
 
-// Number and year are as wide as they have to be; the texts share the rest.
-void TrackGrid::shareWidth()
+void TrackGrid::layOut()
 {
-    const QScopedValueRollback sharing(mSharing, true);
     verticalHeader()->setDefaultSectionSize(fontMetrics().height() * 3 / 2);
-    const int margin = 2 * fontMetrics().averageCharWidth();
-    int left = viewport()->width();
-    int shares = 0;
-    for (int column = 0; column < mShares.size(); ++column) {
-        shares += mShares[column];
-        if (mShares[column])
-            continue;
-        const int text = fontMetrics().horizontalAdvance(QStringLiteral("00000"));
-        const int wide = std::max(text + margin, horizontalHeader()->sectionSizeHint(column));
-        setColumnWidth(column, wide);
-        left -= wide;
-    }
-    const int least = fontMetrics().averageCharWidth() * 8;
-    for (int column = 0; column < mShares.size(); ++column) {
-        if (!mShares[column])
-            continue;
-        const int wide = left * mShares[column] / shares;
-        setColumnWidth(column, std::max(wide, least));
-        left -= wide;
-        shares -= mShares[column];
-    }
-}
-
-void TrackGrid::keepRatio()
-{
-    if (mSharing)
-        return;
-    for (int column = 0; column < mShares.size(); ++column) {
-        if (mShares[column])
-            mShares[column] = std::max(columnWidth(column), 1);
-    }
+    mShares->layOut();
 }
 
 void TrackGrid::resizeEvent(QResizeEvent *event)
 {
     QTableView::resizeEvent(event);
-    shareWidth();
+    layOut();
 }
 
 void TrackGrid::changeEvent(QEvent *event)
 {
     QTableView::changeEvent(event);
     if (event->type() == QEvent::FontChange || event->type() == QEvent::StyleChange)
-        shareWidth();
+        layOut();
 }
 
 // The focus is the grid's as long as no other control of the window has it: a message box or
@@ -507,73 +476,30 @@ void TrackGrid::SaveDisc()
     CommitEdit();
     settleSave();
     const QList<TrackToSave> tracks = mModel->toSave();
-    if (!isWritable(tracks))
+    const TrackMessages messages(mWithArtist, mLanguage);
+    if (const auto refusal = messages.refusal(tracks)) {
+        setFocus();
+        go(mModel->rowOfTrack(refusal->track), mModel->columnOf(refusal->field));
+        refuse(refusal->text);
         return;
+    }
     const TrackStore::Outcome outcome = store().save(tracks, mModel->savedLinks());
     if (outcome.refused) {
-        mHasError = true;
-        emit UnlockScreen();
-        errorBox(message("xTitleGone"));
+        refuse(message("xTitleGone"));
         return;
     }
     mModel->markSaved(outcome.linkIds);
     mSaveFate = mConnection->fate();
-    tellKept(tracks, outcome);
-}
-
-bool TrackGrid::isWritable(const QList<TrackToSave> &tracks)
-{
-    for (qsizetype i = 0; i < tracks.size() && !mHasError; ++i) {
-        const TrackToSave &track = tracks[i];
-        const bool noArtist = mWithArtist && track.texts[ArtistField].isEmpty();
-        const bool noTitle = track.texts[TitleField].isEmpty();
-        const QString year = track.texts[YearField];
-        if (!track.changed)
-            continue; // as the catalogue has it
-        if (noArtist)
-            refuse(i, ArtistField, message(noTitle ? "xNoTrackArtistAndTitle" : "xNoTrackArtist"));
-        else if (noTitle)
-            refuse(i, TitleField, message("xNoTrackTitle"));
-        else if (!year.isEmpty() && year != track.was[YearField] && !isHitYear(year))
-            refuse(i, YearField, message("MsgInvalidYear"));
+    if (const QString kept = messages.kept(tracks, outcome); !kept.isEmpty()) {
+        emit UnlockScreen();
+        informationBox(kept);
     }
-    return !mHasError;
 }
 
-void TrackGrid::refuse(qsizetype track, TrackField field, const QString &why)
+// The screen behind the box shows the row.
+void TrackGrid::refuse(const QString &why)
 {
     mHasError = true;
     emit UnlockScreen();
-    setFocus();
-    go(mModel->rowOfTrack(track), mModel->columnOf(field));
-    errorBox(message("Track") + u' ' + QString::number(track + 1) + QLatin1String(": ") + why);
-}
-
-void TrackGrid::tellKept(const QList<TrackToSave> &tracks, const TrackStore::Outcome &outcome)
-{
-    QStringList parts;
-    if (!outcome.keptValues.isEmpty())
-        parts.append(message("xKeptValues") + linesOf(tracks, outcome.keptValues));
-    if (!outcome.keptArtists.isEmpty())
-        parts.append(message("xKeptArtists") + linesOf(tracks, outcome.keptArtists));
-    if (parts.isEmpty())
-        return;
-    emit UnlockScreen();
-    informationBox(parts.join(QLatin1String("\r\r")));
-}
-
-// A box holds only so many lines.
-QString TrackGrid::linesOf(const QList<TrackToSave> &tracks, const QList<qsizetype> &which) const
-{
-    constexpr qsizetype listed = 20;
-    QString lines;
-    for (const qsizetype i : which.first(std::min(which.size(), listed))) {
-        lines += u'\r' + QString::number(i + 1) + QLatin1String(". ");
-        if (mWithArtist)
-            lines += tracks[i].texts[ArtistField] + QLatin1String(" - ");
-        lines += tracks[i].texts[TitleField];
-    }
-    if (which.size() > listed)
-        lines += QLatin1String("\r... (+ ") + QString::number(which.size() - listed) + u')';
-    return lines;
+    errorBox(why);
 }

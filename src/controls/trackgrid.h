@@ -12,6 +12,7 @@ class Connection;
 class TransactionFate;
 } // namespace ADODB
 
+class ColumnShares;
 class TrackModel;
 
 /// The tracks of one disc as a spreadsheet: typing replaces a cell, Enter or a double click edits
@@ -85,8 +86,7 @@ protected:
 
 private:
     void setUpView();
-    void shareWidth();
-    void keepRatio();
+    void layOut();
     void followFocus(QWidget *now);
     QString message(const char *key) const;
     TrackStore store() const;
@@ -112,14 +112,12 @@ private:
 
     // Saving.
     void settleSave() const;
-    bool isWritable(const QList<TrackToSave> &tracks);
-    void refuse(qsizetype track, TrackField field, const QString &why);
-    void tellKept(const QList<TrackToSave> &tracks, const TrackStore::Outcome &outcome);
-    QString linesOf(const QList<TrackToSave> &tracks, const QList<qsizetype> &which) const;
+    void refuse(const QString &why);
 
     const bool mWithArtist;
     TrackModel *mModel;
     TrackDelegate *mDelegate;
+    ColumnShares *mShares;
     ADODB::Connection *mConnection = nullptr;
     mutable std::shared_ptr<const ADODB::TransactionFate> mSaveFate; // of the last SaveDisc
     qint64 mCdId = 0;
@@ -127,6 +125,4 @@ private:
     int mLanguage = 0;
     bool mHasError = false;
     bool mFocused = false;
-    bool mSharing = false; // widths are being set by the grid itself
-    QList<int> mShares;    // of the width that is left, by column; 0: a width of its own
 };
