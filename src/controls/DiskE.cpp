@@ -1,0 +1,3 @@
+#include "controls/DiskE.h"
+
+DiskE::DiskE(QWidget *parent) : TrackGrid(Columns::WithoutArtist, parent) {}
