@@ -114,6 +114,7 @@ struct Connection::Engine {
     // The transaction: who has it, and whether its routine has ended without closing it.
     std::vector<Transaction *> routines;
     bool transactionOpen = false;
+    std::shared_ptr<TransactionFate> fate; // of the outermost share
 
     ~Engine()
     {
@@ -245,7 +246,21 @@ Recordset Connection::Execute(const QString &statement, int)
     return answer;
 }
 
-std::shared_ptr<const Rows> Connection::run(const QString &statement)
+Recordset Connection::firstRows(const QString &statement, int atMost)
+{
+    Recordset answer;
+    answer.adopt(run(statement, atMost));
+    return answer;
+}
+
+std::shared_ptr<const TransactionFate> Connection::fate() const
+{
+    if (!mEngine || !mEngine->transactionOpen)
+        return nullptr;
+    return mEngine->routines.empty() ? mEngine->fate : mEngine->routines.back()->mFate;
+}
+
+std::shared_ptr<const Rows> Connection::run(const QString &statement, int atMost)
 {
     requireOpen();
     try {
@@ -265,8 +280,11 @@ std::shared_ptr<const Rows> Connection::run(const QString &statement)
     std::shared_ptr<Rows> rows; // none for a change
     if (!prepared.fields->empty())
         rows = std::make_shared<Rows>(prepared.fields);
-    for (; code == SQLITE_ROW; code = sqlite3_step(s))
+    for (; code == SQLITE_ROW; code = sqlite3_step(s)) {
         readRow(s, *rows);
+        if (rows->rowCount() == atMost)
+            break;
+    }
     check(code);
     return rows;
 }
@@ -313,6 +331,11 @@ void Connection::begin(Transaction *owner)
     owner->mJoined = mEngine->transactionOpen;
     check(mEngine->exec(owner->mJoined ? "SAVEPOINT joined" : "BEGIN IMMEDIATE"));
     mEngine->transactionOpen = true;
+    owner->mFate = std::make_shared<TransactionFate>();
+    if (owner->mJoined)
+        owner->mFate->mOuter = fate();
+    else
+        mEngine->fate = owner->mFate;
     mEngine->routines.push_back(owner);
     owner->mRunning = true;
 }
@@ -329,6 +352,8 @@ void Connection::finish(Transaction *owner, bool commit)
         else
             check(mEngine->exec(commit ? "COMMIT" : "ROLLBACK"));
     }
+    if (!commit)
+        owner->mFate->mUndone = true;
     std::erase(mEngine->routines, owner);
     owner->mRunning = false;
     mEngine->transactionOpen = owner->mJoined; // the first routine's share is still to be closed
@@ -350,6 +375,8 @@ void Connection::RollbackTrans()
         return;
     if (!sqlite3_get_autocommit(mEngine->db))
         check(mEngine->exec("ROLLBACK"));
+    if (mEngine->transactionOpen)
+        mEngine->fate->mUndone = true;
     mEngine->transactionOpen = false;
 }
 

@@ -21,6 +21,18 @@ enum ObjectStateEnum { adStateClosed = 0, adStateOpen = 1 };
 inline constexpr int adConnectUnspecified = -1;
 inline constexpr int adOptionUnspecified = -1;
 
+/// Tells later on whether the changes of a transaction were taken back, by whatever routine.
+class TransactionFate
+{
+public:
+    bool undone() const { return mUndone || (mOuter && mOuter->undone()); }
+
+private:
+    friend class Connection;
+    bool mUndone = false;
+    std::shared_ptr<const TransactionFate> mOuter; // of the transaction that it joined
+};
+
 /// The one connection to a catalogue: an SQLite file behind the attributes and operations that the
 /// screens use. All failures are thrown as Error; those of the engine stand in Errors as well.
 ///
@@ -53,6 +65,12 @@ public:
     /// Runs a statement and gives its rows, all of them read; of a change a closed recordset.
     Recordset Execute(const QString &statement, int options = adOptionUnspecified);
 
+    /// The same for a query of which only the first rows are wanted; no more than those are read.
+    Recordset firstRows(const QString &statement, int atMost);
+
+    /// What becomes of the changes made now: null if no transaction is open.
+    std::shared_ptr<const TransactionFate> fate() const;
+
     /// For the handler of a failed routine: closes the transaction that it has left open. With none
     /// open nothing happens, and a transaction of a routine that still runs is not touched.
     void RollbackTrans();
@@ -69,7 +87,8 @@ private:
     friend class Transaction;
     struct Engine;
 
-    std::shared_ptr<const Rows> run(const QString &statement);
+    static constexpr int allRows = -1;
+    std::shared_ptr<const Rows> run(const QString &statement, int atMost = allRows);
     [[noreturn]] void fail(int code);
     void check(int code);
     void requireOpen() const;
@@ -102,6 +121,7 @@ private:
     Connection &mConnection;
     bool mRunning = false;
     bool mJoined = false;
+    std::shared_ptr<TransactionFate> mFate;
 };
 
 } // namespace ADODB

@@ -32,6 +32,8 @@ private slots:
     void abandonedTransaction();
     void handlerInsideARunningRoutine();
     void failedCommit();
+    void fateOfATransaction();
+    void firstRowsReadsNoMore();
     void engineRollsBackByItself_data();
     void engineRollsBackByItself();
     void closesWithOpenTransaction();
@@ -319,6 +321,54 @@ void tst_Connection::failedCommit()
     QCOMPARE(reader.run("commit"), SQLITE_OK);
     addArtist(2);
     QCOMPARE(catalogue.count(QStringLiteral("select max(id) from artiesten")), 2);
+}
+
+void tst_Connection::fateOfATransaction()
+{
+    TestCatalogue catalogue;
+    QVERIFY(!gConnection->fate());
+    std::shared_ptr<const TransactionFate> kept, joined, joinedLost, outer, left;
+    {
+        Transaction t(*gConnection);
+        outer = gConnection->fate();
+        {
+            Transaction inner(*gConnection);
+            joinedLost = gConnection->fate();
+            inner.RollbackTrans();
+        }
+        QCOMPARE(gConnection->fate(), outer);
+        Transaction inner(*gConnection);
+        joined = gConnection->fate();
+        inner.CommitTrans();
+        QVERIFY(joinedLost->undone() && !joined->undone() && !outer->undone());
+        t.RollbackTrans();
+        QVERIFY(joined->undone() && outer->undone());
+    }
+    {
+        Transaction t(*gConnection);
+        kept = gConnection->fate();
+        t.CommitTrans();
+    }
+    {
+        Transaction t(*gConnection);
+        left = gConnection->fate();
+    }
+    QVERIFY(!left->undone());
+    gConnection->RollbackTrans();
+    QVERIFY(left->undone() && !kept->undone());
+}
+
+// A row further on would be an error: it must not be reached.
+void tst_Connection::firstRowsReadsNoMore()
+{
+    TestCatalogue catalogue;
+    for (const int id : {1, 2, 3})
+        addArtist(id);
+    const QString query = QStringLiteral(
+        "select iif(ID < 3, ID, abs(-9223372036854775807 - 1)) as n from Artiesten order by ID");
+    QCOMPARE(gConnection->firstRows(query, 2).RecordCount(), 2);
+    QVERIFY(numberOf([&] { gConnection->firstRows(query, 5); }) != 0);
+    QCOMPARE(gConnection->firstRows(QStringLiteral("select ID from Tracks"), 2).RecordCount(), 0);
 }
 
 void tst_Connection::engineRollsBackByItself_data()
