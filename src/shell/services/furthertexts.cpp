@@ -22,6 +22,15 @@ const Message furtherTexts[] = {
     {"xTracksRead", "Tracks to be imported", "Te importeren tracks"},
     {"xToolbar", "Toolbar", "Werkbalk"},
     {"xPrint", "Print list", "Lijst afdrukken"},
+    {"xTracks", "Tracks of the disc", "Tracks van de disc"},
+    {"xSuggestions", "Suggestions", "Suggesties"},
+    {"xShowList", "Show the list", "Lijst tonen"},
+    {"xNoTrackArtist", "please fill in the artist!", "vul de artiest in!"},
+    {"xNoTrackTitle", "please fill in the title!", "vul de titel in!"},
+    {"xNoTrackArtistAndTitle", "please fill in artist and title!", "vul artiest en titel in!"},
+    {"xTitleGone", "The record of these tracks is no longer in the catalogue, or has no artist.", "Het record van deze tracks staat niet meer in de database, of heeft geen artiest."},
+    {"xKeptValues", "These tracks are held by other discs too, or more than once by this one. The catalogue keeps their genre, year and spelling:", "Deze tracks staan ook op andere discs, of meer dan eens op deze. De database houdt hun genre, jaar en schrijfwijze:"},
+    {"xKeptArtists", "Artists are never renamed. The catalogue keeps the spelling of the artist of these tracks:", "Artiesten worden nooit hernoemd. De database houdt de schrijfwijze van de artiest van deze tracks:"},
 };
 // clang-format on
 

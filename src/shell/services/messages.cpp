@@ -28,9 +28,14 @@ const Table &table()
 
 QString GetMessage(QLatin1String key)
 {
-    if (gLanguage != languageEnglish && gLanguage != languageDutch)
+    return GetMessage(key, gLanguage);
+}
+
+QString GetMessage(QLatin1String key, int language)
+{
+    if (language != languageEnglish && language != languageDutch)
         return {};
-    const bool dutch = gLanguage == languageDutch;
+    const bool dutch = language == languageDutch;
     const auto it = table().find(std::string_view(key.data(), std::size_t(key.size())));
     if (it == table().end())
         return dutch ? QStringLiteral("Onbekend") : QStringLiteral("Unknown");
