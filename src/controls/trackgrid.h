@@ -1,8 +1,9 @@
 #pragma once
 
-#include <QPointer>
+#include "controls/trackdelegate.h"
+#include "controls/trackstore.h"
+
 #include <QTableView>
-#include <functional>
 #include <memory>
 
 namespace ADODB
@@ -11,9 +12,6 @@ class Connection;
 class TransactionFate;
 } // namespace ADODB
 
-class CellEdit;
-class TrackCompletion;
-class TrackDelegate;
 class TrackModel;
 
 /// The tracks of one disc as a spreadsheet: typing replaces a cell, Enter or a double click edits
@@ -29,8 +27,6 @@ class TrackGrid : public QTableView
     Q_OBJECT
 
 public:
-    ~TrackGrid() override;
-
     int Language() const { return mLanguage; }
     void setLanguage(int language); // of heads, genres and messages
 
@@ -81,26 +77,56 @@ protected:
     enum class Columns { WithArtist, WithoutArtist };
     TrackGrid(Columns columns, QWidget *parent);
 
-    void keyPressEvent(QKeyEvent *event) override;
     bool event(QEvent *event) override;
-    bool focusNextPrevChild(bool next) override;
+    void keyPressEvent(QKeyEvent *event) override;
     void mouseDoubleClickEvent(QMouseEvent *event) override;
     void resizeEvent(QResizeEvent *event) override;
     void changeEvent(QEvent *event) override;
-    void hideEvent(QHideEvent *event) override;
 
 private:
-    CellEdit *cellEdit() const;
+    void setUpView();
+    void shareWidth();
+    void keepRatio();
     void followFocus(QWidget *now);
+    QString message(const char *key) const;
+    TrackStore store() const;
 
-    const std::unique_ptr<TrackCompletion> mCompletion;
+    // Editing and moving.
+    TrackDelegate::Cell describe(const QModelIndex &index) const;
+    QStringList suggestionsFor(const QModelIndex &index, const QString &start) const;
+    CellEdit *cellEdit() const { return mDelegate->edit(); }
+    void editCurrent();
+    void cancelEdit();
+    bool leaveEdit();
+    void refuseYear(const QModelIndex &index, const QString &text);
+    void actOnEditKey(QKeyEvent *event);
+    bool actOnKey(QKeyEvent *event);
+    bool actOnClipboardKey(QKeyEvent *event);
+    bool actOnPlainKey(int key);
+    void go(int row, int column); // the nearest cell there is
+    void walk(int step);
+    int lastColumn() const;
+    void copy() const;
+    void paste();
+    void clearSelected();
+
+    // Saving.
+    void settleSave() const;
+    bool isWritable(const QList<TrackToSave> &tracks);
+    void refuse(qsizetype track, TrackField field, const QString &why);
+    void tellKept(const QList<TrackToSave> &tracks, const TrackStore::Outcome &outcome);
+    QString linesOf(const QList<TrackToSave> &tracks, const QList<qsizetype> &which) const;
+
+    const bool mWithArtist;
     TrackModel *mModel;
     TrackDelegate *mDelegate;
     ADODB::Connection *mConnection = nullptr;
-    std::shared_ptr<const ADODB::TransactionFate> mSaveFate;
+    mutable std::shared_ptr<const ADODB::TransactionFate> mSaveFate; // of the last SaveDisc
     qint64 mCdId = 0;
     int mDiscNo = 1;
     int mLanguage = 0;
     bool mHasError = false;
     bool mFocused = false;
+    bool mSharing = false; // widths are being set by the grid itself
+    QList<int> mShares;    // of the width that is left, by column; 0: a width of its own
 };
