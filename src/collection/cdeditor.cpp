@@ -58,6 +58,7 @@ void CdEditor::setUp(const Controls &controls, const Kind &kind)
     mKind = kind;
     mFields = new HeaderFields(controls.fields, this);
     setCancelButton(controls.cancel);
+    (controls.fields.artist ? controls.fields.artist : controls.fields.title)->setFocus();
     controls.discs->setAccessibleName(GetMessage("xDiscs"));
     connect(controls.discs, &QTabBar::currentChanged, this, &CdEditor::DiscsTab_Click);
     connect(controls.cancel, &QPushButton::clicked, this, &CdEditor::cmdCancel_Click);
