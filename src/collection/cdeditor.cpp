@@ -189,15 +189,17 @@ void CdEditor::loadNew()
     mControls.disk->LoadDisc();
 }
 
+// The grid first: it then shows disc 1 of this record, and so does the tab, also when the record
+// turns out to be gone.
 void CdEditor::loadRecord()
 {
     setTabs(1);
+    ShowDisc(1);
     ADODB::Recordset record;
     record.Open(selectRecord(CdId), *gConnection);
     mSaved = headerOf(record);
     mFields->show(mSaved);
     setTabs(std::max(1, int(record.Fields(u"DiscNum").Value().toLong())));
-    ShowDisc(1);
 }
 
 Header CdEditor::headerOf(ADODB::Recordset &record) const

@@ -28,7 +28,7 @@ void keepOneLine(QLineEdit *field)
     static const QRegularExpression lineEnds(QStringLiteral("\\s*[\\r\\n\\x{2028}\\x{2029}]+\\s*"));
     QString clean = field->text();
     clean.replace(lineEnds, QStringLiteral(" "));
-    if (!clean.isEmpty() && clean.back().isHighSurrogate())
+    if (clean.size() == field->maxLength() && clean.back().isHighSurrogate())
         clean.chop(1);
     if (clean == field->text())
         return;

@@ -113,7 +113,7 @@ bool Form::Reload()
 {
     const QPointer<QWidget> focus = focusWidget();
     if (focus)
-        focus->clearFocus();
+        setFocus();
     const bool goes = QueryUnload();
     if (goes) {
         Form_Unload();
