@@ -3,8 +3,11 @@
 #include "catalogue/cleanorphans.h"
 #include "catalogue/errorboxes.h"
 #include "collection/browserlists.h"
+#include "collection/editors.h"
+#include "collection/recordnodes.h"
 #include "controls/DBListViewCTL.h"
 #include "platform/desktop/desktop.h"
+#include "platform/text/textrules.h"
 #include "shell/services/captions.h"
 #include "shell/services/frame.h"
 #include "shell/services/globals.h"
@@ -18,7 +21,18 @@ namespace
 
 constexpr int idColumn = 1;     // columns are counted from 1
 constexpr int firstSortKey = 1; // sort keys from 0: the first column that shows
-constexpr int keyDelete = 46;
+constexpr int keyEnter = 13, keyInsert = 45, keyDelete = 46;
+
+// Nodes of the tree from rows of an id and a text.
+std::vector<RecordTree::Node> nodesOf(const ADODB::Recordset &recordset, QChar keyLetter)
+{
+    const auto rows = recordset.rows();
+    std::vector<RecordTree::Node> nodes;
+    nodes.reserve(std::size_t(rows->rowCount()));
+    for (qsizetype row = 0; row < rows->rowCount(); ++row)
+        nodes.push_back({keyLetter + rows->text(row, 0), rows->text(row, 1)});
+    return nodes;
+}
 
 } // namespace
 
@@ -64,6 +78,10 @@ void frmCDList::connectControls()
     for (ListPage &page : mPages)
         connectList(page);
     connect(mUi->CDTab, &QTabWidget::currentChanged, this, &frmCDList::CDTab_Click);
+    connect(mUi->Platenbak, &RecordTree::Expand, this, &frmCDList::Platenbak_Expand);
+    connect(mUi->Platenbak, &RecordTree::NodeClick, this, &frmCDList::Platenbak_NodeClick);
+    connect(mUi->cmdInsert, &QPushButton::clicked, this, &frmCDList::cmdInsert_Click);
+    connect(mUi->cmdUpdate, &QPushButton::clicked, this, &frmCDList::cmdUpdate_Click);
     connect(mUi->cmdDelete, &QPushButton::clicked, this, &frmCDList::cmdDelete_Click);
     connect(mUi->cmdCancel, &QPushButton::clicked, this, &Form::Unload);
     connect(mUi->ColList, &DBListViewCTL::LostFocus, this, [this] { mColFocusDone = false; });
@@ -73,7 +91,8 @@ void frmCDList::connectList(ListPage &page)
 {
     connect(page.list, &DBListViewCTL::ItemClick, this, [this, &page] { rememberSelection(page); });
     connect(page.list, &DBListViewCTL::KeyUp, this, [this, &page] { rememberSelection(page); });
-    connect(page.list, &DBListViewCTL::KeyDown, this, [this](int key) { list_KeyDown(key); });
+    connect(page.list, &DBListViewCTL::KeyDown, this, &frmCDList::list_KeyDown);
+    connect(page.list, &DBListViewCTL::DblClick, this, &frmCDList::cmdUpdate_Click);
     connect(page.list, &DBListViewCTL::ColumnClick, this,
             [this, &page](int column) { list_ColumnClick(page, column); });
     connect(page.list, &DBListViewCTL::GotFocus, this, [this, &page] {
@@ -182,15 +201,16 @@ void frmCDList::CDTab_Click()
     focusList();
 }
 
-// Adding and editing wait for the editors, printing for the reports.
+// Adding and editing MP3 collections wait for their editor, printing for the reports.
 void frmCDList::showPage()
 {
     const ListPage *page = current();
     mUi->cmdInsert->setVisible(page);
     mUi->cmdUpdate->setVisible(page);
     mUi->cmdDelete->setVisible(page);
-    mUi->cmdInsert->setEnabled(false);
-    mUi->cmdUpdate->setEnabled(false);
+    const bool editable = page && page->page != MP3Collections;
+    mUi->cmdInsert->setEnabled(editable);
+    mUi->cmdUpdate->setEnabled(editable && page->count > 0);
     mUi->cmdDelete->setEnabled(page && page->count > 0);
     mUi->cmdStartReport->setEnabled(false);
     showCount();
@@ -244,10 +264,15 @@ void frmCDList::RestoreSelection(ListPage &page)
     item.EnsureVisible();
 }
 
-void frmCDList::list_KeyDown(int keyCode)
+// Ctrl+Insert copies, as everywhere.
+void frmCDList::list_KeyDown(int keyCode, int shift)
 {
     if (keyCode == keyDelete)
         cmdDelete_Click();
+    else if (keyCode == keyEnter)
+        cmdUpdate_Click();
+    else if (keyCode == keyInsert && shift == 0)
+        cmdInsert_Click();
 }
 
 // ColList has one column that shows: it is sorted on that one whichever was clicked.
@@ -255,6 +280,83 @@ void frmCDList::list_ColumnClick(ListPage &page, int column)
 {
     page.list->setSorted(true);
     page.list->setSortKey(page.page == Compilations ? firstSortKey : column - 1);
+}
+
+void frmCDList::FillArtistNode(RecordTree &TheTree, const QString &TheKey)
+{
+    const auto rows = TheKey == GetMessage("Overige") ? recordnodes::artistsWithDigit()
+                                                      : recordnodes::artists(TheKey);
+    TheTree.addNodes(TheKey, RecordTree::Artist, nodesOf(*rows, u'A'));
+}
+
+void frmCDList::FillTrackNode(RecordTree &TheTree, const QString &TheKey)
+{
+    const auto rows = recordnodes::tracks(TheKey.sliced(1));
+    TheTree.addNodes(TheKey, RecordTree::Track, nodesOf(*rows, u'T'));
+}
+
+void frmCDList::FillCDNode(RecordTree &TheTree, const QString &TheKey)
+{
+    const auto discs = recordnodes::discs(TheKey.sliced(1));
+    const auto rows = discs->rows();
+    auto nodes = nodesOf(*discs, u'C');
+    for (std::size_t i = 0; i < nodes.size(); ++i) {
+        nodes[i].text += QStringLiteral(" (Track ") + rows->text(qsizetype(i), 3) +
+                         GetMessage("VanDisc") + rows->text(qsizetype(i), 2) + QLatin1Char(')');
+    }
+    TheTree.addNodes(TheKey, RecordTree::Disc, nodes);
+}
+
+// A node is filled once: its placeholder tells that it was not yet. The length comes first, for "A"
+// is a letter and "A12" an artist.
+void frmCDList::Platenbak_Expand(const QString &key)
+{
+    RecordTree &tree = *mUi->Platenbak;
+    const QTreeWidgetItem *node = tree.node(key);
+    if (node->childCount() == 0 ||
+        !RecordTree::keyOf(node->child(0)).startsWith(QLatin1String("dummy")))
+        return;
+    tree.removeNode(RecordTree::keyOf(node->child(0)));
+    if (key.size() == 1 || key == GetMessage("Overige"))
+        FillArtistNode(tree, key);
+    else if (key.startsWith(u'A'))
+        FillTrackNode(tree, key);
+    else if (key.startsWith(u'T'))
+        FillCDNode(tree, key);
+}
+
+void frmCDList::Platenbak_NodeClick(const QString &key)
+{
+    const QString linkId = key.sliced(1);
+    if (!key.startsWith(u'C') || !text::isNumeric(linkId))
+        return;
+    const auto title = recordnodes::titleOf(linkId);
+    if (title.id == 0)
+        return; // gone since the tree was read
+    if (title.isCompilation)
+        editors::editCompilation(title.id);
+    else
+        editors::editAlbum(title.id);
+}
+
+void frmCDList::cmdInsert_Click()
+{
+    if (mUi->CDTab->currentIndex() == Compilations)
+        editors::newCompilation();
+    else if (mUi->CDTab->currentIndex() == Albums)
+        editors::newAlbum();
+}
+
+void frmCDList::cmdUpdate_Click()
+{
+    ListPage *page = current();
+    const auto item = page ? page->list->SelectedItem() : ListItem();
+    if (!item)
+        return;
+    if (page->page == Compilations)
+        editors::editCompilation(item.Text().toLongLong());
+    else if (page->page == Albums)
+        editors::editAlbum(item.Text().toLongLong());
 }
 
 void frmCDList::cmdDelete_Click()

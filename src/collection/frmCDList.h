@@ -10,6 +10,7 @@
 
 class DBListViewCTL;
 class ListItem;
+class RecordTree;
 namespace Ui
 {
 class frmCDList;
@@ -27,6 +28,12 @@ public:
 
     /// Reads all pages anew; column widths and the remembered rows are kept.
     void RefreshLists() override;
+
+    // Fill the node of this key with the artists, tracks or discs below it, by one statement. Throw
+    // ADODB::Error.
+    void FillArtistNode(RecordTree &TheTree, const QString &TheKey);
+    void FillTrackNode(RecordTree &TheTree, const QString &TheKey);
+    void FillCDNode(RecordTree &TheTree, const QString &TheKey);
 
 protected:
     void Form_Load() override;
@@ -61,8 +68,12 @@ private:
     void focusList();
     void RestoreSelection(ListPage &page);
     void rememberSelection(ListPage &page);
-    void list_KeyDown(int keyCode);
+    void list_KeyDown(int keyCode, int shift);
     void list_ColumnClick(ListPage &page, int column);
+    void Platenbak_Expand(const QString &key);
+    void Platenbak_NodeClick(const QString &key);
+    void cmdInsert_Click();
+    void cmdUpdate_Click();
     void cmdDelete_Click();
     void DeleteCD();
     void DeleteMP3Collection();

@@ -3,15 +3,28 @@
 #include "shell/services/messages.h"
 
 #include <QIcon>
+#include <QKeyEvent>
 
 namespace
 {
 
-constexpr int keyRole = Qt::UserRole;
+/// Keys by the thousand: a plain member takes less than data of the model would.
+class Item : public QTreeWidgetItem
+{
+public:
+    Item(const QString &key, const QString &text) : QTreeWidgetItem(QStringList(text)), key(key) {}
+    const QString key;
+};
 
 QIcon icon(const char *name)
 {
     return QIcon(QStringLiteral(":/icons/") + QLatin1String(name) + QStringLiteral(".svg"));
+}
+
+const QIcon &iconOf(RecordTree::Level level)
+{
+    static const QIcon icons[] = {icon("letter"), icon("artist"), icon("track"), icon("disc")};
+    return icons[level];
 }
 
 } // namespace
@@ -21,26 +34,74 @@ RecordTree::RecordTree(QWidget *parent) : QTreeWidget(parent)
     setHeaderHidden(true);
     setUniformRowHeights(true);
     setIconSize({18, 18});
+    const auto keyed = [this](auto signal) {
+        return [this, signal](QTreeWidgetItem *item) { emit(this->*signal)(keyOf(item)); };
+    };
+    connect(this, &QTreeWidget::itemExpanded, this, keyed(&RecordTree::Expand));
+    connect(this, &QTreeWidget::itemClicked, this, keyed(&RecordTree::NodeClick));
 }
 
 QString RecordTree::keyOf(const QTreeWidgetItem *node)
 {
-    return node->data(0, keyRole).toString();
+    return static_cast<const Item *>(node)->key;
 }
 
 void RecordTree::resetRoots()
 {
     clear();
-    for (char letter = 'A'; letter <= 'Z'; ++letter)
-        addRoot(QString(QLatin1Char(letter)));
-    addRoot(GetMessage("Overige"));
+    mNodes.clear();
+    QList<QTreeWidgetItem *> roots;
+    for (char letter = 'A'; letter <= 'Z'; ++letter) {
+        const QString name(QLatin1Char{letter});
+        roots.append(make(Letter, {name, name}));
+    }
+    roots.append(make(Letter, {GetMessage("Overige"), GetMessage("Overige")}));
+    addTopLevelItems(roots);
 }
 
-QTreeWidgetItem *RecordTree::addRoot(const QString &name)
+void RecordTree::addNodes(const QString &parentKey, Level level, const std::vector<Node> &nodes)
 {
-    static const QIcon letter = icon("letter");
-    auto *root = new QTreeWidgetItem(this, {name});
-    root->setData(0, keyRole, name);
-    root->setIcon(0, letter);
-    return root;
+    QTreeWidgetItem *parent = node(parentKey);
+    if (!parent)
+        return;
+    QList<QTreeWidgetItem *> items;
+    items.reserve(qsizetype(nodes.size()));
+    for (const Node &node : nodes)
+        items.append(make(level, node));
+    parent->addChildren(items);
+}
+
+void RecordTree::removeNode(const QString &key)
+{
+    delete mNodes.take(key);
+}
+
+QTreeWidgetItem *RecordTree::make(Level level, const Node &node)
+{
+    auto *item = new Item(node.key, node.text);
+    item->setIcon(0, iconOf(level));
+    mNodes.insert(node.key, item);
+    if (level != Disc)
+        putPlaceholder(item, level, node);
+    return item;
+}
+
+void RecordTree::putPlaceholder(QTreeWidgetItem *item, Level level, const Node &node)
+{
+    const Node below[] = {
+        {QStringLiteral("dummyArtist") + node.key, QStringLiteral("dummy") + node.text},
+        {QStringLiteral("dummyT") + node.key, QStringLiteral("dummyTrack")},
+        {QStringLiteral("dummyC") + node.key, QStringLiteral("dummyCD")}};
+    auto *placeholder = new Item(below[level].key, below[level].text);
+    mNodes.insert(below[level].key, placeholder);
+    item->addChild(placeholder);
+}
+
+void RecordTree::keyPressEvent(QKeyEvent *event)
+{
+    const bool enter = event->key() == Qt::Key_Return || event->key() == Qt::Key_Enter;
+    if (enter && currentItem())
+        emit NodeClick(keyOf(currentItem()));
+    else
+        QTreeWidget::keyPressEvent(event);
 }

@@ -2,6 +2,7 @@
 
 #include "catalogue/cleanorphans.h"
 #include "catalogue/provision.h"
+#include "collection/editors.h"
 #include "collection/frmCDList.h"
 #include "platform/ado/connection.h"
 #include "shell/frmHelp.h"
@@ -138,6 +139,10 @@ void MainScreen::connectActions()
     const auto importText = [] { defaultInstance<frmImportWizard>().Show(); };
     on(mUi->Import, importText);
     on(mUi->tbImport, importText);
+    on(mUi->mnuSave, &editors::saveAll);
+    on(mUi->tbSave, &editors::saveAll);
+    on(mUi->mnuCDInsert, &editors::newCompilation);
+    on(mUi->mnuInsertEnkelCD, &editors::newAlbum);
     on(mUi->mnuUpdate, &MainScreen::openBrowser);
     on(mUi->tbCollection, &MainScreen::openBrowser);
     on(mUi->mnuHelp, &ShowHelpLinks);
@@ -229,6 +234,10 @@ void MainScreen::setImportEnabled(bool enabled)
 void MainScreen::adopt(Form *form)
 {
     const QSize wanted = form->size().expandedTo(form->minimumSizeHint());
+    if (subWindowOf(form)) { // which is minimized
+        bringUp(form);
+        return;
+    }
     QMdiSubWindow *child = mUi->Children->addSubWindow(form);
     child->setAttribute(Qt::WA_DeleteOnClose, false);
     child->setWindowIcon(form->windowIcon());
@@ -245,7 +254,8 @@ void MainScreen::adopt(Form *form)
 void MainScreen::bringUp(Form *form)
 {
     if (QMdiSubWindow *child = subWindowOf(form)) {
-        child->showNormal();
+        if (child->isMinimized())
+            child->showNormal();
         mUi->Children->setActiveSubWindow(child);
     } else {
         form->show();

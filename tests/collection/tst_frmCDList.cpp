@@ -1,4 +1,5 @@
 // Label: screen
+#include "collection/cdeditor.h"
 #include "collection/frmCDList.h"
 #include "collection/recordtree.h"
 #include "controls/DBListViewCTL.h"
@@ -34,6 +35,12 @@ private slots:
     void widthsOutliveAReload();
     void columnClicksSort();
     void keysInAList();
+    void adding_data();
+    void adding();
+    void editing_data();
+    void editing();
+    void oneEditorPerRecord();
+    void mp3CollectionsAreNotEditedYet();
     void aFailureOfTheLoadIsTold();
 
 private:
@@ -44,6 +51,7 @@ private:
         return mScreen->findChild<Control *>(QLatin1String(name));
     }
     DBListViewCTL *list(const char *name) const { return control<DBListViewCTL>(name); }
+    static QStringList editors(); // "name mode id" of those that are open
     void page(int index) { control<QTabWidget>("CDTab")->setCurrentIndex(index); }
     QString status() const { return control<QStatusBar>("TheStatusBar")->currentMessage(); }
     static QStringList column(DBListViewCTL *list, int n);
@@ -62,8 +70,9 @@ void tst_frmCDList::init()
 
 void tst_frmCDList::cleanup()
 {
-    if (mScreen)
-        mScreen->Unload();
+    const auto forms = Form::openForms();
+    for (Form *form : forms)
+        form->Unload();
     QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
     mCatalogue.reset();
     mDesktop->verifyAllCame();
@@ -291,6 +300,105 @@ void tst_frmCDList::keysInAList()
     QTest::keyClick(list("ColList"), Qt::Key_Delete);
     QTest::keyClick(mScreen, Qt::Key_Escape);
     QVERIFY(mScreen->isUnloaded());
+}
+
+QStringList tst_frmCDList::editors()
+{
+    QStringList found;
+    for (Form *form : Form::openForms()) {
+        if (const auto *editor = qobject_cast<CdEditor *>(form))
+            found.append(editor->Name() + QLatin1Char(' ') + editor->Mode + QLatin1Char(' ') +
+                         QString::number(editor->CdId));
+    }
+    return found;
+}
+
+void tst_frmCDList::adding_data()
+{
+    QTest::addColumn<int>("tab");
+    QTest::addColumn<bool>("byKey");
+    QTest::addColumn<QString>("editor");
+    QTest::newRow("compilation, button") << 0 << false << QStringLiteral("frmCDRoot I 0");
+    QTest::newRow("compilation, key") << 0 << true << QStringLiteral("frmCDRoot I 0");
+    QTest::newRow("album, button") << 1 << false << QStringLiteral("frmCDRootE I 0");
+    QTest::newRow("album, key") << 1 << true << QStringLiteral("frmCDRootE I 0");
+}
+
+void tst_frmCDList::adding()
+{
+    QFETCH(int, tab);
+    QFETCH(bool, byKey);
+    QFETCH(QString, editor);
+    fill();
+    show();
+    page(tab);
+    DBListViewCTL *rows = list(tab == 0 ? "ColList" : "SngList");
+    for (int n = 1; n <= 2; ++n) {
+        if (byKey)
+            QTest::keyClick(rows, Qt::Key_Insert);
+        else
+            control<QPushButton>("cmdInsert")->click();
+        QCOMPARE(editors(), QStringList(n, editor));
+    }
+    QTest::keyClick(rows, Qt::Key_Insert, Qt::ControlModifier);
+    QCOMPARE(editors().size(), 2);
+}
+
+void tst_frmCDList::editing_data()
+{
+    QTest::addColumn<int>("tab");
+    QTest::addColumn<QString>("how");
+    QTest::addColumn<QString>("editor");
+    for (const char *how : {"button", "Enter", "double click"}) {
+        QTest::newRow(QByteArray("compilation, ").append(how))
+            << 0 << QString::fromLatin1(how) << QStringLiteral("frmCDRoot U 1");
+        QTest::newRow(QByteArray("album, ").append(how))
+            << 1 << QString::fromLatin1(how) << QStringLiteral("frmCDRootE U 4");
+    }
+}
+
+void tst_frmCDList::editing()
+{
+    QFETCH(int, tab);
+    QFETCH(QString, how);
+    QFETCH(QString, editor);
+    fill();
+    show();
+    page(tab);
+    DBListViewCTL *rows = list(tab == 0 ? "ColList" : "SngList");
+    rows->setSelectedItem(rows->ListItems().Item(2));
+    const QPoint second = rows->visualRect(rows->model()->index(1, 1)).center();
+    if (how == QLatin1String("button"))
+        control<QPushButton>("cmdUpdate")->click();
+    else if (how == QLatin1String("Enter"))
+        QTest::keyClick(rows, Qt::Key_Return);
+    else
+        QTest::mouseDClick(rows->viewport(), Qt::LeftButton, {}, second);
+    QCOMPARE(editors(), QStringList(editor));
+}
+
+void tst_frmCDList::oneEditorPerRecord()
+{
+    fill();
+    show();
+    QTest::keyClick(list("ColList"), Qt::Key_Return);
+    QTest::keyClick(list("ColList"), Qt::Key_Return);
+    QCOMPARE(editors(), texts("frmCDRoot U 2"));
+    QTest::keyClick(list("ColList"), Qt::Key_Down);
+    QTest::keyClick(list("ColList"), Qt::Key_Return);
+    QCOMPARE(editors(), texts("frmCDRoot U 2", "frmCDRoot U 1"));
+}
+
+void tst_frmCDList::mp3CollectionsAreNotEditedYet()
+{
+    fill();
+    show();
+    page(3);
+    QVERIFY(!control<QPushButton>("cmdInsert")->isEnabled());
+    QVERIFY(!control<QPushButton>("cmdUpdate")->isEnabled());
+    QTest::keyClick(list("MP3List"), Qt::Key_Return);
+    QTest::keyClick(list("MP3List"), Qt::Key_Insert);
+    QVERIFY(editors().isEmpty());
 }
 
 void tst_frmCDList::aFailureOfTheLoadIsTold()

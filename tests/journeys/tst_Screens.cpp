@@ -1,5 +1,7 @@
 // Label: journey
 #include "collection/frmCDList.h"
+#include "collection/frmCDRoot.h"
+#include "collection/frmCDRootE.h"
 #include "platform/ado/connection.h"
 #include "shell/frmHelp.h"
 #include "shell/frmSplash.h"
@@ -41,6 +43,15 @@ using Make = std::function<Form *()>;
 template <typename Screen> Make make()
 {
     return [] { return new Screen; };
+}
+
+template <typename Editor> Make makeEditor()
+{
+    return [] {
+        auto *editor = new Editor;
+        editor->Mode = QStringLiteral("I");
+        return editor;
+    };
 }
 
 QString textOf(const QWidget *w)
@@ -87,6 +98,8 @@ void tst_Screens::everyScreen_data()
     const std::pair<const char *, Make> screens[] = {{"frmSplash", make<frmSplash>()},
                                                      {"frmHelp", make<frmHelp>()},
                                                      {"frmCDList", make<frmCDList>()},
+                                                     {"frmCDRoot", makeEditor<frmCDRoot>()},
+                                                     {"frmCDRootE", makeEditor<frmCDRootE>()},
                                                      {"frmImportWizard", make<frmImportWizard>()},
                                                      {"frmImportBusy", make<frmImportBusy>()},
                                                      {"frmImport", make<frmImport>()},

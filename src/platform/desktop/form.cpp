@@ -109,6 +109,21 @@ bool Form::Unload()
     return true;
 }
 
+bool Form::Reload()
+{
+    const QPointer<QWidget> focus = focusWidget();
+    if (focus)
+        setFocus();
+    const bool goes = QueryUnload();
+    if (goes) {
+        Form_Unload();
+        Form_Load();
+    }
+    if (focus && !mUnloaded)
+        focus->setFocus();
+    return goes && !mUnloaded;
+}
+
 // The widget itself lives until the event loop comes round: its own handlers may still be running.
 void Form::finishUnload()
 {

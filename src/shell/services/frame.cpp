@@ -49,3 +49,16 @@ void placeInFrame(Form *form, double shareOfWidth, double shareOfHeight)
     const QSize frame = gFrame->size();
     form->setPlace({int(frame.width() * shareOfWidth), int(frame.height() * shareOfHeight)});
 }
+
+void makeRoomInFrame(const Form *form)
+{
+    if (!gFrame)
+        return;
+    QSize frame = gFrame->size();
+    if (form->width() > frame.width())
+        frame.setWidth(qRound(form->width() * 1.4));
+    if (form->height() > frame.height())
+        frame.setHeight(qRound(form->height() * 1.2));
+    if (frame != gFrame->size())
+        gFrame->window()->resize(frame);
+}

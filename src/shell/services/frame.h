@@ -29,3 +29,6 @@ void releaseFrame();
 
 /// For the load of a form: it will stand at this share of the frame's size.
 void placeInFrame(Form *form, double shareOfWidth, double shareOfHeight);
+
+/// For the load of a form: a frame that is smaller than the form grows beyond it.
+void makeRoomInFrame(const Form *form);

@@ -21,6 +21,8 @@ const Message furtherTexts[] = {
     {"xProgress", "Progress", "Voortgang"},
     {"xTracksRead", "Tracks to be imported", "Te importeren tracks"},
     {"xToolbar", "Toolbar", "Werkbalk"},
+    {"xDiscs", "Discs", "Discs"},
+    {"xOtherRecord", "This disc has been deleted meanwhile, and another one has taken its place in the catalogue. Nothing was saved.", "Deze CD is intussen verwijderd en een andere heeft zijn plaats in de database ingenomen. Er is niets opgeslagen."},
     {"xPrint", "Print list", "Lijst afdrukken"},
     {"xTracks", "Tracks of the disc", "Tracks van de disc"},
     {"xSuggestions", "Suggestions", "Suggesties"},

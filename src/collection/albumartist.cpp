@@ -1,0 +1,109 @@
+#include "collection/albumartist.h"
+
+#include "catalogue/ids.h"
+#include "catalogue/quoting.h"
+#include "platform/ado/recordset.h"
+#include "shell/services/globals.h"
+
+namespace albumartist
+{
+
+namespace
+{
+
+const auto nextArtistId = QStringLiteral("SELECT max(id)+1 as id FROM Artiesten");
+const auto nextTrackId = QStringLiteral("SELECT max(id)+1 as id FROM Tracks");
+const auto idField = QLatin1String("id");
+
+QString selectArtist(const QString &name)
+{
+    return QStringLiteral("SELECT id FROM Artiesten where Naam = ") + quoted(name);
+}
+
+QString insertArtist(qint64 id, const QString &name)
+{
+    return QStringLiteral("Insert into artiesten(id,naam) values (") + QString::number(id) +
+           QLatin1Char(',') + quoted(name) + QLatin1Char(')');
+}
+
+QString selectTracksOf(qint64 cd)
+{
+    return QStringLiteral("select trk.id as ID, "
+                          "trk.titel as Titel, "
+                          "trk.genre as Genre, "
+                          "trk.hitjaar as Hitjaar "
+                          "from tracks trk, compactdiscs cds "
+                          "where trk.id = cds.track_id "
+                          "and cds.cdtitels_id= ") +
+           QString::number(cd);
+}
+
+QString selectTrack(qint64 artist, const QString &title)
+{
+    return QStringLiteral("SELECT id From Tracks where artiest_id = ") + QString::number(artist) +
+           QStringLiteral(" and Titel = ") + quoted(title);
+}
+
+QString insertTrack(qint64 id, qint64 artist, const QString &title, const QString &genre,
+                    const QString &year)
+{
+    return QStringLiteral("Insert into Tracks(id,artiest_id,titel,genre,hitjaar) values (") +
+           QString::number(id) + QLatin1Char(',') + QString::number(artist) + QLatin1Char(',') +
+           title + QLatin1Char(',') + genre + QLatin1Char(',') + year + QLatin1Char(')');
+}
+
+QString updateLinks(qint64 cd, qint64 from, qint64 to)
+{
+    return QStringLiteral("update compactdiscs set track_id= ") + QString::number(to) +
+           QStringLiteral(" where cdtitels_id = ") + QString::number(cd) +
+           QStringLiteral(" and track_id = ") + QString::number(from);
+}
+
+// 0 unless there is exactly one.
+qint64 onlyId(const QString &statement)
+{
+    ADODB::Recordset answer;
+    answer.Open(statement, *gConnection);
+    return answer.RecordCount() == 1 ? answer.Fields(0).Value().toLong() : 0;
+}
+
+// A NULL stays one, and an empty text of another program's stays that.
+QString sameText(const ADODB::Value &value)
+{
+    return value.isNull() ? QStringLiteral("NULL") : quoted(value.toText());
+}
+
+qint64 trackOf(qint64 artist, ADODB::Recordset &old)
+{
+    const QString title = old.Fields(u"Titel").Value().toText();
+    if (const qint64 own = onlyId(selectTrack(artist, title)))
+        return own;
+    const qint64 id = nextId(nextTrackId, idField);
+    gConnection->Execute(insertTrack(id, artist, quoted(title),
+                                     sameText(old.Fields(u"Genre").Value()),
+                                     numberOrNull(old.Fields(u"Hitjaar").Value().toText())));
+    return id;
+}
+
+} // namespace
+
+qint64 findOrMake(const QString &name)
+{
+    if (const qint64 known = onlyId(selectArtist(name)))
+        return known;
+    const qint64 id = nextId(nextArtistId, idField);
+    gConnection->Execute(insertArtist(id, name));
+    return id;
+}
+
+void moveTracks(qint64 cd, qint64 artist)
+{
+    ADODB::Recordset tracks;
+    tracks.Open(selectTracksOf(cd), *gConnection);
+    for (; !tracks.isEOF(); tracks.MoveNext()) {
+        const qint64 old = tracks.Fields(u"ID").Value().toLong();
+        gConnection->Execute(updateLinks(cd, old, trackOf(artist, tracks)));
+    }
+}
+
+} // namespace albumartist

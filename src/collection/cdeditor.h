@@ -1,0 +1,127 @@
+#pragma once
+
+#include "collection/headerfields.h"
+#include "platform/desktop/form.h"
+
+class QTabBar;
+class QToolBar;
+class TrackGrid;
+namespace ADODB
+{
+class Error;
+class Recordset;
+} // namespace ADODB
+
+/// What the editors of compilations and albums have in common, which is nearly all: a head that the
+/// form reads and writes, a tab for each disc, and a grid with the tracks of the disc that shows.
+/// The grid writes its tracks inside the transaction of the form's save. Discs are saved when
+/// their tab is left, without a question.
+///
+/// Mode and CdId are set before Show(). A form that is busy takes no command and refuses to close:
+/// it handles events at points where the grid stands between two states.
+class CdEditor : public Form
+{
+    Q_OBJECT
+
+public:
+    QString Mode;    // "I" a new record, "U" an existing one; the first save makes it "U"
+    qint64 CdId = 0; // CDTitels.ID; of a new record from its first save on
+
+    /// Saves the head and the disc that shows, all or nothing. With Reload the grid reads the disc
+    /// again. Tells the user what is wrong.
+    void SaveAtUserRequest(bool Reload = false);
+
+    /// The save command: the grid's cursor stays where it is.
+    void SaveKeepingPosition();
+
+protected:
+    struct Controls {
+        HeaderFields::Fields fields;
+        QTabBar *discs;
+        QToolBar *toolbar;
+        TrackGrid *disk;
+        QPushButton *cancel;
+    };
+    /// What is fixed for a kind of record.
+    struct Kind {
+        double left;              // where the form stands, as a share of the frame's width
+        QString unknownMode;      // said when Mode is neither "I" nor "U"
+        QString positionTitle;    // of the box when the save command fails
+        bool idBeforeTransaction; // a new id is looked up before the transaction begins
+    };
+
+    explicit CdEditor(const QString &name);
+    void setUp(const Controls &controls, const Kind &kind);
+
+    // What the two kinds differ in. All statements are about the row of CDTitels with this id.
+    virtual const char *gapIn(const Header &header) const = 0; // key of what to say, or nullptr
+    virtual QString selectRecord(qint64 id) const = 0; // CDTitle, Genre, hitjaar, DiscNum; Artiest
+    virtual QString selectIsOwn(qint64 id, const Header &saved) const = 0; // 0 or 1, or no row
+    virtual QString insertTitle(qint64 id, const Header &header) const = 0;
+    virtual QString updateTitle(qint64 id, const Header &header) const = 0;
+    virtual void beforeTitle(const Header &) {}                          // in the transaction
+    virtual void afterTitle(const Header &, const Header & /*saved*/) {} // of an existing record
+    virtual QWidget *behindLastTrack() const = 0; // gets the focus from the grid
+    virtual void RestoreDiskPosition();
+
+    void Form_Load() override;
+    bool QueryUnload() override;
+
+private:
+    using Routine = void (CdEditor::*)();
+
+    void connectFields();
+    void connectDisk();
+    void connectToolbar();
+    void command(Routine routine);
+
+    void load();
+    void refuseToLoad(const QString &why);
+    void loadNew();
+    void loadRecord();
+    Header headerOf(ADODB::Recordset &record) const;
+    void setTabs(int count);
+    void showTab(int tab);
+    void ShowDisc(int number);
+
+    enum class TitleRow { New, Ours, Gone, Anothers };
+
+    bool canBeSaved(const Header &header);
+    void save(bool reload);
+    void write(const Header &header, bool reload);
+    TitleRow findTitleRow() const;
+    void writeTitle(TitleRow row, qint64 newId, const Header &header);
+    void committed(const Header &header, bool listsChange, bool reload);
+    void saveCommand();
+
+    void RememberDiskPosition();
+    QString withPosition(const ADODB::Error &error) const;
+    void DiscsTab_Click(int tab);
+    void goToTab(int tab);
+    void changeDisc(int leftBehind);
+    void AddDisc();
+    void DeleteDisc();
+    void DeleteDiscLocked();
+    void GoToFirstTrack();
+    void GoToLastTrack();
+    void GoToNextTrack();
+    void focusDisk();
+    void setDiskHasFocus(bool has);
+    void cmdCancel_Click();
+    bool saveBeforeClosing();
+    bool isChanged() const;
+    void takeFocus();
+
+    Controls mControls{};
+    Kind mKind{};
+    HeaderFields *mFields = nullptr;
+    Header mSaved; // as last loaded or saved
+    int mTab = 0;  // that shows; the bar tells only where it went
+    int mSavedRow = 0, mSavedColumn = 0;
+    bool mPositionSaved = false;
+    bool mDiskHasFocus = false;
+    bool mCloseSilently = false;
+    bool mSaveFailed = false;
+    bool mDeletingDisc = false;
+    bool mBusy = false;
+};

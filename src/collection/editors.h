@@ -1,0 +1,19 @@
+#pragma once
+
+#include <QtGlobal>
+
+/// How editors come up: a new one for each new record, and one per existing record.
+namespace editors
+{
+
+void newCompilation();
+void newAlbum();
+
+// The editor of this record comes up if it is open already.
+void editCompilation(qint64 id);
+void editAlbum(qint64 id);
+
+/// Saves what is open in editors, in the order in which they were opened.
+void saveAll();
+
+} // namespace editors
