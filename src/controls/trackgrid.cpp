@@ -187,9 +187,9 @@ QStringList TrackGrid::suggestionsFor(const QModelIndex &index, const QString &s
 {
     const TrackField field = mModel->fieldOf(index.column());
     if (field == GenreField) {
-        static const auto filter = QLatin1String("^");
-        return genres(mLanguage).filter(QRegularExpression(
-            filter + QRegularExpression::escape(start), QRegularExpression::CaseInsensitiveOption));
+        const QString begins = QLatin1Char('^') + QRegularExpression::escape(start);
+        return genres(mLanguage).filter(
+            QRegularExpression(begins, QRegularExpression::CaseInsensitiveOption));
     }
     if (!mConnection || field == YearField)
         return {};
