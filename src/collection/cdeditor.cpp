@@ -91,7 +91,8 @@ void CdEditor::connectDisk()
             [this] { command(&CdEditor::DeleteDiscLocked); });
 }
 
-// The buttons take no focus: the keys that they send go to the control that has it.
+// The toolbar lines up with the fields. Its buttons take no focus: the keys that they send go to
+// the control that has it.
 void CdEditor::connectToolbar()
 {
     applyCaptions(this, {{"tbInsertDisc", "TTInsertCD"},
@@ -105,6 +106,7 @@ void CdEditor::connectToolbar()
                          {"tbPrevField", "TTPrevField"},
                          {"tbNextTrack", "TTNextTrack"},
                          {"tbPrevTrack", "TTPrevTrack"}});
+    mControls.toolbar->layout()->setContentsMargins(0, 0, 0, 0);
     for (QToolButton *button : mControls.toolbar->findChildren<QToolButton *>())
         button->setFocusPolicy(Qt::NoFocus);
     const auto actions = mControls.toolbar->actions();
