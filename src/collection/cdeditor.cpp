@@ -60,6 +60,8 @@ void CdEditor::setUp(const Controls &controls, const Kind &kind)
     setCancelButton(controls.cancel);
     (controls.fields.artist ? controls.fields.artist : controls.fields.title)->setFocus();
     controls.discs->setAccessibleName(GetMessage("xDiscs"));
+    controls.toolbar->setAccessibleName(GetMessage("xToolbar"));
+    controls.discs->installEventFilter(this);
     connect(controls.discs, &QTabBar::currentChanged, this, &CdEditor::DiscsTab_Click);
     connect(controls.cancel, &QPushButton::clicked, this, &CdEditor::cmdCancel_Click);
     connectFields();
@@ -421,6 +423,12 @@ void CdEditor::DiscsTab_Click(int tab)
     }
     const QScopedValueRollback<bool> busy(mBusy, true);
     changeDisc(std::exchange(mTab, tab));
+}
+
+// A wheel that passes over the tabs must not save and change discs.
+bool CdEditor::eventFilter(QObject *watched, QEvent *event)
+{
+    return event->type() == QEvent::Wheel || Form::eventFilter(watched, event);
 }
 
 // As a click on the tab does.
