@@ -60,6 +60,8 @@ void CdEditor::setUp(const Controls &controls, const Kind &kind)
     setCancelButton(controls.cancel);
     (controls.fields.artist ? controls.fields.artist : controls.fields.title)->setFocus();
     controls.discs->setAccessibleName(GetMessage("xDiscs"));
+    controls.toolbar->setAccessibleName(GetMessage("xToolbar"));
+    controls.discs->installEventFilter(this);
     connect(controls.discs, &QTabBar::currentChanged, this, &CdEditor::DiscsTab_Click);
     connect(controls.cancel, &QPushButton::clicked, this, &CdEditor::cmdCancel_Click);
     connectFields();
@@ -91,7 +93,8 @@ void CdEditor::connectDisk()
             [this] { command(&CdEditor::DeleteDiscLocked); });
 }
 
-// The buttons take no focus: the keys that they send go to the control that has it.
+// The toolbar lines up with the fields. Its buttons take no focus: the keys that they send go to
+// the control that has it.
 void CdEditor::connectToolbar()
 {
     applyCaptions(this, {{"tbInsertDisc", "TTInsertCD"},
@@ -105,6 +108,7 @@ void CdEditor::connectToolbar()
                          {"tbPrevField", "TTPrevField"},
                          {"tbNextTrack", "TTNextTrack"},
                          {"tbPrevTrack", "TTPrevTrack"}});
+    mControls.toolbar->layout()->setContentsMargins(0, 0, 0, 0);
     for (QToolButton *button : mControls.toolbar->findChildren<QToolButton *>())
         button->setFocusPolicy(Qt::NoFocus);
     const auto actions = mControls.toolbar->actions();
@@ -419,6 +423,12 @@ void CdEditor::DiscsTab_Click(int tab)
     }
     const QScopedValueRollback<bool> busy(mBusy, true);
     changeDisc(std::exchange(mTab, tab));
+}
+
+// A wheel that passes over the tabs must not save and change discs.
+bool CdEditor::eventFilter(QObject *watched, QEvent *event)
+{
+    return event->type() == QEvent::Wheel || Form::eventFilter(watched, event);
 }
 
 // As a click on the tab does.

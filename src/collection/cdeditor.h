@@ -66,6 +66,7 @@ protected:
 
     void Form_Load() override;
     bool QueryUnload() override;
+    bool eventFilter(QObject *watched, QEvent *event) override; // of the tabs
 
 private:
     using Routine = void (CdEditor::*)();

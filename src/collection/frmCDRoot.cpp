@@ -28,9 +28,7 @@ frmCDRoot::~frmCDRoot() = default;
 
 void frmCDRoot::setTexts()
 {
-    applyCaptions(this, {{"frmCDRoot", "frmCDRootCaption"},
-                         {"TheDiskToolbar", "xToolbar"},
-                         {"cmdCancel", "cmdCancelCaption"}});
+    applyCaptions(this, {{"frmCDRoot", "frmCDRootCaption"}, {"cmdCancel", "cmdCancelCaption"}});
     mUi->lblTitle->setText(GetMessage("Titel") + QLatin1Char(':'));
     mUi->lblGenre->setText(GetMessage("Genre") + QLatin1Char(':'));
     mUi->lblYear->setText(GetMessage("HitYear") + QLatin1Char(':'));

@@ -27,9 +27,7 @@ frmCDRootE::~frmCDRootE() = default;
 
 void frmCDRootE::setTexts()
 {
-    applyCaptions(this, {{"frmCDRootE", "frmCDRootECaption"},
-                         {"TheDiskToolbar", "xToolbar"},
-                         {"cmdCancel", "cmdCancelCaption"}});
+    applyCaptions(this, {{"frmCDRootE", "frmCDRootECaption"}, {"cmdCancel", "cmdCancelCaption"}});
     mUi->lblArtist->setText(GetMessage("Artiest") + QLatin1Char(':'));
     mUi->lblTitle->setText(GetMessage("Titel") + QLatin1Char(':'));
     mUi->lblGenre->setText(GetMessage("Genre") + QLatin1Char(':'));

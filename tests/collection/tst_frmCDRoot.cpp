@@ -53,6 +53,8 @@ private slots:
     void closing();
     void closingRefused();
     void aFailureTakesAllBack();
+    void aFullDisk();
+    void aDiscThatCannotBeDeleted();
     void aFailureOfTheFirstSave();
     void aRecordDeletedMeanwhile();
     void anIdGivenToAnotherMeanwhile();
@@ -657,6 +659,46 @@ void tst_frmCDRoot::aFailureTakesAllBack()
     mE->catalogue.exec(QStringLiteral("drop trigger refuse"));
     editor->SaveKeepingPosition();
     QCOMPARE(mE->tracks(3).mid(2, 2), texts("1/3 New - Good", "1/4 New - Bad"));
+    QVERIFY(editor->updatesEnabled());
+}
+
+// The engine itself reports it, at a size that the file may not pass.
+void tst_frmCDRoot::aFullDisk()
+{
+    CdEditor *editor = openThree();
+    const QStringList before = mE->catalogue.rows(titleRow.arg(3)) + mE->tracks(3);
+    QStringList lines;
+    for (int i = 0; i < 100; ++i)
+        lines.append(QStringLiteral("Anna\t") + QString(200, QLatin1Char('x')) +
+                     QString::number(i));
+    QApplication::clipboard()->setText(lines.join(QLatin1Char('\n')));
+    mE->disk()->setFocus();
+    mE->disk()->setCurrentRow(3);
+    mE->disk()->setCurrentColumn(2);
+    keyboard::press(Qt::Key_V, Qt::ControlModifier);
+    gConnection->housekeeping("PRAGMA max_page_count=1"); // as many as there are
+    mE->desktop.expectBox(QStringLiteral("The disk is full; nothing was written."));
+    editor->SaveKeepingPosition();
+    QCOMPARE(mE->catalogue.rows(titleRow.arg(3)) + mE->tracks(3), before);
+    gConnection->housekeeping("PRAGMA max_page_count=100000");
+    editor->SaveKeepingPosition();
+    QCOMPARE(mE->tracks(3).size(), 104);
+}
+
+void tst_frmCDRoot::aDiscThatCannotBeDeleted()
+{
+    CdEditor *editor = openThree();
+    mE->catalogue.exec(QStringLiteral("create trigger refuse before delete on CompactDiscs "
+                                      "begin select raise(abort, 'not this one'); end"));
+    mE->tabs()->setCurrentIndex(1);
+    mE->desktop.expectBox(QStringLiteral("not this one"));
+    mE->button(2)->trigger();
+    QCOMPARE(mE->tracks(3).size(), 4);
+    QCOMPARE(mE->tabs()->count(), 3);
+    QCOMPARE(mE->cell(1, 3), QStringLiteral("Three"));
+    mE->catalogue.exec(QStringLiteral("drop trigger refuse"));
+    mE->button(2)->trigger();
+    QCOMPARE(mE->tabs()->count(), 2);
     QVERIFY(editor->updatesEnabled());
 }
 

@@ -34,6 +34,7 @@ private slots:
     void saveAllOverThreeEditors();
     void aRecordDeletedInTheBrowserIsSavedAgain();
     void aMinimizedEditorComesUpAgain();
+    void theFrameMakesRoom();
     void theProgramEndsThroughTheQuestion();
 
 private:
@@ -310,6 +311,19 @@ void tst_Editors::aMinimizedEditorComesUpAgain()
     window->showMaximized();
     press(Qt::Key_S, Qt::ControlModifier);
     QVERIFY2(window->isMaximized(), "a save leaves the window as it is");
+}
+
+void tst_Editors::theFrameMakesRoom()
+{
+    start(languageEnglish);
+    MainScreen &frame = mProgram->frame();
+    frame.resize(600, 400);
+    newCompilation(QStringLiteral("T"));
+    QCOMPARE(frame.QMainWindow::size(), QSize(740 * 14 / 10, 490 * 12 / 10));
+    QCOMPARE(active()->parentWidget()->pos(), QPoint(qRound(740 * 1.4 * 0.2), 0));
+    press(Qt::Key_Escape);
+    press(Qt::Key_Backtab);
+    press(Qt::Key_Escape);
 }
 
 void tst_Editors::theProgramEndsThroughTheQuestion()

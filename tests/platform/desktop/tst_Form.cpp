@@ -21,6 +21,7 @@ private slots:
     void cleanup();
     void loadsOnceAndGoes();
     void refusesToClose();
+    void reloadsOnTheSpot();
     void unloadsWhileLoading_data();
     void unloadsWhileLoading();
     void modalEndsWithUnloadOrHide_data();
@@ -65,6 +66,8 @@ public:
         connect(&cancel, &QPushButton::clicked, this, note(QStringLiteral("cancel ")));
         connect(this, &Form::unloaded, this, note(QStringLiteral("unloaded ")));
     }
+
+    using Form::Reload;
 
     static inline QString log;
     bool stays = false, leavesAtLoad = false;
@@ -131,6 +134,26 @@ void tst_Form::loadsOnceAndGoes()
     QTRY_VERIFY(!form);
     QVERIFY(TestForm::log.endsWith(QStringLiteral("query unload unloaded ")));
     QCOMPARE(TestForm::log.count(QStringLiteral("load ")), 2); // of "unload" too
+}
+
+void tst_Form::reloadsOnTheSpot()
+{
+    QPointer<TestForm> form = new TestForm;
+    form->Show();
+    form->activateWindow();
+    QVERIFY(QTest::qWaitForWindowActive(form));
+    form->text.setFocus();
+    TestForm::log.clear();
+    QVERIFY(form->Reload());
+    QCOMPARE(TestForm::log, QStringLiteral("query unload load "));
+    QVERIFY(form->isVisible() && !form->isUnloaded() && form->text.hasFocus());
+    form->stays = true;
+    QVERIFY(!form->Reload());
+    QVERIFY(form->text.hasFocus());
+    form->stays = false;
+    form->leavesAtLoad = true;
+    QVERIFY(!form->Reload());
+    QVERIFY(form->isUnloaded());
 }
 
 void tst_Form::refusesToClose()
