@@ -256,6 +256,8 @@ void CdEditor::RestoreDiskPosition()
 {
     if (!std::exchange(mPositionSaved, false))
         return;
+    if (mSaveFailed && mControls.disk->HasError())
+        return; // the grid has put the cursor on the cell that it refused
     mSavedRow = std::max(1, mSavedRow);
     mSavedColumn = std::max(1, mSavedColumn);
     mControls.disk->setCurrentRow(mSavedRow);

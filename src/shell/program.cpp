@@ -4,6 +4,7 @@
 #include "shell/MainScreen.h"
 #include "shell/application.h"
 #include "shell/endsignals.h"
+#include "shell/frmSplash.h"
 #include "shell/services/globals.h"
 #include "shell/services/messages.h"
 #include "shell/singleinstance.h"
@@ -14,7 +15,7 @@ namespace
 
 void sayInUse()
 {
-    gLanguage = startup::storedLanguage();
+    defaultInstance<frmSplash>().Unload();
     errorBox(GetMessage("xInUse"), GetMessage("MainScreen.Caption"));
 }
 
@@ -28,8 +29,14 @@ int runProgram(int argc, char **argv)
     Desktop::setCurrent(&desktop);
     application.setQuitOnLastWindowClosed(false);
 
-    // Before any setting is written.
+    // Before any setting is written. The lock waits for the disk, so the splash comes first; a
+    // program that runs already is asked before that.
     SingleInstance instance(desktop.programFolder());
+    if (instance.raiseTheFirst())
+        return 0;
+    gLanguage = startup::storedLanguage();
+    defaultInstance<frmSplash>().Show();
+    desktop.pump();
     const auto outcome = instance.take();
     if (outcome == SingleInstance::Outcome::Raised)
         return 0;

@@ -43,7 +43,7 @@ SingleInstance::Outcome SingleInstance::take()
         // A folder that cannot be written holds no locks: the catalogue itself will tell.
         if (mLock->error() != QLockFile::LockFailedError)
             return Outcome::First;
-        return askTheFirst() ? Outcome::Raised : Outcome::InUse;
+        return raiseTheFirst() ? Outcome::Raised : Outcome::InUse;
     }
     mLastRunBroken = lockThere;
     connect(&mServer, &QLocalServer::newConnection, this, [this] {
@@ -61,7 +61,7 @@ SingleInstance::Outcome SingleInstance::take()
     return Outcome::First;
 }
 
-bool SingleInstance::askTheFirst() const
+bool SingleInstance::raiseTheFirst() const
 {
     QLocalSocket first;
     first.connectToServer(mServerName);

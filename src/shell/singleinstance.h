@@ -16,6 +16,9 @@ public:
     explicit SingleInstance(const QString &programFolder);
     ~SingleInstance() override;
 
+    /// Whether a first one is there, and has come to the front. Quick when there is none.
+    bool raiseTheFirst() const;
+
     enum class Outcome { First, Raised, InUse };
     Outcome take();
 
@@ -26,8 +29,6 @@ signals:
     void raiseRequested();
 
 private:
-    bool askTheFirst() const;
-
     QString mServerName;
     QString mLockName;
     std::unique_ptr<QLockFile> mLock;
