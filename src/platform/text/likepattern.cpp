@@ -141,7 +141,7 @@ bool endsWithPiece(std::string_view text, std::size_t from, std::string_view pie
 // The characters outside of ASCII that are folded into it: the long s and the Kelvin sign.
 bool holdsHiddenAscii(std::string_view text)
 {
-    return text.find("\xC5\xBF") != npos || text.find("\xE2\x84\xAA") != npos;
+    return !isAscii(text) && (text.find("\xC5\xBF") != npos || text.find("\xE2\x84\xAA") != npos);
 }
 
 } // namespace
