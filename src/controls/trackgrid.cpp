@@ -187,7 +187,7 @@ QStringList TrackGrid::suggestionsFor(const QModelIndex &index, const QString &s
 {
     const TrackField field = mModel->fieldOf(index.column());
     if (field == GenreField) {
-        const auto begins = QLatin1Char('^') + QRegularExpression::escape(start);
+        const QString begins = QLatin1Char('^') + QRegularExpression::escape(start);
         return genres(mLanguage).filter(
             QRegularExpression(begins, QRegularExpression::CaseInsensitiveOption));
     }
