@@ -2,6 +2,7 @@
 
 #include "catalogue/cleanorphans.h"
 #include "catalogue/ids.h"
+#include "collection/disctabs.h"
 #include "controls/trackgrid.h"
 #include "platform/ado/recordset.h"
 #include "platform/desktop/desktop.h"
@@ -16,8 +17,6 @@
 #include <QLineEdit>
 #include <QPushButton>
 #include <QScopedValueRollback>
-#include <QSignalBlocker>
-#include <QTabBar>
 #include <QToolBar>
 #include <QToolButton>
 
@@ -43,11 +42,6 @@ void send(const char *keys)
     Desktop::current().sendKeys(QLatin1String(keys));
 }
 
-QString discCaption(int number)
-{
-    return QStringLiteral("Disc &") + QString::number(number);
-}
-
 } // namespace
 
 CdEditor::CdEditor(const QString &name) : Form(name) {}
@@ -59,10 +53,8 @@ void CdEditor::setUp(const Controls &controls, const Kind &kind)
     mFields = new HeaderFields(controls.fields, this);
     setCancelButton(controls.cancel);
     (controls.fields.artist ? controls.fields.artist : controls.fields.title)->setFocus();
-    controls.discs->setAccessibleName(GetMessage("xDiscs"));
     controls.toolbar->setAccessibleName(GetMessage("xToolbar"));
-    controls.discs->installEventFilter(this);
-    connect(controls.discs, &QTabBar::currentChanged, this, &CdEditor::DiscsTab_Click);
+    connect(controls.discs, &DiscTabs::left, this, &CdEditor::DiscsTab_Click);
     connect(controls.cancel, &QPushButton::clicked, this, &CdEditor::cmdCancel_Click);
     connectFields();
     connectDisk();
@@ -186,7 +178,7 @@ void CdEditor::loadNew()
 {
     mSaved = {};
     mFields->show(mSaved);
-    setTabs(1);
+    mControls.discs->setCount(1);
     mControls.disk->setConnection(gConnection.get());
     mControls.disk->setCdId(0);
     mControls.disk->setDiscNo(1);
@@ -197,13 +189,14 @@ void CdEditor::loadNew()
 // turns out to be gone.
 void CdEditor::loadRecord()
 {
-    setTabs(1);
+    mControls.discs->setCount(1);
     ShowDisc(1);
     ADODB::Recordset record;
     record.Open(selectRecord(CdId), *gConnection);
     mSaved = headerOf(record);
     mFields->show(mSaved);
-    setTabs(std::max(1, int(record.Fields(u"DiscNum").Value().toLong())));
+    const qint64 discs = record.Fields(u"DiscNum").Value().toLong();
+    mControls.discs->setCount(std::max(1, int(discs)));
 }
 
 Header CdEditor::headerOf(ADODB::Recordset &record) const
@@ -213,25 +206,6 @@ Header CdEditor::headerOf(ADODB::Recordset &record) const
     };
     return {mControls.fields.artist ? text(u"Artiest") : QString(), text(u"CDTitle"),
             text(u"Genre"), text(u"Hitjaar")};
-}
-
-void CdEditor::setTabs(int count)
-{
-    QTabBar *discs = mControls.discs;
-    const QSignalBlocker quiet(discs);
-    while (discs->count() > count)
-        discs->removeTab(discs->count() - 1);
-    while (discs->count() < count)
-        discs->addTab(discCaption(discs->count() + 1));
-    showTab(0);
-}
-
-// Without the change of disc that a click brings.
-void CdEditor::showTab(int tab)
-{
-    const QSignalBlocker quiet(mControls.discs);
-    mControls.discs->setCurrentIndex(tab);
-    mTab = tab;
 }
 
 void CdEditor::ShowDisc(int number)
@@ -417,29 +391,23 @@ void CdEditor::saveCommand()
 }
 
 // The user's own; one that comes in while another's events are handled is taken back.
-void CdEditor::DiscsTab_Click(int tab)
+void CdEditor::DiscsTab_Click(int leftBehind)
 {
     if (mBusy) {
-        showTab(mTab);
+        mControls.discs->showTab(leftBehind);
         return;
     }
     const QScopedValueRollback<bool> busy(mBusy, true);
-    changeDisc(std::exchange(mTab, tab));
-}
-
-// A wheel that passes over the tabs must not save and change discs.
-bool CdEditor::eventFilter(QObject *watched, QEvent *event)
-{
-    return event->type() == QEvent::Wheel || Form::eventFilter(watched, event);
+    changeDisc(leftBehind);
 }
 
 // As a click on the tab does.
 void CdEditor::goToTab(int tab)
 {
-    if (tab == mTab)
+    const int leftBehind = mControls.discs->currentIndex();
+    if (tab == leftBehind)
         return;
-    const int leftBehind = mTab;
-    showTab(tab);
+    mControls.discs->showTab(tab);
     changeDisc(leftBehind);
 }
 
@@ -454,10 +422,10 @@ void CdEditor::changeDisc(int leftBehind)
         save(false);
         if (mSaveFailed) {
             informationBox(GetMessage("MsgDiscNav"));
-            showTab(leftBehind);
+            mControls.discs->showTab(leftBehind);
             RestoreDiskPosition();
         } else {
-            ShowDisc(mTab + 1);
+            ShowDisc(mControls.discs->currentIndex() + 1);
             mControls.disk->setCurrentRow(1);
             mControls.disk->setCurrentColumn(1);
         }
@@ -482,9 +450,8 @@ void CdEditor::AddDisc()
         RestoreDiskPosition();
         pump();
     } else {
-        const int number = mControls.discs->count() + 1;
-        mControls.discs->addTab(discCaption(number));
-        goToTab(number - 1); // which shows the disc
+        mControls.discs->add();
+        goToTab(mControls.discs->count() - 1); // which shows the disc
         pump();
     }
     releaseFrame();
@@ -510,7 +477,7 @@ void CdEditor::DeleteDisc()
     }
     const QScopedValueRollback<bool> deleting(mDeletingDisc, true);
     const bool inDisk = mDiskHasFocus;
-    const int tab = mTab;
+    const int tab = mControls.discs->currentIndex();
     mControls.disk->RemoveDisc();
     mCloseSilently = true;
     Reload();

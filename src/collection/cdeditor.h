@@ -3,7 +3,7 @@
 #include "collection/headerfields.h"
 #include "platform/desktop/form.h"
 
-class QTabBar;
+class DiscTabs;
 class QToolBar;
 class TrackGrid;
 namespace ADODB
@@ -37,7 +37,7 @@ public:
 protected:
     struct Controls {
         HeaderFields::Fields fields;
-        QTabBar *discs;
+        DiscTabs *discs;
         QToolBar *toolbar;
         TrackGrid *disk;
         QPushButton *cancel;
@@ -66,7 +66,6 @@ protected:
 
     void Form_Load() override;
     bool QueryUnload() override;
-    bool eventFilter(QObject *watched, QEvent *event) override; // of the tabs
 
 private:
     using Routine = void (CdEditor::*)();
@@ -81,8 +80,6 @@ private:
     void loadNew();
     void loadRecord();
     Header headerOf(ADODB::Recordset &record) const;
-    void setTabs(int count);
-    void showTab(int tab);
     void ShowDisc(int number);
 
     enum class TitleRow { New, Ours, Gone, Anothers };
@@ -97,7 +94,7 @@ private:
 
     void RememberDiskPosition();
     QString withPosition(const ADODB::Error &error) const;
-    void DiscsTab_Click(int tab);
+    void DiscsTab_Click(int leftBehind);
     void goToTab(int tab);
     void changeDisc(int leftBehind);
     void AddDisc();
@@ -117,7 +114,6 @@ private:
     Kind mKind{};
     HeaderFields *mFields = nullptr;
     Header mSaved; // as last loaded or saved
-    int mTab = 0;  // that shows; the bar tells only where it went
     int mSavedRow = 0, mSavedColumn = 0;
     bool mPositionSaved = false;
     bool mDiskHasFocus = false;

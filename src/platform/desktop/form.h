@@ -61,9 +61,9 @@ protected:
     virtual bool QueryUnload() { return true; } // false: the form stays
     virtual void Form_Unload() {}
 
-    /// Unloads and loads the form again on the spot: QueryUnload, Form_Unload, Form_Load. The object
-    /// lives on with what it keeps in its members, and with its place on the screen; the focus goes
-    /// and comes back. False if the form refuses or its load has unloaded it for good.
+    /// Unloads and loads the form again on the spot: QueryUnload, Form_Unload, Form_Load. The
+    /// object lives on with what it keeps in its members, and with its place on the screen; the
+    /// focus goes and comes back. False if the form refuses or its load has unloaded it for good.
     bool Reload();
 
     void setDefaultButton(QPushButton *button); // Enter
