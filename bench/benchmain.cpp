@@ -1,7 +1,7 @@
 #include "cases.h"
 #include "consoledesktop.h"
 
-#include <QCoreApplication>
+#include <QApplication>
 #include <algorithm>
 #include <cstring>
 
@@ -15,13 +15,16 @@ int main(int argc, char **argv)
         return stress;
     });
     argc = int(end - argv);
-    const QCoreApplication application(argc, argv);
+    // The screens are made for real, on a display that nobody sees.
+    qputenv("QT_QPA_PLATFORM", "offscreen");
+    const QApplication application(argc, argv);
     const ConsoleDesktop desktop;
     registerBrowseCases();
     registerTextCases();
     registerOrphanCases();
     registerSearchCases();
     registerStatementCases();
+    registerEditCases();
     registerTextRuleCases();
     benchmark::Initialize(&argc, argv);
     if (benchmark::ReportUnrecognizedArguments(argc, argv))

@@ -11,6 +11,7 @@ void registerTextCases();      // reading and loading text files, and the bare l
 void registerOrphanCases();    // CleanOrphans, and its deletes without the program
 void registerSearchCases();    // our LIKE and SQLite's
 void registerStatementCases(); // what one statement costs more than a prepared one
+void registerEditCases();      // editors, their saves and completion, the record tree
 void registerTextRuleCases();  // the sort order
 
 /// The name of a case at a size: "browse/owner".
