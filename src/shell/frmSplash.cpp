@@ -3,6 +3,7 @@
 #include "shell/services/messages.h"
 #include "ui_frmSplash.h"
 
+#include <QElapsedTimer>
 #include <QScreen>
 
 namespace
@@ -30,9 +31,9 @@ frmSplash::frmSplash() : Form(QStringLiteral("frmSplash")), mUi(std::make_unique
     setWindowFlags(Qt::SplashScreen | Qt::FramelessWindowHint);
     setFixedSize(size());
     mUi->Picture1->setSource(QStringLiteral(":/splash/splash.svg"));
-    setLight(mUi->lblProgram, nameSize, 255);
-    setLight(mUi->lblVersion, otherSize, 220);
-    setLight(mUi->lblAuthor, otherSize, 200);
+    for (QLabel *label : {mUi->lblProgram, mUi->lblVersion, mUi->lblAuthor})
+        label->hide();
+    connect(mUi->Picture1, &SvgPicture::Painted, this, &frmSplash::showWords);
     connect(mUi->Picture1, &SvgPicture::Click, this, &Form::Unload);
 }
 
@@ -46,6 +47,26 @@ void frmSplash::Form_Load()
     mUi->lblVersion->setText(QStringLiteral("Version " SONGCASE_VERSION));
     mUi->Picture1->setAccessibleName(name);
     move(screen()->availableGeometry().center() - rect().center());
+}
+
+// The first words of a program make it load its fonts, which takes as long as the picture: that is
+// shown first.
+void frmSplash::showWords()
+{
+    setLight(mUi->lblProgram, nameSize, 255);
+    setLight(mUi->lblVersion, otherSize, 220);
+    setLight(mUi->lblAuthor, otherSize, 200);
+    for (QLabel *label : {mUi->lblProgram, mUi->lblVersion, mUi->lblAuthor})
+        label->show();
+}
+
+void frmSplash::waitUntilPainted()
+{
+    constexpr int longest = 100; // milliseconds
+    QElapsedTimer waited;
+    waited.start();
+    while (!mUi->Picture1->isPainted() && waited.elapsed() < longest)
+        QCoreApplication::processEvents(QEventLoop::ExcludeUserInputEvents, 5);
 }
 
 void frmSplash::setAuthor(const QString &text)

@@ -20,10 +20,15 @@ public:
 
     void setAuthor(const QString &text);
 
+    /// Handles events until the picture is on the screen, for a fraction of a second at the most.
+    void waitUntilPainted();
+
 protected:
     void Form_Load() override;
     void keyPressEvent(QKeyEvent *event) override;
 
 private:
+    void showWords();
+
     std::unique_ptr<Ui::frmSplash> mUi;
 };

@@ -36,7 +36,7 @@ int runProgram(int argc, char **argv)
         return 0;
     gLanguage = startup::storedLanguage();
     defaultInstance<frmSplash>().Show();
-    desktop.pump();
+    defaultInstance<frmSplash>().waitUntilPainted();
     const auto outcome = instance.take();
     if (outcome == SingleInstance::Outcome::Raised)
         return 0;

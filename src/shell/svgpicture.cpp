@@ -6,6 +6,8 @@
 void SvgPicture::paintEvent(QPaintEvent *)
 {
     const QSize pixels = size() * devicePixelRatioF();
+    if (!isPainted())
+        QMetaObject::invokeMethod(this, &SvgPicture::Painted, Qt::QueuedConnection);
     if (mRendered.size() != pixels) {
         mRendered = QPixmap(pixels);
         mRendered.fill(Qt::transparent);

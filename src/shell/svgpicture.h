@@ -12,8 +12,11 @@ public:
     using QWidget::QWidget;
     void setSource(const QString &file) { mSource = file; }
 
+    bool isPainted() const { return !mRendered.isNull(); }
+
 signals:
     void Click();
+    void Painted(); // once, when the first painting is done
 
 protected:
     void paintEvent(QPaintEvent *event) override;
