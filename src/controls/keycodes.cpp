@@ -1,5 +1,17 @@
 #include "controls/keycodes.h"
 
+namespace
+{
+
+// Signs have the Latin codes that keys without a sign have here: "." would be Delete, "#" End.
+bool isLatinKey(int qtKey)
+{
+    return qtKey == Qt::Key_Space || (qtKey >= Qt::Key_0 && qtKey <= Qt::Key_9) ||
+           (qtKey >= Qt::Key_A && qtKey <= Qt::Key_Z);
+}
+
+} // namespace
+
 int keyCodeOf(int qtKey)
 {
     if (qtKey >= Qt::Key_F1 && qtKey <= Qt::Key_F24)
@@ -42,7 +54,7 @@ int keyCodeOf(int qtKey)
     case Qt::Key_Delete:
         return 46;
     default:
-        return qtKey < 0x100 ? qtKey : 0;
+        return isLatinKey(qtKey) ? qtKey : 0;
     }
 }
 

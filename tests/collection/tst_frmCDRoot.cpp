@@ -30,6 +30,7 @@ private slots:
     void leavingTheYear();
     void keysOfTheFields_data();
     void keysOfTheFields();
+    void signsAreText();
     void fieldsSelectTheirText();
     void pastedTextsHaveOneLine();
     void theGenreStaysAsTyped();
@@ -270,6 +271,20 @@ void tst_frmCDRoot::keysOfTheFields()
     keyboard::press(Qt::Key_End, Qt::ShiftModifier);
     QCOMPARE(mE->tabs()->count(), 3);
     QCOMPARE(mE->tracks(3).size(), 4);
+}
+
+// Signs whose codes are those of keys without a sign: page up and down, End, Insert, Delete.
+void tst_frmCDRoot::signsAreText()
+{
+    openThree();
+    mE->field("txtTitel")->setFocus();
+    for (const char sign : {'!', '"', '#', '$', '%', '&', '\'', '(', '-', '.'}) {
+        QTest::keyClick(mE->field("txtTitel"), sign, Qt::ShiftModifier);
+        QTest::keyClick(mE->field("txtTitel"), sign);
+    }
+    QCOMPARE(mE->field("txtTitel")->text(), QStringLiteral("!!\"\"##$$%%&&''((--..It's 100%1"));
+    QCOMPARE(mE->tabs()->count(), 3);
+    QCOMPARE(QApplication::focusWidget(), mE->field("txtTitel"));
 }
 
 void tst_frmCDRoot::fieldsSelectTheirText()
