@@ -39,8 +39,7 @@ void frmHelp::Form_Load()
     applyCaptions(this, {{"lblVisitOurWebsite", "lblVisitOurWebsite"},
                          {"lblToGetYourHelpOnLine", "lblToGetYourHelpOnLine"}});
     setWindowTitle(GetMessage("TTHelp"));
-    const QString name = gLanguage == languageDutch ? QStringLiteral("De gids van Liedkist")
-                                                    : QStringLiteral("The guide to Songcase");
+    const QString name = GetMessage("xGuide");
     mUi->Link->setText(QStringLiteral("<a href=\"guide\"><b>") + name + QStringLiteral("</b></a>"));
     mUi->Link->setAccessibleName(name);
     mUi->Link->setToolTip(guideAddress());

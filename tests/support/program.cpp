@@ -17,7 +17,6 @@ Program::Program(ScriptedDesktop &desktop)
 
 Program::~Program()
 {
-    const auto forms = Form::openForms();
     mFrame.reset();
     gConnection.reset();
     QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);

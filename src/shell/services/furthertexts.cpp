@@ -20,6 +20,7 @@ const Message furtherTexts[] = {
     {"xTextFiles", "Text files (*.txt);;All files (*)", "Tekstbestanden (*.txt);;Alle bestanden (*)"},
     {"xProgress", "Progress", "Voortgang"},
     {"xTracksRead", "Tracks to be imported", "Te importeren tracks"},
+    {"xGuide", "The guide to Songcase", "De gids van Liedkist"},
     {"xToolbar", "Toolbar", "Werkbalk"},
     {"xDiscs", "Discs", "Discs"},
     {"xOtherRecord", "This disc has been deleted meanwhile, and another one has taken its place in the catalogue. Nothing was saved.", "Deze CD is intussen verwijderd en een andere heeft zijn plaats in de database ingenomen. Er is niets opgeslagen."},
