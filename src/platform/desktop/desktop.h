@@ -35,7 +35,7 @@ public:
                                  const QString &title) = 0;
     virtual void showModal(Form &form) = 0; // returns when the form is unloaded or hidden
     virtual QString openFileName(const FileQuestion &question) = 0; // empty: cancelled
-    virtual QString saveFileName(const FileQuestion &question) = 0;
+    virtual QString saveFileName(const FileQuestion &question) = 0; // one that exists, too
     virtual QString folderName(const FileQuestion &question) = 0;
     virtual QDateTime now() = 0;
     virtual void setPointer(QWidget *window, PointerShape shape) = 0;

@@ -125,6 +125,7 @@ QString QtDesktop::saveFileName(const FileQuestion &question)
     QFileDialog dialog(QApplication::activeWindow());
     prepare(dialog, question);
     dialog.setAcceptMode(QFileDialog::AcceptSave);
+    dialog.setOption(QFileDialog::DontConfirmOverwrite); // the caller asks, in its own words
     return chosen(dialog);
 }
 

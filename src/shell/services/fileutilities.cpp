@@ -1,6 +1,7 @@
 #include "shell/services/fileutilities.h"
 
 #include "platform/desktop/desktop.h"
+#include "shell/services/messages.h"
 
 #include <QDir>
 #include <QDirIterator>
@@ -68,6 +69,11 @@ bool FileExists(const QString &path)
             return true;
     }
     return false;
+}
+
+bool mayWrite(const QString &name)
+{
+    return !FileExists(name) || askYesNo(GetMessage("FileAlreadyExists")) == vbYes;
 }
 
 bool DirExists(QString path)

@@ -9,6 +9,9 @@ class QWidget;
 extern QStringList gFoundFiles;      // what the last walk of folders has found
 extern QString gBrowseInitialFolder; // where the folder dialog starts
 
+/// Whether a file may be written under this name: nothing has it, or the user lets it be replaced.
+bool mayWrite(const QString &name);
+
 /// Whether a file, a folder or anything that a pattern with * and ? fits is there.
 bool FileExists(const QString &path);
 
