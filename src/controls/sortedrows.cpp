@@ -1,13 +1,9 @@
 #include "controls/sortedrows.h"
 
-#include "platform/text/collation.h"
-
-#include <QtEndian>
+#include "platform/ado/textsort.h"
 
 #include <algorithm>
-#include <bit>
 #include <charconv>
-#include <cstring>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -17,24 +13,7 @@ namespace
 
 using Row = std::uint32_t;
 
-/// A row with what decides its place first: a value, or the next eight letters of its text as a
-/// number, and what is left of the text behind them. The text is kept here because looking it up
-/// in the rows is what costs most.
-struct Entry {
-    std::uint64_t key;
-    const char *rest;
-    std::uint32_t restSize : 31;
-    std::uint32_t accented : 1; // letters with accents so far
-    Row row;
-};
-using Entries = std::vector<Entry>;
-
-struct ByKey {
-    bool operator()(const Entry &a, const Entry &b) const
-    {
-        return a.key != b.key ? a.key < b.key : a.row < b.row;
-    }
-};
+using Entries = std::vector<ADODB::SortEntry>;
 
 std::optional<qint64> wholeNumber(std::string_view s)
 {
@@ -52,7 +31,7 @@ std::uint64_t sortableNumber(qint64 v)
 }
 
 /// The texts of a column in UTF-8. Those that the rows do not hold as such are made once.
-class ColumnTexts
+class ColumnTexts : public ADODB::RowTexts
 {
 public:
     ColumnTexts(const ADODB::Rows &rows, int column, const WrittenTexts &written)
@@ -64,7 +43,7 @@ public:
 
     Row count() const { return Row(mRows.rowCount()); }
 
-    std::string_view operator[](Row row) const
+    std::string_view text(Row row) const override
     {
         if (!mMade.isEmpty()) {
             if (const auto made = mMade.constFind(row); made != mMade.constEnd())
@@ -96,145 +75,6 @@ private:
     QHash<Row, std::string> mMade;
 };
 
-/// Rows by their texts. Those with Latin letters alone are sorted eight letters at a time, the
-/// others by sort keys, which take longer to make; then the two are merged.
-class TextSort
-{
-public:
-    explicit TextSort(const ColumnTexts &texts) : mTexts(texts) {}
-
-    std::vector<Row> sorted() const
-    {
-        std::vector<Row> result;
-        result.reserve(mTexts.count());
-        Entries entries;
-        entries.reserve(mTexts.count());
-        for (Row row = 0; row < mTexts.count(); ++row) {
-            if (const auto text = mTexts[row]; text.empty())
-                result.push_back(row);
-            else
-                entries.push_back({0, text.data(), std::uint32_t(text.size()), 0, row});
-        }
-        sortRest(entries.data(), entries.data() + entries.size(), 0);
-        for (const Entry &entry : entries)
-            result.push_back(entry.row);
-        return result;
-    }
-
-private:
-    static constexpr int deepest = 64; // beyond so many times eight letters texts are compared
-
-    /// False if the rest of the text has to be sorted by its sort key.
-    bool takeKey(Entry &entry) const
-    {
-        std::size_t used = 0;
-        const bool latin = mCollation.sortPrefix({entry.rest, entry.restSize}, entry.key, used);
-        const auto letters = 8 - std::size_t(std::countr_zero(entry.key)) / 8;
-        entry.accented |= used > letters;
-        entry.rest += used;
-        entry.restSize -= std::uint32_t(used);
-        return latin;
-    }
-
-    bool before(const Entry &a, const Entry &b) const
-    {
-        const auto x = mTexts[a.row], y = mTexts[b.row];
-        const int order = x == y ? 0 : mCollation.compare(x, y);
-        return order != 0 ? order < 0 : a.row < b.row;
-    }
-
-    /// Sorts entries whose texts have been alike up to their rests.
-    void sortRest(Entry *from, Entry *to, int depth) const
-    {
-        Entries others;
-        Entry *end = from;
-        for (Entry *entry = from; entry < to; ++entry) {
-            if (takeKey(*entry))
-                *end++ = *entry;
-            else
-                others.push_back(*entry);
-        }
-        sortLatin(from, end, depth);
-        if (!others.empty()) {
-            sortBySortKeys(others);
-            mergeIn(from, end, others);
-        }
-    }
-
-    void sortLatin(Entry *from, Entry *to, int depth) const
-    {
-        if (!std::is_sorted(from, to, ByKey()))
-            std::sort(from, to, ByKey());
-        while (from < to) {
-            Entry *end = from + 1;
-            while (end < to && end->key == from->key)
-                ++end;
-            if (end - from > 1)
-                sortRun(from, end, depth);
-            from = end;
-        }
-    }
-
-    /// Sorts entries with the same key.
-    void sortRun(Entry *from, Entry *to, int depth) const
-    {
-        const bool ended = (from->key & 0xFF) == 0;
-        if (!ended && depth < deepest)
-            sortRest(from, to, depth + 1);
-        else if (!ended || std::any_of(from, to, [](const Entry &e) { return e.accented; }))
-            sortAsTexts(from, to);
-    }
-
-    void sortAsTexts(Entry *from, Entry *to) const
-    {
-        const auto less = [this](const Entry &a, const Entry &b) { return before(a, b); };
-        if (!std::is_sorted(from, to, less)) // mostly they are all the same
-            std::sort(from, to, less);
-    }
-
-    void sortBySortKeys(Entries &entries) const
-    {
-        std::string keys;
-        for (Entry &entry : entries) {
-            entry.key = keys.size();
-            mCollation.appendSortKey(mTexts[entry.row], keys);
-        }
-        for (Entry &entry : entries) {
-            entry.rest = keys.data() + entry.key;
-            char start[sizeof entry.key] = {};
-            std::memcpy(start, entry.rest, strnlen(entry.rest, sizeof start));
-            entry.key = qFromBigEndian<quint64>(start);
-        }
-        std::sort(entries.begin(), entries.end(), [](const Entry &a, const Entry &b) {
-            if (a.key != b.key)
-                return a.key < b.key;
-            const int order = std::strcmp(a.rest, b.rest);
-            return order != 0 ? order < 0 : a.row < b.row;
-        });
-    }
-
-    /// Merges the others, which fit behind the end, into [from, end), from the last one on. Looks
-    /// for the place of each in growing steps: there are mostly few of them.
-    void mergeIn(Entry *from, Entry *end, const Entries &others) const
-    {
-        const auto less = [this](const Entry &a, const Entry &b) { return before(a, b); };
-        Entry *to = end + others.size();
-        for (auto other = others.rbegin(); other != others.rend(); ++other) {
-            std::ptrdiff_t step = 1;
-            while (step <= end - from && less(*other, end[-step]))
-                step *= 2;
-            Entry *place =
-                std::upper_bound(std::max(from, end - step), end - step / 2, *other, less);
-            to = std::move_backward(place, end, to);
-            *--to = *other;
-            end = place;
-        }
-    }
-
-    const ColumnTexts &mTexts;
-    const text::Collation &mCollation = text::Collation::root();
-};
-
 /// The order by value; nothing if a text is no whole number.
 std::optional<std::vector<Row>> byNumber(const ColumnTexts &texts)
 {
@@ -243,7 +83,7 @@ std::optional<std::vector<Row>> byNumber(const ColumnTexts &texts)
     for (Row row = 0; row < texts.count(); ++row) {
         if (texts.isInteger(row)) {
             numbers.push_back({sortableNumber(texts.integer(row)), nullptr, 0, 0, row});
-        } else if (const auto text = texts[row]; text.empty()) {
+        } else if (const auto text = texts.text(row); text.empty()) {
             result.push_back(row);
         } else if (const auto value = wholeNumber(text)) {
             numbers.push_back({sortableNumber(*value), nullptr, 0, 0, row});
@@ -251,8 +91,26 @@ std::optional<std::vector<Row>> byNumber(const ColumnTexts &texts)
             return {};
         }
     }
-    std::sort(numbers.begin(), numbers.end(), ByKey());
-    for (const Entry &entry : numbers)
+    std::sort(numbers.begin(), numbers.end(), ADODB::ByKey());
+    for (const auto &entry : numbers)
+        result.push_back(entry.row);
+    return result;
+}
+
+std::vector<Row> byText(const ColumnTexts &texts)
+{
+    std::vector<Row> result;
+    result.reserve(texts.count());
+    Entries entries;
+    entries.reserve(texts.count());
+    for (Row row = 0; row < texts.count(); ++row) {
+        if (texts.text(row).empty())
+            result.push_back(row);
+        else
+            entries.push_back({0, nullptr, 0, 0, row});
+    }
+    ADODB::TextSort(texts).sort(entries.data(), entries.data() + entries.size());
+    for (const auto &entry : entries)
         result.push_back(entry.row);
     return result;
 }
@@ -266,5 +124,5 @@ std::vector<std::uint32_t> sortedRows(const ADODB::Rows &rows, int column,
     if (auto order = byNumber(texts))
         return *std::move(order);
     texts.spellNumbers();
-    return TextSort(texts).sorted();
+    return byText(texts);
 }

@@ -1,32 +1,20 @@
 #include "platform/ado/connection.h"
 
 #include "platform/ado/dialect.h"
+#include "platform/ado/preparedstatements.h"
 #include "platform/ado/recordset.h"
+#include "platform/ado/roworder.h"
 #include "platform/ado/sqlfunctions.h"
 
 #include <QStringList>
 #include <algorithm>
 #include <sqlite3.h>
-#include <unordered_map>
 
 namespace ADODB
 {
 
 namespace
 {
-
-constexpr std::size_t preparedAtMost = 200;
-
-struct Finalize {
-    void operator()(sqlite3_stmt *s) const { sqlite3_finalize(s); }
-};
-
-struct Prepared {
-    std::unique_ptr<sqlite3_stmt, Finalize> statement;
-    std::shared_ptr<const FieldList> fields;
-    bool readOnly = false;
-    int timesPrepared = 0; // by the engine itself, after the tables were changed
-};
 
 // A statement goes back to its start on every way out, so that it holds no lock and no value.
 class Running
@@ -43,16 +31,8 @@ private:
     sqlite3_stmt *mStatement;
 };
 
-std::shared_ptr<const FieldList> fieldsOf(sqlite3_stmt *s)
-{
-    auto fields = std::make_shared<FieldList>();
-    for (int i = 0; i < sqlite3_column_count(s); ++i)
-        fields->push_back({QString::fromUtf8(sqlite3_column_name(s, i)), adVarWChar, 0});
-    return fields;
-}
-
 // The first step finds out whether the tables are still those that the statement was prepared for.
-int firstStep(Prepared &prepared)
+int firstStep(PreparedStatement &prepared)
 {
     sqlite3_stmt *s = prepared.statement.get();
     const int code = sqlite3_step(s);
@@ -104,12 +84,19 @@ void readRow(sqlite3_stmt *s, Rows &rows)
     }
 }
 
+std::vector<std::uint32_t> firstOf(std::vector<std::uint32_t> order, int atMost)
+{
+    if (atMost >= 0 && std::size_t(atMost) < order.size())
+        order.resize(std::size_t(atMost));
+    return order;
+}
+
 } // namespace
 
 struct Connection::Engine {
     sqlite3 *db = nullptr;
     Dialect dialect;
-    std::unordered_map<std::string, Prepared> prepared;
+    PreparedStatements prepared;
 
     // The transaction: who has it, and whether its routine has ended without closing it.
     std::vector<Transaction *> routines;
@@ -124,31 +111,7 @@ struct Connection::Engine {
 
     bool abandoned() const { return transactionOpen && routines.empty(); }
     int exec(const char *sql) const { return sqlite3_exec(db, sql, nullptr, nullptr, nullptr); }
-    Prepared &prepare(const std::string &sql, int &code);
 };
-
-Prepared &Connection::Engine::prepare(const std::string &sql, int &code)
-{
-    code = SQLITE_OK;
-    if (const auto it = prepared.find(sql); it != prepared.end())
-        return it->second;
-    if (prepared.size() >= preparedAtMost)
-        prepared.clear();
-    sqlite3_stmt *s = nullptr;
-    code =
-        sqlite3_prepare_v3(db, sql.data(), int(sql.size()), SQLITE_PREPARE_PERSISTENT, &s, nullptr);
-    Prepared p;
-    p.statement.reset(s);
-    if (code == SQLITE_OK && !s)
-        code = SQLITE_ERROR;
-    if (code != SQLITE_OK) {
-        static Prepared none;
-        return none;
-    }
-    p.fields = fieldsOf(s);
-    p.readOnly = sqlite3_stmt_readonly(s);
-    return prepared.emplace(sql, std::move(p)).first->second;
-}
 
 Connection::Connection() = default;
 
@@ -270,22 +233,26 @@ std::shared_ptr<const Rows> Connection::run(const QString &statement, int atMost
         throw;
     }
     int code = SQLITE_OK;
-    Prepared &prepared = mEngine->prepare(mEngine->dialect.sql(), code);
+    PreparedStatement *prepared =
+        mEngine->prepared.prepare(mEngine->db, mEngine->dialect.sql(), code);
     check(code);
-    settleBefore(prepared.readOnly);
-    sqlite3_stmt *s = prepared.statement.get();
+    settleBefore(prepared->readOnly);
+    sqlite3_stmt *s = prepared->statement.get();
     const Running running(s);
     check(bind(s, mEngine->dialect));
-    code = firstStep(prepared);
+    code = firstStep(*prepared);
     std::shared_ptr<Rows> rows; // none for a change
-    if (!prepared.fields->empty())
-        rows = std::make_shared<Rows>(prepared.fields);
+    if (!prepared->fields->empty())
+        rows = std::make_shared<Rows>(prepared->fields);
+    const bool ordered = prepared->order.empty();
     for (; code == SQLITE_ROW; code = sqlite3_step(s)) {
         readRow(s, *rows);
-        if (rows->rowCount() == atMost)
+        if (ordered && rows->rowCount() == atMost)
             break;
     }
     check(code);
+    if (!ordered)
+        rows->arrange(firstOf(rowOrder(*rows, prepared->order), atMost));
     return rows;
 }
 

@@ -86,6 +86,32 @@ bool isOneOf(QStringView word, std::initializer_list<const char *> keywords)
                        [&](const char *k) { return is(word, QLatin1String(k)); });
 }
 
+// Whether the name of a column at this place, which all behind it belongs to, begins a condition.
+bool isCondition(std::string_view sql, std::size_t nameAt)
+{
+    const auto last = sql.find_last_not_of(' ');
+    if (nameAt == 0 || last < nameAt || !inWord(QLatin1Char(sql[last])))
+        return false;
+    const auto before = sql.substr(0, nameAt);
+    const auto end = before.find_last_not_of(' ') + 1;
+    auto begin = end;
+    while (begin > 0 && inWord(QLatin1Char(sql[begin - 1])))
+        --begin;
+    const QString word = QLatin1String(sql.data() + begin, qsizetype(end - begin)).toString();
+    const bool first = end > 0 && sql[end - 1] == '(';
+    const bool name = !sql.substr(nameAt).starts_with("not ");
+    return name && (first || isOneOf(word, {"where", "and", "or"}));
+}
+
+// Whether a condition may end here: what comes next is no part of it.
+bool conditionEnds(QStringView s, qsizetype at)
+{
+    at = skipBlanks(s, at);
+    const QChar c = charAt(s, at);
+    return c.isNull() || c == u')' || c == u';' ||
+           isOneOf(s.sliced(at, wordEnd(s, at) - at), {"and", "or", "order", "group"});
+}
+
 } // namespace
 
 void Dialect::refuse(const QString &why) const
@@ -164,7 +190,12 @@ void Dialect::word(QStringView s)
     }
     if (is(w, QLatin1String("max")) && maxOfSum(s))
         return;
+    if (is(w, QLatin1String("like")) && likeText(s, w))
+        return;
     deleteAlias(w);
+    const auto last = mSql.find_last_not_of(' ');
+    if (last == std::string::npos || mSql[last] != '.')
+        mNameAt = mSql.size();
     appendUtf8(mSql, w);
     afterWord(s, w);
 }
@@ -222,6 +253,22 @@ void Dialect::deleteAlias(QStringView w)
     case Delete::Done:
         break;
     }
+}
+
+// "a.name like 'text'" becomes "unlikely(a.name like ?)", if it is a condition of its own.
+bool Dialect::likeText(QStringView s, QStringView w)
+{
+    const auto from = skipBlanks(s, mAt);
+    const auto end = charAt(s, from) == u'\'' ? closingQuote(s, from) : -1;
+    if (!mLifts || end < 0 || !isCondition(mSql, mNameAt) || !conditionEnds(s, end + 1))
+        return false;
+    mSql.insert(mNameAt, "unlikely(");
+    appendUtf8(mSql, w);
+    mSql.push_back(' ');
+    mAt = from;
+    quoted(s);
+    mSql.push_back(')');
+    return true;
 }
 
 void Dialect::quoted(QStringView s)

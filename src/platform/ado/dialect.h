@@ -10,9 +10,11 @@ namespace ADODB
 ///
 /// What it mends: the alias of a DELETE gets its "as", left() is quoted, max(id+1) becomes
 /// max(id)+1 (which an index serves), of a SHAPE command the statement in its braces is left,
-/// without repeats. What it refuses, as the engine that the statements were written for did: a
-/// second statement, a comment, anything behind the one row of VALUES, "||", parameters, numbers
-/// glued to words, commands that were not in its language (PRAGMA, ATTACH, COMMIT).
+/// without repeats. Of a column LIKE a text it says that it seldom holds, so that the engine begins
+/// a join with the table that is searched. What it refuses, as the engine that the statements were
+/// written for did: a second statement, a comment, anything behind the one row of VALUES, "||",
+/// parameters, numbers glued to words, commands that were not in its language (PRAGMA, ATTACH,
+/// COMMIT).
 class Dialect
 {
 public:
@@ -38,6 +40,7 @@ private:
     void afterWord(QStringView s, QStringView w);
     bool maxOfSum(QStringView s);
     void deleteAlias(QStringView w);
+    bool likeText(QStringView s, QStringView w);
     bool liftsHere() const { return mLifts && !mOrdinals.back(); }
     [[noreturn]] void refuse(const QString &why) const;
 
@@ -51,6 +54,7 @@ private:
     qsizetype mAt = 0;
     bool mLifts = true;          // the statement is one that may hold parameters
     bool mEnded = false;         // a ";" was seen
+    std::size_t mNameAt = 0;     // in mSql: where the last name of a column begins
     std::vector<bool> mOrdinals; // for each open parenthesis: whether behind ORDER BY or GROUP BY
     enum class Values { None, Expected, Inside, Behind } mValues = Values::None;
     enum class Delete { None, From, Table, Done } mDelete = Delete::None;

@@ -89,6 +89,17 @@ void Rows::removeRow(qsizetype row)
     mCells.erase(from, from + mColumns);
 }
 
+void Rows::arrange(const std::vector<std::uint32_t> &order)
+{
+    std::vector<Cell> cells;
+    cells.reserve(order.size() * std::size_t(mColumns));
+    for (const auto row : order) {
+        const auto from = mCells.begin() + qsizetype(row) * mColumns;
+        cells.insert(cells.end(), from, from + mColumns);
+    }
+    mCells.swap(cells);
+}
+
 std::shared_ptr<Rows> Rows::clone() const
 {
     auto copy = std::make_shared<Rows>(*this);

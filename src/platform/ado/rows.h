@@ -45,6 +45,7 @@ public:
     /// Appends a row of NULLs and gives its number.
     qsizetype addRow();
     void removeRow(qsizetype row);
+    void arrange(const std::vector<std::uint32_t> &order); // keeps these rows, in this order
     void setNull(qsizetype row, int column);
     void setInteger(qsizetype row, int column, qint64 v);
     void setReal(qsizetype row, int column, double v);

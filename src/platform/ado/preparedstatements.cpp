@@ -1,0 +1,90 @@
+#include "platform/ado/preparedstatements.h"
+
+#include "platform/ado/ordertail.h"
+#include "platform/ado/sqlfunctions.h"
+
+#include <QString>
+#include <algorithm>
+#include <sqlite3.h>
+
+namespace ADODB
+{
+
+namespace
+{
+
+constexpr std::size_t preparedAtMost = 200;
+
+int prepareOne(sqlite3 *db, std::string_view sql, PreparedStatement &prepared)
+{
+    sqlite3_stmt *s = nullptr;
+    const int code =
+        sqlite3_prepare_v3(db, sql.data(), int(sql.size()), SQLITE_PREPARE_PERSISTENT, &s, nullptr);
+    prepared.statement.reset(s);
+    return code == SQLITE_OK && !s ? SQLITE_ERROR : code;
+}
+
+// Whether rows can be sorted by a column of the result without the engine.
+bool hasOurOrder(sqlite3 *db, sqlite3_stmt *s, int column)
+{
+    const char *table = sqlite3_column_table_name(s, column);
+    const char *origin = sqlite3_column_origin_name(s, column);
+    const char *type = nullptr, *collation = nullptr;
+    if (!table || !origin)
+        return false; // an expression
+    if (sqlite3_table_column_metadata(db, sqlite3_column_database_name(s, column), table, origin,
+                                      &type, &collation, nullptr, nullptr, nullptr) != SQLITE_OK)
+        return false;
+    return sqlite3_stricmp(collation, collationName) == 0 ||
+           (type && sqlite3_stricmp(type, "INTEGER") == 0);
+}
+
+// Prepares the statement without its order, if its rows can be sorted here.
+bool prepareUnordered(sqlite3 *db, std::string_view sql, PreparedStatement &prepared)
+{
+    const auto tail = orderTail(sql);
+    if (tail.columns.empty() || prepareOne(db, sql.substr(0, tail.from), prepared) != SQLITE_OK)
+        return false;
+    sqlite3_stmt *s = prepared.statement.get();
+    const auto sortable = [&](int column) {
+        return column < sqlite3_column_count(s) && hasOurOrder(db, s, column);
+    };
+    if (!std::all_of(tail.columns.begin(), tail.columns.end(), sortable))
+        return false;
+    prepared.order = tail.columns;
+    return true;
+}
+
+} // namespace
+
+void PreparedStatement::Finalize::operator()(sqlite3_stmt *s) const
+{
+    sqlite3_finalize(s);
+}
+
+std::shared_ptr<const FieldList> fieldsOf(sqlite3_stmt *statement)
+{
+    auto fields = std::make_shared<FieldList>();
+    for (int i = 0; i < sqlite3_column_count(statement); ++i)
+        fields->push_back({QString::fromUtf8(sqlite3_column_name(statement, i)), adVarWChar, 0});
+    return fields;
+}
+
+PreparedStatement *PreparedStatements::prepare(sqlite3 *db, const std::string &sql, int &code)
+{
+    code = SQLITE_OK;
+    if (const auto it = mStatements.find(sql); it != mStatements.end())
+        return &it->second;
+    if (mStatements.size() >= preparedAtMost)
+        mStatements.clear();
+    PreparedStatement prepared;
+    if (!prepareUnordered(db, sql, prepared))
+        code = prepareOne(db, sql, prepared);
+    if (code != SQLITE_OK)
+        return nullptr;
+    prepared.fields = fieldsOf(prepared.statement.get());
+    prepared.readOnly = sqlite3_stmt_readonly(prepared.statement.get());
+    return &mStatements.emplace(sql, std::move(prepared)).first->second;
+}
+
+} // namespace ADODB

@@ -1,0 +1,46 @@
+#pragma once
+
+#include "platform/ado/rows.h"
+
+#include <memory>
+#include <string>
+#include <unordered_map>
+#include <vector>
+
+struct sqlite3;
+struct sqlite3_stmt;
+
+namespace ADODB
+{
+
+struct PreparedStatement {
+    struct Finalize {
+        void operator()(sqlite3_stmt *s) const;
+    };
+    std::unique_ptr<sqlite3_stmt, Finalize> statement;
+    std::shared_ptr<const FieldList> fields;
+    bool readOnly = false;
+    int timesPrepared = 0; // by the engine itself, after the tables were changed
+
+    /// The columns by which the rows are still to be sorted: a statement that ends in "order by
+    /// 1,2" is run without it where all of its columns are in the program's order of texts. The
+    /// rows are in memory anyway, sorting them there takes half the time, and the engine is free to
+    /// join as is fastest.
+    std::vector<int> order;
+};
+
+/// The statements that a connection has prepared, by their texts.
+class PreparedStatements
+{
+public:
+    /// nullptr if it cannot be prepared; `code` is the engine's answer.
+    PreparedStatement *prepare(sqlite3 *db, const std::string &sql, int &code);
+    void clear() { mStatements.clear(); }
+
+private:
+    std::unordered_map<std::string, PreparedStatement> mStatements;
+};
+
+std::shared_ptr<const FieldList> fieldsOf(sqlite3_stmt *statement);
+
+} // namespace ADODB

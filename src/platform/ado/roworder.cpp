@@ -1,0 +1,117 @@
+#include "platform/ado/roworder.h"
+
+#include "platform/ado/textsort.h"
+
+#include <algorithm>
+
+namespace ADODB
+{
+
+namespace
+{
+
+class ColumnTexts : public RowTexts
+{
+public:
+    ColumnTexts(const Rows &rows, int column) : mRows(rows), mColumn(column) {}
+    std::string_view text(std::uint32_t row) const override { return mRows.utf8(row, mColumn); }
+
+private:
+    const Rows &mRows;
+    int mColumn;
+};
+
+/// Sorts by one column after the other: those behind the first only where rows are alike so far.
+class RowOrder
+{
+public:
+    RowOrder(const Rows &rows, const std::vector<int> &columns) : mRows(rows), mColumns(columns) {}
+
+    std::vector<std::uint32_t> sorted() const
+    {
+        std::vector<SortEntry> entries(std::size_t(mRows.rowCount()));
+        for (std::size_t row = 0; row < entries.size(); ++row)
+            entries[row].row = std::uint32_t(row);
+        sort(entries.data(), entries.data() + entries.size(), 0);
+        std::vector<std::uint32_t> order(entries.size());
+        std::transform(entries.begin(), entries.end(), order.begin(),
+                       [](const SortEntry &e) { return e.row; });
+        return order;
+    }
+
+private:
+    using Entry = SortEntry;
+    using Kind = Rows::Kind;
+
+    void sort(Entry *from, Entry *to, std::size_t level) const
+    {
+        if (to - from < 2)
+            return;
+        if (level == mColumns.size()) {
+            std::sort(from, to, [](const Entry &a, const Entry &b) { return a.row < b.row; });
+            return;
+        }
+        const int column = mColumns[level];
+        const auto kind = [&](const Entry &e) { return mRows.kind(e.row, column); };
+        Entry *numbers =
+            std::partition(from, to, [&](const Entry &e) { return kind(e) == Kind::Null; });
+        Entry *texts =
+            std::partition(numbers, to, [&](const Entry &e) { return kind(e) != Kind::Text; });
+        sort(from, numbers, level + 1);
+        sortNumbers(numbers, texts, level);
+        sortTexts(texts, to, level);
+    }
+
+    // Wide enough for all whole numbers of 64 bits.
+    long double number(std::uint32_t row, int column) const
+    {
+        if (mRows.kind(row, column) == Kind::Integer)
+            return static_cast<long double>(mRows.integer(row, column));
+        return static_cast<long double>(std::get<double>(mRows.value(row, column).variant()));
+    }
+
+    void sortNumbers(Entry *from, Entry *to, std::size_t level) const
+    {
+        const int column = mColumns[level];
+        std::sort(from, to, [&](const Entry &a, const Entry &b) {
+            return number(a.row, column) < number(b.row, column);
+        });
+        sortRuns(from, to, level, [&](const Entry &a, const Entry &b) {
+            return number(a.row, column) == number(b.row, column);
+        });
+    }
+
+    void sortTexts(Entry *from, Entry *to, std::size_t level) const
+    {
+        const ColumnTexts texts(mRows, mColumns[level]);
+        TextSort(texts).sort(from, to);
+        sortRuns(from, to, level, [&](const Entry &a, const Entry &b) {
+            const auto x = texts.text(a.row), y = texts.text(b.row);
+            return x == y || text::Collation::root().compare(x, y) == 0;
+        });
+    }
+
+    template <typename Alike>
+    void sortRuns(Entry *from, Entry *to, std::size_t level, const Alike &alike) const
+    {
+        while (from < to) {
+            Entry *end = from + 1;
+            while (end < to && alike(*from, *end))
+                ++end;
+            sort(from, end, level + 1);
+            from = end;
+        }
+    }
+
+    const Rows &mRows;
+    const std::vector<int> &mColumns;
+};
+
+} // namespace
+
+std::vector<std::uint32_t> rowOrder(const Rows &rows, const std::vector<int> &columns)
+{
+    return RowOrder(rows, columns).sorted();
+}
+
+} // namespace ADODB

@@ -1,0 +1,15 @@
+#pragma once
+
+#include "platform/ado/rows.h"
+
+#include <cstdint>
+#include <vector>
+
+namespace ADODB
+{
+
+/// The numbers of all rows in the order that "order by" these columns gives: NULLs, numbers, then
+/// texts in the program's order of texts; rows that are alike in all of them stay as they are.
+std::vector<std::uint32_t> rowOrder(const Rows &rows, const std::vector<int> &columns);
+
+} // namespace ADODB
