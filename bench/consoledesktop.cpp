@@ -9,7 +9,7 @@ BoxAnswer ConsoleDesktop::messageBox(BoxKind kind, BoxButtons buttons, const QSt
         ++questions;
         return vbYes;
     }
-    failed = failed || kind == BoxKind::Error;
+    failed = failed || kind == BoxKind::Error || kind == BoxKind::Plain;
     std::fprintf(stderr, "[%s] %s\n", qUtf8Printable(title), qUtf8Printable(text));
     return vbOK;
 }

@@ -18,9 +18,12 @@ struct Command {
 };
 
 constexpr Command commands[] = {
-    {"new", "CATALOGUE", newCatalogue},      {"browse", "CATALOGUE", browse},
-    {"read", "A|B|C|D FILE", readText},      {"load", "CATALOGUE A|B|C|D FILE", loadText},
+    {"new", "CATALOGUE", newCatalogue},
+    {"browse", "CATALOGUE", browse},
+    {"read", "A|B|C|D FILE", readText},
+    {"load", "CATALOGUE A|B|C|D FILE", loadText},
     {"orphans", "CATALOGUE", removeOrphans},
+    {"search", "CATALOGUE part|full|begin|end artist|title|genre|year|three WORD", search},
 };
 
 int usage()

@@ -10,3 +10,4 @@ void browse(const QStringList &arguments);        // CATALOGUE
 void readText(const QStringList &arguments);      // FORMAT FILE
 void loadText(const QStringList &arguments);      // CATALOGUE FORMAT FILE
 void removeOrphans(const QStringList &arguments); // CATALOGUE
+void search(const QStringList &arguments);        // CATALOGUE MODE FIELD WORD

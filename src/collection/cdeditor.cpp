@@ -411,6 +411,17 @@ void CdEditor::goToTab(int tab)
     changeDisc(leftBehind);
 }
 
+void CdEditor::GoToTrack(int disc, int track)
+{
+    if (mBusy || disc < 1 || disc > mControls.discs->count())
+        return;
+    const QScopedValueRollback<bool> busy(mBusy, true);
+    goToTab(disc - 1);
+    mControls.disk->setCurrentRow(track);
+    mControls.disk->setCurrentColumn(1);
+    focusDisk();
+}
+
 // By design: the disc left behind is saved without a question; and after an error the hourglass
 // stays.
 void CdEditor::changeDisc(int leftBehind)

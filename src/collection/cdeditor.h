@@ -34,6 +34,10 @@ public:
     /// The save command: the grid's cursor stays where it is.
     void SaveKeepingPosition();
 
+    /// Shows a disc, as a click on its tab does, with the cursor on a track. Both count from 1;
+    /// what is not there is left alone.
+    void GoToTrack(int disc, int track);
+
 protected:
     struct Controls {
         HeaderFields::Fields fields;

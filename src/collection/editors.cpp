@@ -10,12 +10,13 @@ namespace editors
 namespace
 {
 
-template <typename Editor> void open(const QString &mode, qint64 id)
+template <typename Editor> CdEditor *open(const QString &mode, qint64 id)
 {
     auto *editor = new Editor;
     editor->Mode = mode;
     editor->CdId = id;
     editor->Show();
+    return editor;
 }
 
 // A new record may still carry the id of a save that was taken back; it is not that record.
@@ -29,12 +30,13 @@ template <typename Editor> Editor *find(qint64 id)
     return nullptr;
 }
 
-template <typename Editor> void edit(qint64 id)
+template <typename Editor> CdEditor *edit(qint64 id)
 {
-    if (Editor *editor = find<Editor>(id))
-        editor->Show();
-    else
-        open<Editor>(QStringLiteral("U"), id);
+    Editor *editor = find<Editor>(id);
+    if (!editor)
+        return open<Editor>(QStringLiteral("U"), id);
+    editor->Show();
+    return editor;
 }
 
 } // namespace
@@ -57,6 +59,13 @@ void editCompilation(qint64 id)
 void editAlbum(qint64 id)
 {
     edit<frmCDRootE>(id);
+}
+
+void editTrack(bool isCompilation, qint64 id, int disc, int track)
+{
+    CdEditor *editor = isCompilation ? edit<frmCDRoot>(id) : edit<frmCDRootE>(id);
+    if (!editor->isUnloaded())
+        editor->GoToTrack(disc, track);
 }
 
 // One may go while the events of another are handled.

@@ -13,6 +13,9 @@ void newAlbum();
 void editCompilation(qint64 id);
 void editAlbum(qint64 id);
 
+/// Brings up the editor of a record at one of its tracks, both counted from 1.
+void editTrack(bool isCompilation, qint64 id, int disc, int track);
+
 /// Saves what is open in editors, in the order in which they were opened.
 void saveAll();
 

@@ -4,6 +4,7 @@
 #include "catalogue/provision.h"
 #include "collection/editors.h"
 #include "collection/frmCDList.h"
+#include "collection/frmSearchArtistsTitles.h"
 #include "platform/ado/connection.h"
 #include "shell/frmHelp.h"
 #include "shell/frmSplash.h"
@@ -141,6 +142,9 @@ void MainScreen::connectActions()
     on(mUi->tbImport, importText);
     on(mUi->mnuSave, &editors::saveAll);
     on(mUi->tbSave, &editors::saveAll);
+    const auto searchTracks = [] { defaultInstance<frmSearchArtistsTitles>().Show(); };
+    on(mUi->mnuSearchArtistsTitles, searchTracks);
+    on(mUi->tbQuicksearch, searchTracks);
     on(mUi->mnuCDInsert, &editors::newCompilation);
     on(mUi->mnuInsertEnkelCD, &editors::newAlbum);
     on(mUi->mnuUpdate, &MainScreen::openBrowser);

@@ -34,6 +34,11 @@ void errorBox(const QString &text, const QString &title)
     box(BoxKind::Error, BoxButtons::Ok, text, title);
 }
 
+void plainBox(const QString &text)
+{
+    box(BoxKind::Plain, BoxButtons::Ok, text, {});
+}
+
 void informationBox(const QString &text, const QString &title)
 {
     box(BoxKind::Information, BoxButtons::Ok, text, title);

@@ -7,7 +7,7 @@
 
 class Form;
 
-enum class BoxKind { Error, Information, Question };
+enum class BoxKind { Error, Information, Question, Plain }; // Plain: without a picture
 enum class BoxButtons { Ok, YesNo, YesNoCancel };
 
 /// The answers of a box, with the numbers that the screens keep.
@@ -55,6 +55,7 @@ void setBoxTitle(const QString &title);
 
 /// The shorthands that the screens use.
 void errorBox(const QString &text, const QString &title = {});
+void plainBox(const QString &text);
 void informationBox(const QString &text, const QString &title = {});
 BoxAnswer askYesNo(const QString &text, const QString &title = {});
 BoxAnswer askYesNoCancel(const QString &text, const QString &title = {});

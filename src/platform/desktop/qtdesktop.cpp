@@ -61,6 +61,8 @@ QMessageBox::Icon iconOf(BoxKind kind)
 {
     if (kind == BoxKind::Error)
         return QMessageBox::Critical;
+    if (kind == BoxKind::Plain)
+        return QMessageBox::NoIcon;
     return kind == BoxKind::Question ? QMessageBox::Question : QMessageBox::Information;
 }
 

@@ -1,0 +1,51 @@
+#include "collection/foundtrack.h"
+
+#include "catalogue/quoting.h"
+#include "platform/ado/recordset.h"
+#include "platform/text/textrules.h"
+#include "shell/services/globals.h"
+
+namespace
+{
+
+const auto selectRecords =
+    QStringLiteral("select cdt.id as ID, cdt.cd_type as type from artiesten as art, tracks as trk,"
+                   " cdtitels as cdt, compactdiscs as vcd where trk.artiest_id = art.id"
+                   " and cdt.id = vcd.cdtitels_id and trk.id = vcd.track_id");
+
+QString is(const char *column, const QString &text)
+{
+    const QLatin1String name(column);
+    if (text.isEmpty())
+        return QLatin1String(" and (") + name + QLatin1String(" is null or ") + name +
+               QLatin1String(" = '')");
+    return QLatin1String(" and ") + name + QLatin1String(" = ") +
+           (text::isNumeric(text) ? text : quoted(text));
+}
+
+QString isText(const char *column, const QString &text)
+{
+    if (text.isEmpty())
+        return is(column, text);
+    return QLatin1String(" and ") + QLatin1String(column) + QLatin1String(" = ") + quoted(text);
+}
+
+QString selectRecord(const FoundTrack &track)
+{
+    return selectRecords + isText("art.naam", track.artist) + isText("trk.titel", track.title) +
+           isText("cdt.titel", track.cdTitle) + is("vcd.diskno", track.disc) +
+           is("vcd.trackno", track.track) +
+           isText("iif(cdt.cd_type='V','Compilation','Album')", track.type) +
+           QLatin1String(" order by cdt.id");
+}
+
+} // namespace
+
+FoundRecord findRecord(const FoundTrack &track)
+{
+    auto records = gConnection->firstRows(selectRecord(track), 1);
+    if (records.isEOF())
+        return {};
+    const QString type = records.Fields(u"type").Value().toText();
+    return {records.Fields(u"ID").Value().toLong(), type == QLatin1String("V")};
+}

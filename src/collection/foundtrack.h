@@ -1,0 +1,17 @@
+#pragma once
+
+#include <QString>
+
+/// A track on a disc as a row of a search result shows it; empty texts stand for NULL too.
+struct FoundTrack {
+    QString artist, title, disc, track, cdTitle, type;
+};
+
+/// The record that holds such a track.
+struct FoundRecord {
+    qint64 id = 0; // CDTitels.ID; 0: there is none any more
+    bool isCompilation = false;
+};
+
+/// Looks the record up by what the row shows; of several equal ones the first. Throws ADODB::Error.
+FoundRecord findRecord(const FoundTrack &track);

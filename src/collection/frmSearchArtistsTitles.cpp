@@ -1,0 +1,325 @@
+#include "collection/frmSearchArtistsTitles.h"
+
+#include "collection/editors.h"
+#include "collection/foundtrack.h"
+#include "collection/resultlines.h"
+#include "controls/DBListViewCTL.h"
+#include "platform/desktop/desktop.h"
+#include "shell/services/captions.h"
+#include "shell/services/fileutilities.h"
+#include "shell/services/frame.h"
+#include "shell/services/globals.h"
+#include "shell/services/messages.h"
+#include "shell/services/textfiles.h"
+#include "textimport/throttledpump.h"
+#include "ui_frmSearchArtistsTitles.h"
+
+#include <QKeyEvent>
+
+namespace
+{
+
+constexpr int keyEnter = 13;
+
+/// The columns of the result, in the order of the statement's fields.
+enum Column { Artist, Title, DiscNumber, TrackNumber, CdTitle, Genre, HitYear, Type, columnCount };
+
+struct {
+    const char *head; // key
+    int share;        // of the list's width, in thirteenths
+} const columns[columnCount] = {{"Artiest", 3},  {"Titel", 3}, {"Disc", 1},    {"Track", 1},
+                                {"CD-Titel", 2}, {"Genre", 1}, {"HitYear", 1}, {"Type", 1}};
+constexpr int shares = 13;
+
+QStringList textsOf(const ListItem &item)
+{
+    QStringList texts;
+    for (int column = 0; column < columnCount; ++column)
+        texts.append(item.SubItems(column));
+    return texts;
+}
+
+} // namespace
+
+frmSearchArtistsTitles::frmSearchArtistsTitles()
+    : Form(QStringLiteral("frmSearchArtistsTitles")),
+      mUi(std::make_unique<Ui::frmSearchArtistsTitles>())
+{
+    mUi->setupUi(this);
+    setCaptions();
+    connectControls();
+    setDefaultButton(mUi->cmdSearch);
+    setCancelButton(mUi->cmdCancel);
+}
+
+frmSearchArtistsTitles::~frmSearchArtistsTitles() = default;
+
+void frmSearchArtistsTitles::setCaptions()
+{
+    applyCaptions(this, {{"frmSearchArtistsTitles", "frmSearchArtistsTitlesCaption"},
+                         {"lblAnd", "And"},
+                         {"frmSearchKey", "frmSearchKeyCaption"},
+                         {"optFullWord", "optFullWordCaption"},
+                         {"optPartWord", "optPartWordCaption"},
+                         {"optBeginWord", "optBeginWordCaption"},
+                         {"optEndWord", "optEndWordCaption"},
+                         {"cmdSearch", "cmdSearchCaption"},
+                         {"cmdExport", "xExport"},
+                         {"cmdCancel", "cmdCancelCaption"}});
+    const std::pair<QLabel *, const char *> labels[] = {{mUi->lblArtist, "Artiest"},
+                                                        {mUi->lblTitle, "Titel"},
+                                                        {mUi->lblGenre, "Genre"},
+                                                        {mUi->lblYears, "HitYearBetween"}};
+    for (const auto &[label, key] : labels)
+        label->setText(GetMessage(key) + u':');
+    mUi->ResultList->setAccessibleName(GetMessage("xFoundTracks"));
+}
+
+void frmSearchArtistsTitles::connectControls()
+{
+    DBListViewCTL *list = mUi->ResultList;
+    connect(mUi->cmdSearch, &QPushButton::clicked, this, &frmSearchArtistsTitles::cmdSearch_Click);
+    connect(mUi->cmdExport, &QPushButton::clicked, this, &frmSearchArtistsTitles::cmdExport_Click);
+    connect(mUi->cmdCancel, &QPushButton::clicked, this, &frmSearchArtistsTitles::cmdCancel_Click);
+    connect(list, &DBListViewCTL::ColumnClick, this,
+            &frmSearchArtistsTitles::ResultList_ColumnClick);
+    connect(list, &DBListViewCTL::KeyDown, this, &frmSearchArtistsTitles::ResultList_KeyDown);
+    connect(list, &DBListViewCTL::DblClick, this, [this, list] { openDisc(list->SelectedItem()); });
+    list->viewport()->installEventFilter(this);
+}
+
+// The columns are there from the start.
+void frmSearchArtistsTitles::Form_Load()
+{
+    auto empty = std::make_shared<ADODB::Recordset>();
+    for (const auto &column : columns)
+        empty->appendField(QLatin1String(column.head), ADODB::adVarWChar);
+    empty->Open();
+    mUi->ResultList->setRecordset(empty);
+    mUi->ResultList->Populate();
+    mUi->ResultList->setEnabled(false);
+    setColumns();
+}
+
+void frmSearchArtistsTitles::cmdSearch_Click()
+{
+    Desktop::current().setPointer(this, vbHourglass);
+    mUi->StatusBar->showMessage(GetMessage("BusySearching"));
+    mUi->StatusBar->repaint();
+    const SearchKey wanted = key();
+    if (!checkYears(wanted))
+        return;
+    try {
+        freezeFrame();
+        show(wanted);
+    } catch (const ADODB::Error &error) {
+        // By design: the wait cursor stays.
+        plainBox(error.numbered());
+    }
+}
+
+SearchKey frmSearchArtistsTitles::key() const
+{
+    SearchKey key;
+    if (mUi->optFullWord->isChecked())
+        key.mode = SearchKey::FullWord;
+    else if (mUi->optBeginWord->isChecked())
+        key.mode = SearchKey::BeginWord;
+    else if (mUi->optEndWord->isChecked())
+        key.mode = SearchKey::EndWord;
+    key.artist = mUi->txtArtistKey->text();
+    key.title = mUi->txtTitleKey->text();
+    key.genre = mUi->txtGenre->text();
+    key.firstYear = mUi->txtHitjaarvan->text();
+    key.lastYear = mUi->txtHitjaartm->text();
+    return key;
+}
+
+bool frmSearchArtistsTitles::checkYears(const SearchKey &key)
+{
+    const bool first = !key.firstYear.isEmpty(), last = !key.lastYear.isEmpty();
+    if (first && !isSearchYear(key.firstYear))
+        refuse("MsgInvalidYearBetween", mUi->txtHitjaarvan);
+    else if (last && !isSearchYear(key.lastYear))
+        refuse("MsgInvalidYearBetween", mUi->txtHitjaartm);
+    else if (first && last && key.firstYear.toDouble() > key.lastYear.toDouble())
+        refuse("MsgFirstYearBeforeLastYear", mUi->txtHitjaarvan);
+    else
+        return true;
+    return false;
+}
+
+// By design: the list and the words of the panel stay as they are.
+void frmSearchArtistsTitles::refuse(const char *message, QLineEdit *field)
+{
+    errorBox(GetMessage(message));
+    field->setFocus();
+    field->selectAll();
+    Desktop::current().setPointer(this, vbDefault);
+}
+
+void frmSearchArtistsTitles::show(const SearchKey &key)
+{
+    if (!gConnection)
+        throw ADODB::makeError(ADODB::errObjectClosed);
+    const auto found = std::make_shared<ADODB::Recordset>();
+    found->Open(searchStatement(key), *gConnection);
+    mUi->ResultList->setRecordset(found);
+    mUi->ResultList->Populate();
+    setColumns();
+    showFound(found->RecordCount());
+    found->Close();
+    releaseFrame();
+}
+
+void frmSearchArtistsTitles::setColumns()
+{
+    auto headers = mUi->ResultList->ColumnHeaders();
+    for (int column = 0; column < columnCount; ++column)
+        headers.Item(column + 1).setText(GetMessage(columns[column].head));
+    setColumnWidths();
+}
+
+void frmSearchArtistsTitles::setColumnWidths()
+{
+    auto headers = mUi->ResultList->ColumnHeaders();
+    const int room = mUi->ResultList->viewport()->width();
+    int used = 0, from = 0;
+    for (int column = 0; column < headers.Count(); ++column) {
+        used += columns[column].share;
+        const int to = room * used / shares;
+        headers.Item(column + 1).setWidth(to - from);
+        from = to;
+    }
+}
+
+// With the size of the form, and when a scroll bar comes or goes.
+bool frmSearchArtistsTitles::eventFilter(QObject *watched, QEvent *event)
+{
+    if (event->type() == QEvent::Resize)
+        setColumnWidths();
+    return Form::eventFilter(watched, event);
+}
+
+void frmSearchArtistsTitles::showFound(qsizetype count)
+{
+    mUi->StatusBar->showMessage(GetMessage("NumberFound") + QString::number(count));
+    Desktop::current().setPointer(this, vbDefault);
+    mUi->ResultList->setEnabled(count > 0);
+    mUi->cmdExport->setEnabled(count > 0);
+    if (count > 0)
+        mUi->ResultList->setFocus();
+    else
+        mUi->txtArtistKey->setFocus();
+}
+
+void frmSearchArtistsTitles::ResultList_ColumnClick(int column)
+{
+    mUi->ResultList->setSorted(true);
+    mUi->ResultList->setSortKey(column - 1);
+}
+
+void frmSearchArtistsTitles::ResultList_KeyDown(int keyCode, int shift)
+{
+    if (keyCode == keyEnter && shift == 0)
+        openDisc(mUi->ResultList->SelectedItem());
+}
+
+// Enter on a row is the row's: it does not search.
+void frmSearchArtistsTitles::keyPressEvent(QKeyEvent *event)
+{
+    const bool enter = event->key() == Qt::Key_Return || event->key() == Qt::Key_Enter;
+    if (!enter || focusWidget() != mUi->ResultList)
+        Form::keyPressEvent(event);
+}
+
+void frmSearchArtistsTitles::openDisc(const ListItem &item)
+{
+    if (!item || !gConnection)
+        return;
+    const QStringList texts = textsOf(item);
+    try {
+        const FoundRecord record = findRecord({texts[Artist], texts[Title], texts[DiscNumber],
+                                               texts[TrackNumber], texts[CdTitle], texts[Type]});
+        if (record.id == 0)
+            informationBox(GetMessage("xTrackGone"));
+        else
+            editors::editTrack(record.isCompilation, record.id, texts[DiscNumber].toInt(),
+                               texts[TrackNumber].toInt());
+    } catch (const ADODB::Error &error) {
+        plainBox(error.numbered());
+    }
+}
+
+void frmSearchArtistsTitles::cmdExport_Click()
+{
+    const QString name = Desktop::current().saveFileName({GetMessage("xExportTitle"), {}, {}, {}});
+    if (name.isEmpty() || !mayWrite(name))
+        return;
+    setExporting(true);
+    const bool written = writeResult(name);
+    setExporting(false);
+    if (mCancelled)
+        mUi->StatusBar->showMessage(GetMessage("xExportCancelled"));
+    else
+        mUi->StatusBar->showMessage(GetMessage(written ? "xExported" : "xNotExported") + name);
+}
+
+// A file that cannot be opened says no more than the panel does; what cannot be written to its end
+// does: it would pass for done.
+bool frmSearchArtistsTitles::writeResult(const QString &name)
+{
+    OutputTextFile file;
+    if (!OpenOutputFile(name, file))
+        return false;
+    auto items = mUi->ResultList->ListItems();
+    const int count = items.Count();
+    ThrottledPump pump;
+    bool written = true;
+    for (int index = 1; index <= count && written && !mCancelled; ++index) {
+        written = WriteTextLine(file, resultLine(textsOf(items.Item(index))));
+        showProgress(int(index * 100LL / count));
+        pump();
+    }
+    if (mCancelled)
+        return false;
+    written = written && CloseTextFile(file);
+    if (!written)
+        errorBox(GetMessage("xNotExported") + name);
+    return written;
+}
+
+// What is shown is what is written: nothing may change it meanwhile.
+void frmSearchArtistsTitles::setExporting(bool exporting)
+{
+    mExporting = exporting;
+    if (exporting)
+        mCancelled = false;
+    mUi->cmdSearch->setEnabled(!exporting);
+    mUi->cmdExport->setEnabled(!exporting);
+    mUi->ResultList->setEnabled(!exporting);
+    Desktop::current().setPointer(this, exporting ? vbHourglass : vbDefault);
+    if (!exporting)
+        mUi->cmdExport->setFocus();
+}
+
+void frmSearchArtistsTitles::showProgress(int percent)
+{
+    const QString text = GetMessage("xExporting") + QString::number(percent) + u'%';
+    if (text != mUi->StatusBar->currentMessage())
+        mUi->StatusBar->showMessage(text);
+}
+
+// An export is ended by it, and the form stays.
+void frmSearchArtistsTitles::cmdCancel_Click()
+{
+    if (mExporting)
+        mCancelled = true;
+    else
+        Unload();
+}
+
+bool frmSearchArtistsTitles::QueryUnload()
+{
+    return !mExporting;
+}

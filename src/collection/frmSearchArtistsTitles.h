@@ -1,0 +1,56 @@
+#pragma once
+
+#include "collection/searchstatement.h"
+#include "platform/desktop/form.h"
+
+#include <memory>
+
+class ListItem;
+class QLineEdit;
+namespace Ui
+{
+class frmSearchArtistsTitles;
+}
+
+/// Finds songs in the whole catalogue by artist, title, genre and hit year, shows on which disc
+/// each stands, and writes what was found to a text file. It only reads the catalogue.
+class frmSearchArtistsTitles : public Form
+{
+    Q_OBJECT
+
+public:
+    frmSearchArtistsTitles();
+    ~frmSearchArtistsTitles() override;
+
+protected:
+    void Form_Load() override;
+    bool QueryUnload() override;
+    void keyPressEvent(QKeyEvent *event) override;
+    bool eventFilter(QObject *watched, QEvent *event) override;
+
+private:
+    void connectControls();
+    void setCaptions();
+    void cmdSearch_Click();
+    void cmdExport_Click();
+    void cmdCancel_Click();
+    void ResultList_ColumnClick(int column);
+    void ResultList_KeyDown(int keyCode, int shift);
+
+    SearchKey key() const;
+    bool checkYears(const SearchKey &key);
+    void refuse(const char *message, QLineEdit *field);
+    void show(const SearchKey &key);
+    void setColumns();
+    void setColumnWidths();
+    void showFound(qsizetype count);
+    void openDisc(const ListItem &item);
+
+    bool writeResult(const QString &name);
+    void setExporting(bool exporting);
+    void showProgress(int percent);
+
+    std::unique_ptr<Ui::frmSearchArtistsTitles> mUi;
+    bool mExporting = false;
+    bool mCancelled = false;
+};
