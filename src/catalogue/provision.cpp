@@ -6,6 +6,7 @@
 #include "shell/services/clsRegistry.h"
 #include "shell/services/fileutilities.h"
 #include "shell/services/messages.h"
+#include "shell/services/wholefile.h"
 
 #include <QDir>
 #include <QFileInfo>
@@ -32,7 +33,7 @@ bool copyCatalogue(const QString &to)
     if (!from.open(QIODevice::ReadOnly) || !copy.open(QIODevice::WriteOnly))
         return false;
     copy.write(from.readAll());
-    return copy.commit();
+    return commitWhole(copy);
 }
 
 } // namespace

@@ -9,7 +9,7 @@ namespace
 {
 
 const auto selectRecords =
-    QStringLiteral("select cdt.id as ID, cdt.cd_type as type from artiesten as art, tracks as trk,"
+    QStringLiteral("select cdt.id as ID from artiesten as art, tracks as trk,"
                    " cdtitels as cdt, compactdiscs as vcd where trk.artiest_id = art.id"
                    " and cdt.id = vcd.cdtitels_id and trk.id = vcd.track_id");
 
@@ -30,6 +30,16 @@ QString isText(const char *column, const QString &text)
     return QLatin1String(" and ") + QLatin1String(column) + QLatin1String(" = ") + quoted(text);
 }
 
+// Numbers may have gaps.
+QString countTracks(qint64 id, const FoundTrack &track)
+{
+    return QStringLiteral(
+               "select count(*) as N from compactdiscs as vcd where vcd.cdtitels_id = ") +
+           QString::number(id) + is("vcd.diskno", track.disc) +
+           (track.track.isEmpty() ? QString()
+                                  : QString(QLatin1String(" and vcd.trackno < ") + track.track));
+}
+
 QString selectRecord(const FoundTrack &track)
 {
     return selectRecords + isText("art.naam", track.artist) + isText("trk.titel", track.title) +
@@ -46,6 +56,8 @@ FoundRecord findRecord(const FoundTrack &track)
     auto records = gConnection->firstRows(selectRecord(track), 1);
     if (records.isEOF())
         return {};
-    const QString type = records.Fields(u"type").Value().toText();
-    return {records.Fields(u"ID").Value().toLong(), type == QLatin1String("V")};
+    const qint64 id = records.Fields(u"ID").Value().toLong();
+    const bool isCompilation = track.type == QLatin1String("Compilation");
+    auto before = gConnection->Execute(countTracks(id, track));
+    return {id, isCompilation, int(before.Fields(u"N").Value().toLong()) + 1};
 }

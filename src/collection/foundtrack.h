@@ -11,6 +11,7 @@ struct FoundTrack {
 struct FoundRecord {
     qint64 id = 0; // CDTitels.ID; 0: there is none any more
     bool isCompilation = false;
+    int row = 0; // of the track on its disc, from 1
 };
 
 /// Looks the record up by what the row shows; of several equal ones the first. Throws ADODB::Error.

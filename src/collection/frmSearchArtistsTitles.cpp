@@ -245,7 +245,7 @@ void frmSearchArtistsTitles::openDisc(const ListItem &item)
             informationBox(GetMessage("xTrackGone"));
         else
             editors::editTrack(record.isCompilation, record.id, texts[DiscNumber].toInt(),
-                               texts[TrackNumber].toInt());
+                               record.row);
     } catch (const ADODB::Error &error) {
         plainBox(error.numbered());
     }

@@ -1,5 +1,7 @@
 #include "shell/services/settingsfile.h"
 
+#include "shell/services/wholefile.h"
+
 #include <QDateTime>
 #include <QDir>
 #include <QFileInfo>
@@ -103,7 +105,7 @@ template <typename Change> SettingsFile::Code SettingsFile::change(Change change
         return AccessDenied;
     file.setPermissions(QFile::ReadOwner | QFile::WriteOwner); // it may hold a password
     file.write(QJsonDocument(keys).toJson());
-    return file.commit() ? Success : AccessDenied;
+    return commitWhole(file) ? Success : AccessDenied;
 }
 
 bool SettingsFile::hasKey(const QString &key) const

@@ -1,6 +1,7 @@
 #include "shell/services/textfiles.h"
 
 #include "shell/services/fileutilities.h"
+#include "shell/services/wholefile.h"
 
 #include <QFile>
 #include <QFileInfo>
@@ -86,7 +87,7 @@ bool WriteTextLine(OutputTextFile &file, const QString &line)
 
 bool CloseTextFile(OutputTextFile &file)
 {
-    const bool done = file.mFile && file.mFile->commit();
+    const bool done = file.mFile && commitWhole(*file.mFile);
     file.mFile.reset();
     return done;
 }

@@ -126,14 +126,14 @@ void tst_TextFiles::leavesTheOldFile()
     getrlimit(RLIMIT_FSIZE, &before);
     if (diskFull) { // a limit to the size of files is a disk that is full
         signal(SIGXFSZ, SIG_IGN);
-        const rlimit little{50000, before.rlim_max};
+        const rlimit little{4000, before.rlim_max};
         setrlimit(RLIMIT_FSIZE, &little);
     }
     bool closed = false;
     {
         OutputTextFile file;
         QVERIFY(OpenOutputFile(at("out.txt"), file));
-        for (int i = 0; i < 100; ++i)
+        for (int i = 0; i < 5; ++i)
             WriteTextLine(file, QString(1000, u'x'));
         closed = diskFull && CloseTextFile(file);
     }
