@@ -1,7 +1,7 @@
 #!/usr/bin/env python3
 """Time whole programs: ours against the least that the same work can take. Prints Markdown tables.
 
-ratios.py BUILD [load] [read] [browse] [orphans] [start] [--runs 7] [--stress] [--data FOLDER]
+ratios.py BUILD [load] [read] [browse] [orphans] [search] [start] [--runs 7] [--stress] [--data FOLDER]
 
 BUILD is the folder of a release build. Without names all comparisons run. The runs of a comparison
 are interleaved, so that a busy moment of the machine hits all of its programs alike; still, only the
@@ -26,6 +26,19 @@ delete from CDTitels as cdt where not exists (select '1' from CompactDiscs where
 delete from Artiesten as art where not exists (select '1' from Tracks where Artiest_ID=art.ID)
  and not exists (select '1' from CDTitels where Artiest_ID=art.ID);
 commit;"""
+
+SELECT = """select art.naam as artiest, trk.titel as titel, vcd.diskno as disk, vcd.trackno as track,
+ cdt.titel as verzamelcd, trk.genre as genre, trk.hitjaar as hitjaar,
+ iif(cdt.cd_type='V','Compilation','Album') as type from {} where trk.artiest_id = art.id
+ and cdt.id = vcd.cdtitels_id and trk.id = vcd.track_id {} order by 1,2,5,3,4"""
+JOINS = {"as it chooses": "artiesten as art, tracks as trk, cdtitels as cdt, compactdiscs as vcd",
+         **{order: " cross join ".join({"art": "artiesten as art", "trk": "tracks as trk", "cdt": "cdtitels as cdt",
+                                        "vcd": "compactdiscs as vcd"}[name] for name in order.split())
+            for order in ("art trk vcd cdt", "trk art vcd cdt", "vcd trk art cdt")}}
+SEARCHES = {"title %maan%": ("title", "maan", "trk.titel like '%maan%'"),
+            "artist, title and genre %o%":
+                ("three", "o", "art.naam like '%o%' and trk.titel like '%o%' and trk.genre like '%o%'"),
+            "year 1985": ("year", "1985", "trk.hitjaar = 1985"), "everything": ("nothing", "", "1")}
 
 
 class Case:
@@ -63,6 +76,12 @@ def table(title, cases, runs):
         milliseconds = lambda value, _: f"{value * 1000:.1f}"
         print(f"| {case.name} | {both(case.wall, milliseconds)} | {both(case.cpu, milliseconds)} | {peak} | {ratio} |")
     sys.stdout.flush()
+
+
+def cpu_of(command):
+    case = Case("", lambda: command)
+    case.run()
+    return case.cpu[0]
 
 
 def both(values, text):
@@ -164,6 +183,18 @@ class Bench:
                   [Case("songcase-work orphans", ours), Case("sqlite3 shell, the three deletes", shell)], runs)
             self.must_agree(os.path.join(self.data, "ours"), os.path.join(self.data, "bare"))
 
+    def search(self, runs):
+        for scale in self.scales:
+            file = self.catalogue(scale)
+            for name, (field, word, condition) in SEARCHES.items():
+                shell = lambda join: self.shell(file, SELECT.format(JOINS[join], f"and {condition}"),
+                                                "-cmd", ".output /dev/null")
+                best = min(JOINS, key=lambda join: min(cpu_of(shell(join)) for _ in range(3)))
+                ours = self.program("songcase-work", "search", file, "part", field, word)
+                table(f"Search {name}, '{scale}'",
+                      [Case("songcase-work search", lambda: ours),
+                       Case(f"sqlite3 shell, its best join ({best})", lambda: shell(best))], runs)
+
     def start(self, runs):
         if not shutil.which("Xvfb") or not os.path.exists(os.path.join(self.bin, "window-watch")):
             print("\nstart: no Xvfb or no window-watch, left out")
@@ -210,7 +241,7 @@ def screen():
 
 
 def main():
-    names = ("load", "read", "browse", "orphans", "start")
+    names = ("load", "read", "browse", "orphans", "search", "start")
     parser = argparse.ArgumentParser(description=__doc__, formatter_class=argparse.RawDescriptionHelpFormatter)
     parser.add_argument("build")
     parser.add_argument("comparisons", nargs="*", metavar="COMPARISON", help=", ".join(names))

@@ -1,13 +1,16 @@
+#include "collection/resultlines.h"
 #include "collection/searchstatement.h"
 #include "controls/sortedrows.h"
 #include "measure.h"
 #include "opencatalogue.h"
 #include "platform/ado/connection.h"
 #include "platform/ado/recordset.h"
+#include "platform/desktop/desktop.h"
 #include "shell/services/globals.h"
+#include "shell/services/textfiles.h"
 #include "workcommands.h"
 
-#include <stdexcept>
+#include <QFileInfo>
 
 namespace
 {
@@ -38,6 +41,35 @@ SearchKey keyOf(const QString &mode, const QString &field, const QString &word)
 }
 
 } // namespace
+
+void exportAll(const QStringList &arguments)
+{
+    openForWork(arguments[0]);
+    ADODB::Recordset found;
+    measured("search", [&] {
+        found.Open(searchStatement({}), *gConnection);
+        return count("rows", found.RecordCount());
+    });
+    const auto rows = found.rows();
+    std::vector<std::uint32_t> order;
+    measured("sort by title", [&] {
+        order = sortedRows(*rows, 1);
+        return count("rows", qint64(order.size()));
+    });
+    measured("export", [&] {
+        OutputTextFile file;
+        bool written = OpenOutputFile(arguments[1], file);
+        for (const auto row : order) {
+            QStringList texts;
+            for (int column = 0; column < rows->columnCount(); ++column)
+                texts.append(rows->text(row, column));
+            written = written && WriteTextLine(file, resultLine(texts));
+        }
+        if (!written || !CloseTextFile(file))
+            errorBox(QStringLiteral("The file could not be written."));
+        return count("bytes", QFileInfo(arguments[1]).size());
+    });
+}
 
 void search(const QStringList &arguments)
 {

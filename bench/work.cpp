@@ -24,6 +24,7 @@ constexpr Command commands[] = {
     {"load", "CATALOGUE A|B|C|D FILE", loadText},
     {"orphans", "CATALOGUE", removeOrphans},
     {"search", "CATALOGUE part|full|begin|end artist|title|genre|year|three WORD", search},
+    {"export", "CATALOGUE FILE", exportAll},
 };
 
 int usage()

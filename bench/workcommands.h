@@ -11,3 +11,4 @@ void readText(const QStringList &arguments);      // FORMAT FILE
 void loadText(const QStringList &arguments);      // CATALOGUE FORMAT FILE
 void removeOrphans(const QStringList &arguments); // CATALOGUE
 void search(const QStringList &arguments);        // CATALOGUE MODE FIELD WORD
+void exportAll(const QStringList &arguments);     // CATALOGUE FILE
