@@ -11,6 +11,8 @@
 #include <QKeyEvent>
 #include <QKeySequence>
 #include <QMessageBox>
+#include <QPrintDialog>
+#include <QPrinterInfo>
 #include <QStandardPaths>
 #include <QUrl>
 
@@ -91,6 +93,8 @@ void prepare(QFileDialog &dialog, const FileQuestion &question)
     if (!question.patterns.isEmpty())
         dialog.setNameFilter(question.patterns);
     dialog.setDefaultSuffix(question.suffix);
+    if (!question.name.isEmpty())
+        dialog.selectFile(question.name);
 }
 
 } // namespace
@@ -136,6 +140,18 @@ QString QtDesktop::folderName(const FileQuestion &question)
     dialog.setFileMode(QFileDialog::Directory);
     dialog.setOption(QFileDialog::ShowDirsOnly);
     return chosen(dialog);
+}
+
+PrinterChoice QtDesktop::choosePrinter(QPrinter &printer, int pages)
+{
+    if (QPrinterInfo::availablePrinterNames().isEmpty())
+        return PrinterChoice::NoPrinter;
+    QPrintDialog dialog(&printer, QApplication::activeWindow());
+    dialog.setOptions(QAbstractPrintDialog::PrintPageRange |
+                      QAbstractPrintDialog::PrintCurrentPage |
+                      QAbstractPrintDialog::PrintCollateCopies);
+    dialog.setMinMax(1, pages);
+    return dialog.exec() == QDialog::Accepted ? PrinterChoice::Chosen : PrinterChoice::Cancelled;
 }
 
 QDateTime QtDesktop::now()
