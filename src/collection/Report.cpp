@@ -270,8 +270,10 @@ void Report::run(const QString &failure, const Work &work)
 {
     mStopped = false;
     showBusy(true);
+    qsizetype written = 0;
     ThrottledPump pump;
     const auto result = work([&](qsizetype done, qsizetype all) {
+        written = done;
         if (const int percent = int(done * 100 / all); percent != mProgress->value())
             mProgress->setValue(percent);
         pump();
@@ -281,9 +283,10 @@ void Report::run(const QString &failure, const Work &work)
     if (result.outcome == reportoutput::Outcome::Failed)
         errorBox(result.reason.isEmpty() ? failure : failure + u'\r' + result.reason,
                  GetMessage("FileError"));
-    const char *end =
-        result.outcome == reportoutput::Outcome::Done ? "xReportDone" : "xReportStopped";
-    mUi->TheStatusBar->showMessage(GetMessage(end));
+    const bool whole = result.outcome == reportoutput::Outcome::Done;
+    mUi->TheStatusBar->showMessage(whole ? GetMessage("xReportDone") +
+                                               reportLocale().toString(written)
+                                         : GetMessage("xReportStopped"));
 }
 
 void Report::showBusy(bool busy)

@@ -97,6 +97,16 @@ void prepare(QFileDialog &dialog, const FileQuestion &question)
         dialog.selectFile(question.name);
 }
 
+// Pages typed as "2-3,5" are taken out by the caller and, with CUPS, once more by the server, which
+// counts those that are left. "From 2 to 3" goes right.
+void hideDoubledChoice(QPrintDialog &dialog)
+{
+    for (const char *name : {"pagesRadioButton", "pagesLineEdit"}) {
+        if (auto *control = dialog.findChild<QWidget *>(QLatin1String(name)))
+            control->hide();
+    }
+}
+
 } // namespace
 
 BoxAnswer QtDesktop::messageBox(BoxKind kind, BoxButtons buttons, const QString &text,
@@ -151,6 +161,8 @@ PrinterChoice QtDesktop::choosePrinter(QPrinter &printer, int pages)
                       QAbstractPrintDialog::PrintCurrentPage |
                       QAbstractPrintDialog::PrintCollateCopies);
     dialog.setMinMax(1, pages);
+    dialog.setFromTo(1, pages);
+    hideDoubledChoice(dialog);
     return dialog.exec() == QDialog::Accepted ? PrinterChoice::Chosen : PrinterChoice::Cancelled;
 }
 

@@ -44,7 +44,7 @@ const Message furtherTexts[] = {
     {"xReportOf", " of ", " van "},
     {"xReportLines", "Number of lines: ", "Aantal regels: "},
     {"xReportBusy", "The pages are being written...", "De pagina's worden geschreven..."},
-    {"xReportDone", "All pages have been written.", "Alle pagina's zijn geschreven."},
+    {"xReportDone", "Pages written: ", "Geschreven pagina's: "},
     {"xReportStopped", "Not all pages have been written.", "Niet alle pagina's zijn geschreven."},
     {"xPreview", "Preview", "Afdrukvoorbeeld"},
     {"xZoom", "Zoom", "Zoom"},
