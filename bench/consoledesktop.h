@@ -18,6 +18,7 @@ public:
     QString openFileName(const FileQuestion &) override { return {}; }
     QString saveFileName(const FileQuestion &) override { return {}; }
     QString folderName(const FileQuestion &) override { return {}; }
+    PrinterChoice choosePrinter(QPrinter &, int) override { return PrinterChoice::NoPrinter; }
     QDateTime now() override { return QDateTime::currentDateTime(); }
     void setPointer(QWidget *, PointerShape) override {}
     void freeze(QWidget *) override {}

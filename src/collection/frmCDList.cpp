@@ -5,6 +5,7 @@
 #include "collection/browserlists.h"
 #include "collection/editors.h"
 #include "collection/recordnodes.h"
+#include "collection/reports.h"
 #include "controls/DBListViewCTL.h"
 #include "platform/desktop/desktop.h"
 #include "platform/text/textrules.h"
@@ -32,6 +33,17 @@ std::vector<RecordTree::Node> nodesOf(const ADODB::Recordset &recordset, QChar k
     for (qsizetype row = 0; row < rows->rowCount(); ++row)
         nodes.push_back({keyLetter + rows->text(row, 0), rows->text(row, 1)});
     return nodes;
+}
+
+template <typename PrintedReport> void startReport()
+{
+    if (!gConnection)
+        throw ADODB::makeError(ADODB::errObjectClosed);
+    const auto rows = gConnection->Execute(PrintedReport::command(), ADODB::adOptionUnspecified);
+    auto &report = defaultInstance<PrintedReport>();
+    report.setDataSource(rows);
+    report.setCaption(PrintedReport::caption());
+    report.Show();
 }
 
 } // namespace
@@ -83,6 +95,7 @@ void frmCDList::connectControls()
     connect(mUi->cmdInsert, &QPushButton::clicked, this, &frmCDList::cmdInsert_Click);
     connect(mUi->cmdUpdate, &QPushButton::clicked, this, &frmCDList::cmdUpdate_Click);
     connect(mUi->cmdDelete, &QPushButton::clicked, this, &frmCDList::cmdDelete_Click);
+    connect(mUi->cmdStartReport, &QPushButton::clicked, this, &frmCDList::cmdStartReport_Click);
     connect(mUi->cmdCancel, &QPushButton::clicked, this, &Form::Unload);
     connect(mUi->ColList, &DBListViewCTL::LostFocus, this, [this] { mColFocusDone = false; });
 }
@@ -201,7 +214,7 @@ void frmCDList::CDTab_Click()
     focusList();
 }
 
-// Adding and editing MP3 collections wait for their editor, printing for the reports.
+// Adding and editing MP3 collections wait for their editor. There is no report of them.
 void frmCDList::showPage()
 {
     const ListPage *page = current();
@@ -212,7 +225,7 @@ void frmCDList::showPage()
     mUi->cmdInsert->setEnabled(editable);
     mUi->cmdUpdate->setEnabled(editable && page->count > 0);
     mUi->cmdDelete->setEnabled(page && page->count > 0);
-    mUi->cmdStartReport->setEnabled(false);
+    mUi->cmdStartReport->setEnabled(!page || page->page != MP3Collections);
     showCount();
 }
 
@@ -365,6 +378,25 @@ void frmCDList::cmdDelete_Click()
         DeleteMP3Collection();
     else
         DeleteCD();
+}
+
+// By design: nothing is caught here. An error ends the program as any that nobody awaits, and the
+// hourglass stays until then.
+void frmCDList::cmdStartReport_Click()
+{
+    Desktop::current().setPointer(this, vbHourglass);
+    switch (mUi->CDTab->currentIndex()) {
+    case Compilations:
+        startReport<CompilationReport>();
+        break;
+    case Albums:
+        startReport<AlbumReport>();
+        break;
+    case Records:
+        startReport<PlatenbakReport>();
+        break;
+    }
+    Desktop::current().setPointer(this, vbDefault);
 }
 
 void frmCDList::DeleteCD()

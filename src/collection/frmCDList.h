@@ -75,6 +75,7 @@ private:
     void cmdInsert_Click();
     void cmdUpdate_Click();
     void cmdDelete_Click();
+    void cmdStartReport_Click();
     void DeleteCD();
     void DeleteMP3Collection();
     void deleteSelected(ListPage &page, void (*remove)(qint64));

@@ -170,6 +170,7 @@ void tst_frmCDList::pagesShowTheirCommandsAndCounts()
         QCOMPARE(control<QPushButton>("cmdDelete")->isVisible(), expected[i].commands);
         QCOMPARE(control<QPushButton>("cmdDelete")->isEnabled(), expected[i].commands);
         QVERIFY(control<QPushButton>("cmdStartReport")->isVisible());
+        QCOMPARE(control<QPushButton>("cmdStartReport")->isEnabled(), i != 3);
         QCOMPARE(status(), expected[i].count);
         const char *lists[] = {"ColList", "SngList", "Platenbak", "MP3List"};
         QCOMPARE(mScreen->focusWidget(), control<QWidget>(lists[i]));

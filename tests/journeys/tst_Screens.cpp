@@ -2,6 +2,9 @@
 #include "collection/frmCDList.h"
 #include "collection/frmCDRoot.h"
 #include "collection/frmCDRootE.h"
+#include "collection/frmPageSetup.h"
+#include "collection/reportpaper.h"
+#include "collection/reports.h"
 #include "platform/ado/connection.h"
 #include "shell/frmHelp.h"
 #include "shell/frmSplash.h"
@@ -54,6 +57,24 @@ template <typename Editor> Make makeEditor()
     };
 }
 
+// With the rows that its command gives.
+template <typename PrintedReport> Make makeReport()
+{
+    return [] {
+        auto *report = new PrintedReport;
+        report->setDataSource(gConnection->Execute(PrintedReport::command()));
+        report->setCaption(PrintedReport::caption());
+        return report;
+    };
+}
+
+Form *makePageSetup()
+{
+    const auto rows = gConnection->Execute(AlbumReport::command());
+    const auto content = std::make_shared<ReportContent>(rows, AlbumReport::caption(), QDate());
+    return new frmPageSetup(content, reportpaper::stored());
+}
+
 QString textOf(const QWidget *w)
 {
     return w->property("text").toString() + w->property("title").toString() + w->windowTitle() +
@@ -95,15 +116,20 @@ void tst_Screens::everyScreen_data()
 {
     QTest::addColumn<int>("language");
     QTest::addColumn<Make>("make");
-    const std::pair<const char *, Make> screens[] = {{"frmSplash", make<frmSplash>()},
-                                                     {"frmHelp", make<frmHelp>()},
-                                                     {"frmCDList", make<frmCDList>()},
-                                                     {"frmCDRoot", makeEditor<frmCDRoot>()},
-                                                     {"frmCDRootE", makeEditor<frmCDRootE>()},
-                                                     {"frmImportWizard", make<frmImportWizard>()},
-                                                     {"frmImportBusy", make<frmImportBusy>()},
-                                                     {"frmImport", make<frmImport>()},
-                                                     {"frmImportDBBusy", make<frmImportDBBusy>()}};
+    const std::pair<const char *, Make> screens[] = {
+        {"frmSplash", make<frmSplash>()},
+        {"frmHelp", make<frmHelp>()},
+        {"frmCDList", make<frmCDList>()},
+        {"frmCDRoot", makeEditor<frmCDRoot>()},
+        {"frmCDRootE", makeEditor<frmCDRootE>()},
+        {"frmImportWizard", make<frmImportWizard>()},
+        {"frmImportBusy", make<frmImportBusy>()},
+        {"frmImport", make<frmImport>()},
+        {"frmImportDBBusy", make<frmImportDBBusy>()},
+        {"CompilationReport", makeReport<CompilationReport>()},
+        {"AlbumReport", makeReport<AlbumReport>()},
+        {"PlatenbakReport", makeReport<PlatenbakReport>()},
+        {"frmPageSetup", makePageSetup}};
     for (const auto &[name, make] : screens) {
         QTest::newRow(QByteArray(name).append(", English")) << languageEnglish << make;
         QTest::newRow(QByteArray(name).append(", Dutch")) << languageDutch << make;

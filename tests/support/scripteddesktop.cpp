@@ -5,6 +5,7 @@
 #include "platform/desktop/modalloop.h"
 #include "platform/desktop/qtdesktop.h"
 
+#include <QPrinter>
 #include <QTest>
 #include <QTimer>
 
@@ -58,9 +59,12 @@ void ScriptedDesktop::verifyAllCame()
         failTest(QStringLiteral("This screen did not come: ") + modal.name);
     for (const QString &file : mFiles)
         failTest(QStringLiteral("No dialog asked for: ") + file);
+    for (const QString &printer : mPrinters)
+        failTest(QStringLiteral("Nothing was printed: ") + printer);
     mBoxes.clear();
     mModals.clear();
     mFiles.clear();
+    mPrinters.clear();
 }
 
 BoxAnswer ScriptedDesktop::messageBox(BoxKind kind, BoxButtons buttons, const QString &text,
@@ -128,6 +132,21 @@ QString ScriptedDesktop::saveFileName(const FileQuestion &)
 QString ScriptedDesktop::folderName(const FileQuestion &)
 {
     return nextFile("folder");
+}
+
+PrinterChoice ScriptedDesktop::choosePrinter(QPrinter &printer, int)
+{
+    if (mPrinters.empty()) {
+        failTest(QStringLiteral("Unexpected dialog: printer"));
+        return PrinterChoice::Cancelled;
+    }
+    const QString file = mPrinters.front();
+    mPrinters.pop_front();
+    if (file.isEmpty())
+        return PrinterChoice::NoPrinter;
+    printer.setOutputFormat(QPrinter::PdfFormat);
+    printer.setOutputFileName(file);
+    return PrinterChoice::Chosen;
 }
 
 void ScriptedDesktop::setPointer(QWidget *window, PointerShape shape)

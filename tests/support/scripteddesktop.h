@@ -27,6 +27,10 @@ public:
     void expectModal(const QString &name, std::function<void(Form &)> script = {});
     void expectFile(const QString &name) { mFiles.push_back(name); }
 
+    /// The next question for a printer gets one that prints into this file; without a name the
+    /// machine has none.
+    void expectPrinter(const QString &file) { mPrinters.push_back(file); }
+
     /// Fails the test if something announced did not come.
     void verifyAllCame();
 
@@ -43,6 +47,7 @@ public:
     QString openFileName(const FileQuestion &question) override;
     QString saveFileName(const FileQuestion &question) override;
     QString folderName(const FileQuestion &question) override;
+    PrinterChoice choosePrinter(QPrinter &printer, int pages) override;
     QDateTime now() override { return time; }
     void setPointer(QWidget *window, PointerShape shape) override;
     void freeze(QWidget *window) override;
@@ -65,5 +70,5 @@ private:
     };
     std::deque<Box> mBoxes;
     std::deque<Modal> mModals;
-    std::deque<QString> mFiles;
+    std::deque<QString> mFiles, mPrinters;
 };

@@ -6,6 +6,7 @@
 #include <QWidget>
 
 class Form;
+class QPrinter;
 
 enum class BoxKind { Error, Information, Question, Plain }; // Plain: without a picture
 enum class BoxButtons { Ok, YesNo, YesNoCancel };
@@ -21,8 +22,12 @@ struct FileQuestion {
     QString title;
     QString folder;
     QString patterns;
-    QString suffix; // put behind a name to save that has none
+    QString suffix;    // put behind a name to save that has none
+    QString name = {}; // proposed for a file to save
 };
+
+/// What became of the question for a printer.
+enum class PrinterChoice { Chosen, Cancelled, NoPrinter };
 
 /// Everything that blocks, shows, waits or asks the machine goes through here, so that a test can
 /// stand in for the person in front of the screen. No state and no logic: those are the callers'.
@@ -37,6 +42,10 @@ public:
     virtual QString openFileName(const FileQuestion &question) = 0; // empty: cancelled
     virtual QString saveFileName(const FileQuestion &question) = 0; // one that exists, too
     virtual QString folderName(const FileQuestion &question) = 0;
+
+    /// Lets the user choose printer, pages and copies for a document of this many pages. The
+    /// printer comes with the paper that is wanted. Nothing is shown on a machine that has none.
+    virtual PrinterChoice choosePrinter(QPrinter &printer, int pages) = 0;
     virtual QDateTime now() = 0;
     virtual void setPointer(QWidget *window, PointerShape shape) = 0;
     virtual void freeze(QWidget *window) = 0; // nullptr: drawing goes on

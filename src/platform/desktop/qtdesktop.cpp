@@ -11,6 +11,8 @@
 #include <QKeyEvent>
 #include <QKeySequence>
 #include <QMessageBox>
+#include <QPrintDialog>
+#include <QPrinterInfo>
 #include <QStandardPaths>
 #include <QUrl>
 
@@ -93,6 +95,18 @@ void prepare(QFileDialog &dialog, const FileQuestion &question)
     if (!question.patterns.isEmpty())
         dialog.setNameFilter(question.patterns);
     dialog.setDefaultSuffix(question.suffix);
+    if (!question.name.isEmpty())
+        dialog.selectFile(question.name);
+}
+
+// Pages typed as "2-3,5" are taken out by the caller and, with CUPS, once more by the server, which
+// counts those that are left. "From 2 to 3" goes right.
+void hideDoubledChoice(QPrintDialog &dialog)
+{
+    for (const char *name : {"pagesRadioButton", "pagesLineEdit"}) {
+        if (auto *control = dialog.findChild<QWidget *>(QLatin1String(name)))
+            control->hide();
+    }
 }
 
 } // namespace
@@ -138,6 +152,20 @@ QString QtDesktop::folderName(const FileQuestion &question)
     dialog.setFileMode(QFileDialog::Directory);
     dialog.setOption(QFileDialog::ShowDirsOnly);
     return chosen(dialog);
+}
+
+PrinterChoice QtDesktop::choosePrinter(QPrinter &printer, int pages)
+{
+    if (QPrinterInfo::availablePrinterNames().isEmpty())
+        return PrinterChoice::NoPrinter;
+    QPrintDialog dialog(&printer, QApplication::activeWindow());
+    dialog.setOptions(QAbstractPrintDialog::PrintPageRange |
+                      QAbstractPrintDialog::PrintCurrentPage |
+                      QAbstractPrintDialog::PrintCollateCopies);
+    dialog.setMinMax(1, pages);
+    dialog.setFromTo(1, pages);
+    hideDoubledChoice(dialog);
+    return dialog.exec() == QDialog::Accepted ? PrinterChoice::Chosen : PrinterChoice::Cancelled;
 }
 
 QDateTime QtDesktop::now()

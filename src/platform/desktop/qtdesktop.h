@@ -14,6 +14,7 @@ public:
     QString openFileName(const FileQuestion &question) override;
     QString saveFileName(const FileQuestion &question) override;
     QString folderName(const FileQuestion &question) override;
+    PrinterChoice choosePrinter(QPrinter &printer, int pages) override;
     QDateTime now() override;
     void setPointer(QWidget *window, PointerShape shape) override;
     void freeze(QWidget *window) override;

@@ -1,0 +1,102 @@
+#include "collection/frmPageSetup.h"
+
+#include "collection/reportpaper.h"
+#include "shell/services/captions.h"
+#include "shell/services/messages.h"
+#include "ui_frmPageSetup.h"
+
+namespace
+{
+
+// "A4 (210 × 297 mm)"
+QString nameOf(const reportpaper::Size &size)
+{
+    const QSize mm = QPageSize(size.id).size(QPageSize::Millimeter).toSize();
+    return QLatin1String(size.name) + QStringLiteral(" (") + QString::number(mm.width()) +
+           QStringLiteral(" × ") + QString::number(mm.height()) + QStringLiteral(" mm)");
+}
+
+} // namespace
+
+frmPageSetup::frmPageSetup(std::shared_ptr<const ReportContent> content, const QPageLayout &paper)
+    : Form(QStringLiteral("frmPageSetup")), mUi(std::make_unique<Ui::frmPageSetup>())
+{
+    mUi->setupUi(this);
+    setDefaultButton(mUi->cmdOK);
+    setCancelButton(mUi->cmdCancel);
+    setCaptions();
+    for (const reportpaper::Size &size : reportpaper::sizes())
+        mUi->Paper->addItem(nameOf(size), size.id);
+    showPaper(paper);
+    mUi->Picture->setReport(std::move(content));
+    paper_Change();
+    connectControls();
+}
+
+frmPageSetup::~frmPageSetup() = default;
+
+void frmPageSetup::setCaptions()
+{
+    applyCaptions(this, {{"frmPageSetup", "xReportSetupTip"},
+                         {"lblPaper", "xPaper"},
+                         {"fraOrientation", "xOrientation"},
+                         {"Portrait", "xPortrait"},
+                         {"Landscape", "xLandscape"},
+                         {"fraMargins", "xMargins"},
+                         {"lblLeft", "xMarginLeft"},
+                         {"lblRight", "xMarginRight"},
+                         {"lblTop", "xMarginTop"},
+                         {"lblBottom", "xMarginBottom"},
+                         {"cmdOK", "OKButtonCaption"},
+                         {"cmdCancel", "cmdCancelCaption"}});
+    mUi->Picture->setAccessibleName(GetMessage("xPreview"));
+}
+
+void frmPageSetup::connectControls()
+{
+    connect(mUi->Paper, &QComboBox::currentIndexChanged, this, &frmPageSetup::paper_Change);
+    connect(mUi->Landscape, &QRadioButton::toggled, this, &frmPageSetup::paper_Change);
+    for (QSpinBox *margin : findChildren<QSpinBox *>())
+        connect(margin, &QSpinBox::valueChanged, this, &frmPageSetup::paper_Change);
+    connect(mUi->cmdOK, &QPushButton::clicked, this, &frmPageSetup::cmdOK_Click);
+    connect(mUi->cmdCancel, &QPushButton::clicked, this, &Form::Unload);
+}
+
+void frmPageSetup::showPaper(const QPageLayout &paper)
+{
+    const QMargins margins = paper.margins(QPageLayout::Millimeter).toMargins();
+    mUi->Paper->setCurrentIndex(mUi->Paper->findData(paper.pageSize().id()));
+    mUi->Landscape->setChecked(paper.orientation() == QPageLayout::Landscape);
+    mUi->MarginLeft->setValue(margins.left());
+    mUi->MarginTop->setValue(margins.top());
+    mUi->MarginRight->setValue(margins.right());
+    mUi->MarginBottom->setValue(margins.bottom());
+}
+
+QPageLayout frmPageSetup::paper() const
+{
+    return reportpaper::layout(QPageSize::PageSizeId(mUi->Paper->currentData().toInt()),
+                               mUi->Landscape->isChecked() ? QPageLayout::Landscape
+                                                           : QPageLayout::Portrait,
+                               {mUi->MarginLeft->value(), mUi->MarginTop->value(),
+                                mUi->MarginRight->value(), mUi->MarginBottom->value()});
+}
+
+// The margins may go as far as the paper allows.
+void frmPageSetup::paper_Change()
+{
+    const QSizeF sheet = paper().fullRect(QPageLayout::Millimeter).size();
+    const int across = reportpaper::largestMargin(sheet.width());
+    const int down = reportpaper::largestMargin(sheet.height());
+    mUi->MarginLeft->setRange(reportpaper::smallestMargin, across);
+    mUi->MarginRight->setRange(reportpaper::smallestMargin, across);
+    mUi->MarginTop->setRange(reportpaper::smallestMargin, down);
+    mUi->MarginBottom->setRange(reportpaper::smallestMargin, down);
+    mUi->Picture->setPaper(paper());
+}
+
+void frmPageSetup::cmdOK_Click()
+{
+    emit chosen(paper());
+    Unload();
+}

@@ -1,0 +1,35 @@
+#pragma once
+
+#include "collection/reportcontent.h"
+#include "platform/desktop/form.h"
+
+#include <QPageLayout>
+#include <memory>
+
+namespace Ui
+{
+class frmPageSetup;
+}
+
+/// Asks for paper, orientation and margins of a report, with a picture of what they make of it.
+class frmPageSetup : public Form
+{
+    Q_OBJECT
+
+public:
+    frmPageSetup(std::shared_ptr<const ReportContent> content, const QPageLayout &paper);
+    ~frmPageSetup() override;
+
+signals:
+    void chosen(const QPageLayout &paper);
+
+private:
+    void setCaptions();
+    void connectControls();
+    void showPaper(const QPageLayout &paper);
+    QPageLayout paper() const;
+    void paper_Change();
+    void cmdOK_Click();
+
+    std::unique_ptr<Ui::frmPageSetup> mUi;
+};
