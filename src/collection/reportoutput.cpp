@@ -2,6 +2,7 @@
 
 #include "shell/services/fileutilities.h"
 #include "shell/services/messages.h"
+#include "shell/services/wholefile.h"
 
 #include <QFileInfo>
 #include <QPainter>
@@ -83,7 +84,7 @@ Result writePdf(const QString &name, const ReportPainter &report, const QPageLay
     writer.setCreator(GetMessage("MainScreen.Caption"));
     const auto isWell = [&file] { return file.error() == QFileDevice::NoError; };
     Result result = paintPages(writer, allPages(report.layout()), report, isWell, progress);
-    if (result.outcome == Outcome::Done && !file.commit())
+    if (result.outcome == Outcome::Done && !commitWhole(file))
         result.outcome = Outcome::Failed;
     if (result.outcome == Outcome::Failed)
         result.reason = file.errorString();
