@@ -1,6 +1,7 @@
 // Label: unit
 #include "platform/ado/dialect.h"
 #include "platform/ado/error.h"
+#include "support/datarows.h"
 
 #include <QTest>
 
@@ -42,15 +43,11 @@ QString literalsOf(const Dialect &dialect)
 
 void tst_Dialect::rewrites_data()
 {
-    QTest::addColumn<QString>("statement");
-    QTest::addColumn<QString>("sql");
-    QTest::addColumn<QString>("literals");
-    const auto row = [](const char *name, const char *from, const char *to, const char *lifted) {
-        QTest::newRow(name) << QString::fromUtf8(from) << QString::fromUtf8(to)
-                            << QString::fromUtf8(lifted);
-    };
+    const DataRows<QString, QString, QString> row("statement", "sql", "literals");
     row("number and text", "select a from t where b=1985 and c='x'",
         "select a from t where b=? and c=?", "1985|tx");
+    row("the same with other values", "select a from t where b=0.5 and c='it''s'",
+        "select a from t where b=? and c=?", "r0.5|tit's");
     row("doubled quotes", "select 'd''Arc', '''', ''''''", "select ?, ?, ?", "td'Arc|t'|t''");
     row("double quoted", "select \"it's\", \"a\"\"b\", \"\"", "select ?, ?, ?", "tit's|ta\"b|t");
     row("text that looks numeric", "select '1e10', 1e10, .5, 5., 1E-2", "select ?, ?, ?, ?, ?",
@@ -70,6 +67,8 @@ void tst_Dialect::rewrites_data()
 
     row("order by", "select a, 5 from t order by 1,2 desc", "select a, ? from t order by 1,2 desc",
         "5");
+    row("other ordinals", "select a, 5 from t order by 1,22 desc",
+        "select a, ? from t order by 1,22 desc", "5");
     row("group by, having", "select a from t group by 1 having count(*)= 3 order by 2",
         "select a from t group by 1 having count(*)= ? order by 2", "3");
     row("union", "select 7 from t group by 1 union select 8 from u order by 1",
@@ -100,65 +99,66 @@ void tst_Dialect::rewrites_data()
         "create table t(a default 'x''y', b decimal(10,2))", "");
 }
 
+// A dialect that has seen all the statements before answers like a new one.
 void tst_Dialect::rewrites()
 {
     QFETCH(QString, statement);
-    Dialect dialect;
-    dialect.translate(statement);
-    QTEST(QString::fromStdString(dialect.sql()), "sql");
-    QTEST(literalsOf(dialect), "literals");
+    static Dialect seasoned;
+    Dialect fresh;
+    for (Dialect *dialect : {&fresh, &seasoned, &seasoned}) {
+        dialect->translate(statement);
+        QTEST(QString::fromStdString(dialect->sql()), "sql");
+        QTEST(literalsOf(*dialect), "literals");
+    }
 }
 
 void tst_Dialect::refuses_data()
 {
-    QTest::addColumn<QString>("statement");
-    const char *bad[] = {
-        "",
-        "  ",
-        ";",
-        "select 1; select 2",
-        "select 1;;",
-        "select 1 -- the rest",
-        "select 1 /* x */",
-        "select 'rock'n'roll'",
-        "insert into t values (1,'rock'n'roll')",
-        "select 'open",
-        "select 'open''",
-        "select \"open",
-        "select 'a'5",
-        "insert into t(a) values (1),(2)",
-        "insert into t(a) values (5,1,'t','x',1985),(51,1,'r','y',NULL)",
-        "insert into t(a) values (1) union select 2",
-        "insert into t(a) values (1) returning a",
-        "select a where b=?",
-        "select :a",
-        "select @a",
-        "select $a",
-        "select #1#",
-        "select 'a'||'b'",
-        "select 1985x",
-        "select 0x10",
-        "select 1_000",
-        "select 1e",
-        "select a.5",
-        "select 1.5.3",
-        "select a)",
-        "select \f1",
-        "SHAPE { delete from t } as X",
-        "SHAPE select a as X",
-        "SHAPE } select a {",
-        "pragma user_version=1",
-        "attach 'x' as y",
-        "commit",
-        "begin",
-        "explain select 1",
-    };
+    const DataRows<QString> row("statement");
+    const char *bad[] = {"",
+                         "  ",
+                         ";",
+                         "select 1; select 2",
+                         "select 1;;",
+                         "select 1 -- the rest",
+                         "select 1 /* x */",
+                         "select 'rock'n'roll'",
+                         "insert into t values (1,'rock'n'roll')",
+                         "select 'open",
+                         "select 'open''",
+                         "select \"open",
+                         "select 'a'5",
+                         "insert into t(a) values (1),(2)",
+                         "insert into t(a) values (5,1,'t','x',1985),(51,1,'r','y',NULL)",
+                         "insert into t(a) values (1) union select 2",
+                         "insert into t(a) values (1) returning a",
+                         "select a where b=?",
+                         "select :a",
+                         "select @a",
+                         "select $a",
+                         "select #1#",
+                         "select 'a'||'b'",
+                         "select 1985x",
+                         "select 0x10",
+                         "select 1_000",
+                         "select 1e",
+                         "select a.5",
+                         "select 1.5.3",
+                         "select a)",
+                         "select \f1",
+                         "SHAPE { delete from t } as X",
+                         "SHAPE select a as X",
+                         "SHAPE } select a {",
+                         "pragma user_version=1",
+                         "attach 'x' as y",
+                         "commit",
+                         "begin",
+                         "explain select 1"};
     for (const char *b : bad)
-        QTest::newRow(b) << QString::fromUtf8(b);
+        row(b);
     // The engine would take the first part for the whole.
-    QTest::newRow("NUL") << QStringLiteral("delete from t ") + QChar(0) + QStringLiteral("where 0");
-    QTest::newRow("NUL in a default")
-        << QStringLiteral("create table t(a default 'x") + QChar(0) + QStringLiteral("')");
+    row("NUL", u"delete from t "_s + QChar(0) + u"where 0"_s);
+    row("NUL in a default", u"create table t(a default 'x"_s + QChar(0) + u"')"_s);
 }
 
 void tst_Dialect::refuses()
@@ -176,11 +176,10 @@ void tst_Dialect::refuses()
 void tst_Dialect::takesUpAfterARefusal()
 {
     Dialect dialect;
-    QVERIFY_EXCEPTION_THROWN(
-        dialect.translate(QStringLiteral("insert into t values (1,(2 order by 'x")), Error);
-    dialect.translate(QStringLiteral("select 'a', 2 from t"));
+    QVERIFY_EXCEPTION_THROWN(dialect.translate(u"insert into t values (1,(2 order by 'x"_s), Error);
+    dialect.translate(u"select 'a', 2 from t"_s);
     QCOMPARE(dialect.sql(), std::string("select ?, ? from t"));
-    QCOMPARE(literalsOf(dialect), QStringLiteral("ta|2"));
+    QCOMPARE(literalsOf(dialect), u"ta|2"_s);
 }
 
 QTEST_APPLESS_MAIN(tst_Dialect)

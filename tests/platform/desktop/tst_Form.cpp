@@ -2,6 +2,7 @@
 #include "platform/desktop/drawingfreeze.h"
 #include "platform/desktop/form.h"
 #include "platform/desktop/qtdesktop.h"
+#include "support/datarows.h"
 #include "support/scripteddesktop.h"
 
 #include <QLineEdit>
@@ -20,26 +21,16 @@ private slots:
     void init();
     void cleanup();
     void loadsOnceAndGoes();
-    void refusesToClose();
     void reloadsOnTheSpot();
-    void unloadsWhileLoading_data();
     void unloadsWhileLoading();
-    void modalEndsWithUnloadOrHide_data();
     void modalEndsWithUnloadOrHide();
     void hostedOnesAreBroughtUp();
-    void defaultInstanceAnew();
     void buttonsOfEnterAndEsc_data();
     void buttonsOfEnterAndEsc();
-    void activation();
-    void hourglassOutlivesItsWindow();
     void freezeEndsWithTheRoutine();
     void freezeStaysUnderAModalScreen();
     void freezesAreNotCounted();
-    void questionOnlyItsButtonsAnswer_data();
     void questionOnlyItsButtonsAnswer();
-    void boxesShowPlainText();
-    void boxesWithoutATitle();
-    void sentKeysFollowTheFocus();
 
 private:
     std::unique_ptr<ScriptedDesktop> mDesktop;
@@ -53,7 +44,7 @@ class TestForm : public Form
     Q_OBJECT
 
 public:
-    TestForm() : Form(QStringLiteral("frmTest"))
+    TestForm() : Form(u"frmTest"_s)
     {
         auto *column = new QVBoxLayout(this);
         for (QWidget *w : std::initializer_list<QWidget *>{&text, &ok, &other, &cancel})
@@ -61,10 +52,10 @@ public:
         setDefaultButton(&ok);
         setCancelButton(&cancel);
         const auto note = [this](const QString &name) { return [this, name] { log += name; }; };
-        connect(&ok, &QPushButton::clicked, this, note(QStringLiteral("ok ")));
-        connect(&other, &QPushButton::clicked, this, note(QStringLiteral("other ")));
-        connect(&cancel, &QPushButton::clicked, this, note(QStringLiteral("cancel ")));
-        connect(this, &Form::unloaded, this, note(QStringLiteral("unloaded ")));
+        connect(&ok, &QPushButton::clicked, this, note(u"ok "_s));
+        connect(&other, &QPushButton::clicked, this, note(u"other "_s));
+        connect(&cancel, &QPushButton::clicked, this, note(u"cancel "_s));
+        connect(this, &Form::unloaded, this, note(u"unloaded "_s));
     }
 
     using Form::Reload;
@@ -77,17 +68,17 @@ public:
 protected:
     void Form_Load() override
     {
-        log += QStringLiteral("load ");
+        log += u"load "_s;
         if (leavesAtLoad)
             Unload();
     }
-    void Form_Activate() override { log += QStringLiteral("activate "); }
+    void Form_Activate() override { log += u"activate "_s; }
     bool QueryUnload() override
     {
-        log += QStringLiteral("query ");
+        log += u"query "_s;
         return !stays;
     }
-    void Form_Unload() override { log += QStringLiteral("unload "); }
+    void Form_Unload() override { log += u"unload "_s; }
 };
 
 // Runs a piece of a test inside a main loop, as the program's own routines run.
@@ -125,15 +116,17 @@ void tst_Form::loadsOnceAndGoes()
     QVERIFY(!form->isVisible());
     form->Show();
     form->Show();
-    QVERIFY(form->isVisible());
+    form->stays = true;
+    QVERIFY(!form->close());
+    QVERIFY(form->isVisible() && !form->isUnloaded());
+    form->stays = false;
     QVERIFY(form->Unload());
     QVERIFY(form->Unload()); // gone already, and no second time
     QVERIFY(Form::openForms().isEmpty());
     QVERIFY(form && form->isUnloaded() && !form->isVisible());
     inMainLoop([] {});
     QTRY_VERIFY(!form);
-    QVERIFY(TestForm::log.endsWith(QStringLiteral("query unload unloaded ")));
-    QCOMPARE(TestForm::log.count(QStringLiteral("load ")), 2); // of "unload" too
+    QCOMPARE(TestForm::log.remove(u"activate "_s), u"load query query unload unloaded "_s);
 }
 
 void tst_Form::reloadsOnTheSpot()
@@ -145,7 +138,7 @@ void tst_Form::reloadsOnTheSpot()
     form->text.setFocus();
     TestForm::log.clear();
     QVERIFY(form->Reload());
-    QCOMPARE(TestForm::log, QStringLiteral("query unload load "));
+    QCOMPARE(TestForm::log, u"query unload load "_s);
     QVERIFY(form->isVisible() && !form->isUnloaded() && form->text.hasFocus());
     form->stays = true;
     QVERIFY(!form->Reload());
@@ -156,60 +149,28 @@ void tst_Form::reloadsOnTheSpot()
     QVERIFY(form->isUnloaded());
 }
 
-void tst_Form::refusesToClose()
-{
-    auto *form = new TestForm;
-    form->Show();
-    form->stays = true;
-    QVERIFY(!form->close());
-    QVERIFY(form->isVisible() && !form->isUnloaded());
-    form->stays = false;
-    QVERIFY(form->close());
-    QVERIFY(form->isUnloaded());
-}
-
-void tst_Form::unloadsWhileLoading_data()
-{
-    QTest::addColumn<bool>("modal");
-    QTest::newRow("modeless") << false;
-    QTest::newRow("modal") << true; // must not wait for an end that has been
-}
-
+// A modal one must not wait for an end that has been.
 void tst_Form::unloadsWhileLoading()
 {
-    QFETCH(bool, modal);
-    auto *form = new TestForm;
-    form->leavesAtLoad = true;
-    modal ? form->ShowModal() : form->Show();
-    QVERIFY(form->isUnloaded() && !form->isVisible());
-}
-
-void tst_Form::modalEndsWithUnloadOrHide_data()
-{
-    QTest::addColumn<bool>("scripted");
-    QTest::addColumn<bool>("hides");
-    QTest::newRow("real, unload") << false << false;
-    QTest::newRow("real, hide") << false << true;
-    QTest::newRow("scripted, unload") << true << false;
-    QTest::newRow("scripted, hide") << true << true;
+    for (const bool modal : {false, true}) {
+        auto *form = new TestForm;
+        form->leavesAtLoad = true;
+        modal ? form->ShowModal() : form->Show();
+        QVERIFY(form->isUnloaded() && !form->isVisible());
+    }
 }
 
 void tst_Form::modalEndsWithUnloadOrHide()
 {
-    QFETCH(bool, scripted);
-    QFETCH(bool, hides);
     QtDesktop real;
-    auto *form = new TestForm;
-    const auto leave = [hides](Form &f) { hides ? f.hide() : void(f.Unload()); };
-    if (scripted) {
-        mDesktop->expectModal(QStringLiteral("frmTest"), leave);
-    } else {
+    for (const bool hides : {false, true}) {
         Desktop::setCurrent(&real);
-        QTimer::singleShot(0, form, [form, leave] { leave(*form); });
+        auto *form = new TestForm;
+        QTimer::singleShot(0, form, [=] { hides ? form->hide() : void(form->Unload()); });
+        form->ShowModal();
+        QVERIFY(!form->isVisible());
+        QCOMPARE(form->isUnloaded(), !hides);
     }
-    form->ShowModal();
-    QVERIFY(!form->isVisible());
-    QCOMPARE(form->isUnloaded(), !hides);
 }
 
 void tst_Form::hostedOnesAreBroughtUp()
@@ -217,21 +178,21 @@ void tst_Form::hostedOnesAreBroughtUp()
     struct Host : Form::Host {
         void adopt(Form *form) override
         {
-            TestForm::log += QStringLiteral("adopt ");
+            TestForm::log += u"adopt "_s;
             form->show();
         }
-        void bringUp(Form *) override { TestForm::log += QStringLiteral("up "); }
+        void bringUp(Form *) override { TestForm::log += u"up "_s; }
         QPoint origin() const override { return {100, 50}; }
     } host;
     Form::setHost(&host);
     TestForm form;
     form.Show();
     form.Show();
-    QCOMPARE(TestForm::log.remove(QStringLiteral("activate ")), QStringLiteral("load adopt up "));
+    QCOMPARE(TestForm::log.remove(u"activate "_s), u"load adopt up "_s);
     auto *modal = new TestForm;
     modal->setPlace({10, 20});
     QPoint place;
-    mDesktop->expectModal(QStringLiteral("frmTest"), [&](Form &f) {
+    mDesktop->expectModal(u"frmTest"_s, [&](Form &f) {
         place = f.pos();
         f.Unload();
     });
@@ -240,37 +201,16 @@ void tst_Form::hostedOnesAreBroughtUp()
     QCOMPARE(place, QPoint(110, 70));
 }
 
-void tst_Form::defaultInstanceAnew()
-{
-    TestForm *first = &defaultInstance<TestForm>();
-    QCOMPARE(&defaultInstance<TestForm>(), first);
-    first->Unload();
-    TestForm *second = &defaultInstance<TestForm>();
-    QVERIFY(second != first && !second->isUnloaded());
-    delete second;
-    QVERIFY(!defaultInstance<TestForm>().isUnloaded());
-}
-
 void tst_Form::buttonsOfEnterAndEsc_data()
 {
-    QTest::addColumn<QString>("focus");
-    QTest::addColumn<int>("key");
-    QTest::addColumn<bool>("enabled");
-    QTest::addColumn<QString>("clicked");
-    const auto row = [](const char *name, const char *focus, Qt::Key key, bool enabled,
-                        const char *clicked) {
-        QTest::newRow(name) << QString::fromLatin1(focus) << int(key) << enabled
-                            << QString::fromLatin1(clicked);
-    };
+    const DataRows<QString, int, bool, QString> row("focus", "key", "enabled", "clicked");
     row("Enter in a field", "text", Qt::Key_Return, true, "ok ");
     row("the other Enter", "text", Qt::Key_Enter, true, "ok ");
     row("Esc in a field", "text", Qt::Key_Escape, true, "cancel ");
     row("Enter on another button", "other", Qt::Key_Return, true, "other ");
     row("Enter on the default button", "ok", Qt::Key_Return, true, "ok ");
-    row("Esc on a button", "other", Qt::Key_Escape, true, "cancel ");
     row("Enter, disabled", "text", Qt::Key_Return, false, "");
     row("Esc, disabled", "text", Qt::Key_Escape, false, "");
-    row("another key", "text", Qt::Key_A, true, "");
 }
 
 void tst_Form::buttonsOfEnterAndEsc()
@@ -288,35 +228,7 @@ void tst_Form::buttonsOfEnterAndEsc()
     at->setFocus();
     TestForm::log.clear();
     QTest::keyClick(at, Qt::Key(key));
-    QTEST(TestForm::log.remove(QStringLiteral("activate ")), "clicked");
-}
-
-void tst_Form::activation()
-{
-    TestForm one, other;
-    for (TestForm *form : {&one, &other, &one}) {
-        form->Show();
-        form->activateWindow();
-        form->text.setFocus();
-        QTRY_COMPARE(QApplication::focusWidget(), &form->text);
-        form->other.setFocus(); // within the form: not again
-    }
-    QCOMPARE(TestForm::log.count(QStringLiteral("activate ")), 3);
-}
-
-void tst_Form::hourglassOutlivesItsWindow()
-{
-    auto *window = new QWidget;
-    {
-        const Hourglass hourglass(window);
-        QCOMPARE(window->cursor().shape(), Qt::WaitCursor);
-        delete window;
-    }
-    QWidget other;
-    {
-        const Hourglass hourglass(&other);
-    }
-    QCOMPARE(other.cursor().shape(), Qt::ArrowCursor);
+    QTEST(TestForm::log.remove(u"activate "_s), "clicked");
 }
 
 void tst_Form::freezeEndsWithTheRoutine()
@@ -367,68 +279,26 @@ void tst_Form::freezesAreNotCounted()
     Desktop::current().freeze(nullptr);
 }
 
-void tst_Form::questionOnlyItsButtonsAnswer_data()
-{
-    QTest::addColumn<bool>("withCancel");
-    QTest::addColumn<int>("answer");
-    QTest::newRow("yes and no") << false << int(vbYes);
-    QTest::newRow("with cancel") << true << int(vbCancel);
-}
-
 void tst_Form::questionOnlyItsButtonsAnswer()
-{
-    QFETCH(bool, withCancel);
-    QtDesktop real;
-    QTimer::singleShot(0, this, [] {
-        auto *box = qobject_cast<QMessageBox *>(QApplication::activeModalWidget());
-        QVERIFY(box);
-        QTest::keyClick(box, Qt::Key_Escape);
-        box->close();
-        if (box->isVisible())
-            QTest::keyClick(box, Qt::Key_Return); // Yes is the default
-    });
-    QTEST(int(real.messageBox(BoxKind::Question,
-                              withCancel ? BoxButtons::YesNoCancel : BoxButtons::YesNo,
-                              QStringLiteral("?"), QStringLiteral("t"))),
-          "answer");
-}
-
-void tst_Form::boxesShowPlainText()
 {
     QtDesktop real;
     QString text;
-    auto format = Qt::AutoText;
-    QTimer::singleShot(0, this, [&] {
-        auto *box = qobject_cast<QMessageBox *>(QApplication::activeModalWidget());
-        text = box->text();
-        format = box->textFormat();
-        box->accept();
-    });
-    real.messageBox(BoxKind::Error, BoxButtons::Ok, QStringLiteral("<b>\rnext"), QString());
-    QCOMPARE(text, QStringLiteral("<b>\nnext"));
-    QCOMPARE(format, Qt::PlainText);
-}
-
-void tst_Form::boxesWithoutATitle()
-{
-    setBoxTitle(QStringLiteral("The program"));
-    mDesktop->expectBox(QStringLiteral("error [The program] a"));
-    mDesktop->expectBox(QStringLiteral("information [b] a"));
-    errorBox(QStringLiteral("a"));
-    informationBox(QStringLiteral("a"), QStringLiteral("b"));
-}
-
-void tst_Form::sentKeysFollowTheFocus()
-{
-    TestForm form;
-    form.Show();
-    form.activateWindow();
-    form.text.setFocus();
-    QTRY_COMPARE(QApplication::focusWidget(), &form.text);
-    Desktop::current().sendKeys(QStringLiteral("Tab, Tab"));
-    QCOMPARE(QApplication::focusWidget(), &form.other);
-    Desktop::current().sendKeys(QStringLiteral("Shift+Tab"));
-    QCOMPARE(QApplication::focusWidget(), &form.ok);
+    const auto answer = [&](BoxButtons buttons) {
+        QTimer::singleShot(0, this, [&] {
+            auto *box = qobject_cast<QMessageBox *>(QApplication::activeModalWidget());
+            QVERIFY(box);
+            QCOMPARE(box->textFormat(), Qt::PlainText);
+            text = box->text();
+            QTest::keyClick(box, Qt::Key_Escape);
+            box->close();
+            if (box->isVisible())
+                QTest::keyClick(box, Qt::Key_Return); // Yes is the default
+        });
+        return real.messageBox(BoxKind::Question, buttons, u"<b>\rnext"_s, u"t"_s);
+    };
+    QCOMPARE(answer(BoxButtons::YesNo), vbYes);
+    QCOMPARE(answer(BoxButtons::YesNoCancel), vbCancel);
+    QCOMPARE(text, u"<b>\nnext"_s);
 }
 
 QTEST_MAIN(tst_Form)
