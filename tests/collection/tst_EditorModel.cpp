@@ -85,7 +85,7 @@ private:
 
 void tst_EditorModel::randomActions_data()
 {
-    QTest::addColumn<int>("seed");
+    const DataRows<int> row("seed");
     for (const int seed : {1, 2, 3})
         QTest::addRow("seed %d", seed) << seed;
 }
@@ -121,7 +121,7 @@ void tst_EditorModel::openEditor()
     } else {
         mShown.record.isAlbum = random(2);
     }
-    const QString mode = mShown.isNew ? QStringLiteral("I") : QStringLiteral("U");
+    const QString mode = mShown.isNew ? u"I"_s : u"U"_s;
     if (mShown.record.isAlbum)
         mE->open<frmCDRootE>(mode, id);
     else
@@ -262,7 +262,7 @@ void tst_EditorModel::deleteDisc()
     discs = left;
     if (left.empty()) {
         mPicture.erase(id);
-        mE->desktop.expectBox(QStringLiteral("3021"));
+        mE->desktop.expectBox(u"3021"_s);
     }
     mE->button(2)->trigger();
     compare();
@@ -286,7 +286,7 @@ void tst_EditorModel::closeEditor()
 {
     const int how = random(3);
     if (how == 0) {
-        mE->editor->findChild<QAbstractButton *>(QStringLiteral("cmdCancel"))->click();
+        mE->editor->findChild<QAbstractButton *>(u"cmdCancel"_s)->click();
     } else {
         mE->editor->SaveAtUserRequest();
         shownIsSaved();
@@ -299,15 +299,15 @@ void tst_EditorModel::closeEditor()
 void tst_EditorModel::failOnce()
 {
     const QStringList before = stored();
-    mE->catalogue.exec(QStringLiteral("create trigger refuse before insert on CompactDiscs "
-                                      "begin select raise(abort, 'refused'); end"));
+    mE->catalogue.exec("create trigger refuse before insert on CompactDiscs "
+                       "begin select raise(abort, 'refused'); end");
     const int boxes = int(mE->desktop.boxes.size());
-    mE->addTracks({mShown.record.isAlbum ? QStringLiteral("Late") : QStringLiteral("Zoe|Late")});
-    mShown.disc.push_back({QStringLiteral("Zoe"), QStringLiteral("Late")});
-    mE->desktop.expectBox(QStringLiteral("refused"));
+    mE->addTracks({mShown.record.isAlbum ? u"Late"_s : u"Zoe|Late"_s});
+    mShown.disc.push_back({u"Zoe"_s, u"Late"_s});
+    mE->desktop.expectBox(u"refused"_s);
     mE->editor->SaveAtUserRequest();
     QCOMPARE(int(mE->desktop.boxes.size()), boxes + 1);
-    mE->catalogue.exec(QStringLiteral("drop trigger refuse"));
+    mE->catalogue.exec("drop trigger refuse");
     QCOMPARE(stored(), before);
     saveNow();
 }
@@ -332,7 +332,7 @@ QStringList tst_EditorModel::pictured() const
             for (std::size_t i = 0; i < disc.size(); ++i) {
                 const QString &artist = record.isAlbum ? record.artist : disc[i].artist;
                 lines.append(QStringList({QString::number(id), record.title,
-                                          record.isAlbum ? record.artist : QStringLiteral("NULL"),
+                                          record.isAlbum ? record.artist : u"NULL"_s,
                                           QString::number(number), QString::number(i + 1), artist,
                                           disc[i].title})
                                  .join(QLatin1Char('|')));
@@ -344,18 +344,18 @@ QStringList tst_EditorModel::pictured() const
 
 QStringList tst_EditorModel::stored()
 {
-    return mE->catalogue.rows(QStringLiteral(
+    return mE->catalogue.rows(
         "select d.ID, d.Titel, b.Naam, DiskNo, TrackNo, a.Naam, t.Titel from CompactDiscs c "
         "join CDTitels d on d.ID = c.CDTitels_ID join Tracks t on t.ID = c.Track_ID "
         "join Artiesten a on a.ID = t.Artiest_ID left join Artiesten b on b.ID = d.Artiest_ID "
-        "order by d.ID, DiskNo, TrackNo"));
+        "order by d.ID, DiskNo, TrackNo");
 }
 
 void tst_EditorModel::compare()
 {
     QCOMPARE(stored(), pictured());
     // The faults that there are, by name.
-    QCOMPARE(mE->catalogue.rows(QStringLiteral(R"(
+    QCOMPARE(mE->catalogue.rows(R"(
         select 'link without a title' from CompactDiscs where CDTitels_ID not in (select ID from CDTitels)
         union all select 'link without a track' from CompactDiscs where Track_ID not in (select ID from Tracks)
         union all select 'track without a link' from Tracks where ID not in (select Track_ID from CompactDiscs)
@@ -365,7 +365,7 @@ void tst_EditorModel::compare()
         union all select 'artist without a use' from Artiesten where ID not in (select Artiest_ID from Tracks)
             and ID not in (select Artiest_ID from CDTitels where Artiest_ID is not null)
         union all select 'artist twice' from Artiesten group by Naam having count(*) > 1
-        union all select 'track twice' from Tracks group by Artiest_ID, Titel having count(*) > 1)")),
+        union all select 'track twice' from Tracks group by Artiest_ID, Titel having count(*) > 1)"),
              QStringList());
 }
 
