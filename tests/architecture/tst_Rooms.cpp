@@ -1,4 +1,6 @@
 // Label: unit
+#include "support/datarows.h"
+
 #include <QDir>
 #include <QDirIterator>
 #include <QFile>
@@ -27,18 +29,10 @@ namespace
 
 // Lowest first: a room may include itself and those before it.
 const QStringList rooms{
-    QStringLiteral("platform/text"),
-    QStringLiteral("platform/ado"),
-    QStringLiteral("platform/desktop"),
-    QStringLiteral("shell/services"),
-    QStringLiteral("catalogue"),
-    QStringLiteral("controls"),
-    QStringLiteral("textimport"),
-    QStringLiteral("discdata"),
-    QStringLiteral("mp3"),
-    QStringLiteral("collection"),
-    QStringLiteral("shell"),
-    QStringLiteral("main.cpp"),
+    u"platform/text"_s,  u"platform/ado"_s, u"platform/desktop"_s,
+    u"shell/services"_s, u"catalogue"_s,    u"controls"_s,
+    u"textimport"_s,     u"discdata"_s,     u"mp3"_s,
+    u"collection"_s,     u"shell"_s,        u"main.cpp"_s,
 };
 
 // The room with the longest fitting name: "shell/services/x.h" is not of "shell". -1: none.
@@ -55,9 +49,9 @@ int roomOf(const QString &file)
 
 QStringList includesIn(const QStringList &lines, QChar open, QChar close)
 {
-    const QRegularExpression line(
-        QStringLiteral("^\\s*#\\s*include\\s*") + QRegularExpression::escape(QString(open)) +
-        QStringLiteral("([^>\"]+)") + QRegularExpression::escape(QString(close)));
+    const QRegularExpression line(u"^\\s*#\\s*include\\s*"_s +
+                                  QRegularExpression::escape(QString(open)) + u"([^>\"]+)"_s +
+                                  QRegularExpression::escape(QString(close)));
     QStringList all;
     for (const QString &l : lines) {
         if (const auto match = line.match(l); match.hasMatch())
@@ -70,9 +64,8 @@ QStringList includesIn(const QStringList &lines, QChar open, QChar close)
 
 void tst_Rooms::initTestCase()
 {
-    const QDir src(qEnvironmentVariable("SONGCASE_SOURCE") + QStringLiteral("/src"));
-    QDirIterator it(src.path(), {QStringLiteral("*.cpp"), QStringLiteral("*.h")}, QDir::Files,
-                    QDirIterator::Subdirectories);
+    const QDir src(qEnvironmentVariable("SONGCASE_SOURCE") + u"/src"_s);
+    QDirIterator it(src.path(), {u"*.cpp"_s, u"*.h"_s}, QDir::Files, QDirIterator::Subdirectories);
     while (it.hasNext()) {
         QFile file(it.next());
         QVERIFY(file.open(QIODevice::ReadOnly));
@@ -97,7 +90,7 @@ void tst_Rooms::includesPointDownwards()
                                    included.endsWith(QLatin1String(".moc"));
             const int room = roomOf(included); // -1 too if it is not written from src
             if (!generated && (room < 0 || room > roomOf(it.key())))
-                wrong.append(it.key() + QStringLiteral(" includes ") + included);
+                wrong.append(it.key() + u" includes "_s + included);
         }
     }
     QVERIFY2(wrong.isEmpty(), qPrintable(wrong.join(QLatin1Char('\n'))));
@@ -105,11 +98,8 @@ void tst_Rooms::includesPointDownwards()
 
 void tst_Rooms::librariesStayInTheirRooms_data()
 {
-    QTest::addColumn<QString>("header");
-    QTest::addColumn<QString>("allowed"); // starts of file names, "|" between
-    const auto row = [](const char *header, const char *allowed) {
-        QTest::newRow(header) << QString::fromLatin1(header) << QString::fromLatin1(allowed);
-    };
+    // allowed: starts of file names, "|" between
+    const DataRows<QString, QString> row("header", "allowed");
     row("^sqlite3", "platform/ado/|catalogue/cataloguefile");
     row("^unicode/", "platform/text/");
     row("^taglib/|^(id3v2|mpeg|tag)[a-z0-9]*\\.h", "mp3/");
@@ -133,7 +123,7 @@ void tst_Rooms::librariesStayInTheirRooms()
         });
         for (const QString &included : includesIn(it.value(), u'<', u'>')) {
             if (!fine && expression.match(included).hasMatch())
-                wrong.append(it.key() + QStringLiteral(" includes ") + included);
+                wrong.append(it.key() + u" includes "_s + included);
         }
     }
     QVERIFY2(wrong.isEmpty(), qPrintable(wrong.join(QLatin1Char('\n'))));
@@ -145,7 +135,7 @@ void tst_Rooms::filesStayShort()
     for (auto it = mSources.cbegin(); it != mSources.cend(); ++it) {
         const bool frame = it.key() == QLatin1String("shell/MainScreen.cpp");
         if (it.value().size() > (frame ? 400 : 650))
-            tooLong.append(it.key() + QStringLiteral(": ") + QString::number(it.value().size()));
+            tooLong.append(it.key() + u": "_s + QString::number(it.value().size()));
     }
     QVERIFY2(tooLong.isEmpty(), qPrintable(tooLong.join(QLatin1Char('\n'))));
 }

@@ -5,6 +5,7 @@
 #include "platform/desktop/programfolder.h"
 #include "shell/services/clsRegistry.h"
 #include "shell/services/globals.h"
+#include "support/datarows.h"
 #include "support/ordinaryuser.h"
 #include "support/scripteddesktop.h"
 #include "support/testcatalogue.h"
@@ -24,10 +25,9 @@ private slots:
     void makesNone_data();
     void makesNone();
     void cannotBeMade();
-    void namedFolder();
 
 private:
-    QString catalogue() const { return mDesktop->folder + QStringLiteral("/Compact4.orv"); }
+    QString catalogue() const { return mDesktop->folder + u"/Compact4.orv"_s; }
     std::unique_ptr<QTemporaryDir> mHome;
     std::unique_ptr<ScriptedDesktop> mDesktop;
 };
@@ -44,16 +44,15 @@ void tst_Provision::init()
 void tst_Provision::firstStart()
 {
     // An attempt that was cut off stands beside it.
-    QDir().mkpath(mDesktop->folder + QStringLiteral(".new"));
-    writeFile(mDesktop->folder + QStringLiteral(".new/Compact4.orv"), "half");
+    QDir().mkpath(mDesktop->folder + u".new"_s);
+    writeFile(mDesktop->folder + u".new/Compact4.orv"_s, "half");
     provisionCatalogue();
-    QCOMPARE(QDir(mDesktop->folder).entryList(QDir::Files),
-             QStringList{QStringLiteral("Compact4.orv")});
-    QVERIFY(!QFile::exists(mDesktop->folder + QStringLiteral(".new")));
+    QCOMPARE(QDir(mDesktop->folder).entryList(QDir::Files), QStringList{u"Compact4.orv"_s});
+    QVERIFY(!QFile::exists(mDesktop->folder + u".new"_s));
     cataloguefile::inspect(catalogue());
     openConnection(catalogue());
     cataloguefile::verify(*gConnection, true);
-    gConnection->Execute(QStringLiteral("insert into artiesten values (1,'x')"));
+    gConnection->Execute(u"insert into artiesten values (1,'x')"_s);
     gConnection.reset();
 
     provisionCatalogue(); // not again, whatever has become of the file
@@ -64,10 +63,10 @@ void tst_Provision::firstStart()
 
 void tst_Provision::makesNone_data()
 {
-    QTest::addColumn<QString>("because");
-    QTest::newRow("started before") << QStringLiteral("session");
-    QTest::newRow("another folder") << QStringLiteral("other");
-    QTest::newRow("folder is there") << QStringLiteral("there");
+    const DataRows<QString> row("because");
+    row("started before", "session");
+    row("another folder", "other");
+    row("folder is there", "there");
 }
 
 void tst_Provision::makesNone()
@@ -75,9 +74,9 @@ void tst_Provision::makesNone()
     QFETCH(QString, because);
     if (because == QLatin1String("session")) {
         clsRegistry().CreateKey(settingsKey);
-        clsRegistry().SetValue(settingsKey, QStringLiteral("Session"), 1);
+        clsRegistry().SetValue(settingsKey, u"Session"_s, 1);
     } else if (because == QLatin1String("other")) {
-        mDesktop->folder = mHome->filePath(QStringLiteral("elsewhere"));
+        mDesktop->folder = mHome->filePath(u"elsewhere"_s);
     } else {
         QDir().mkpath(mDesktop->folder);
     }
@@ -101,14 +100,6 @@ void tst_Provision::cannotBeMade()
     QFile::setPermissions(mHome->path(), QFile::Permissions(0x7700));
     QVERIFY2(told.contains(mDesktop->folder), qPrintable(told));
     QVERIFY(QDir(mHome->path()).isEmpty());
-}
-
-void tst_Provision::namedFolder()
-{
-    qputenv("SONGCASE_FOLDER", QFile::encodeName(mHome->path() + QStringLiteral("/a/../b/")));
-    QCOMPARE(programfolder::find(), mHome->path() + QStringLiteral("/b"));
-    qunsetenv("SONGCASE_FOLDER");
-    QCOMPARE(programfolder::find(), programfolder::userFolder());
 }
 
 QTEST_GUILESS_MAIN(tst_Provision)

@@ -19,7 +19,6 @@ private slots:
     void init() { mDesktop = std::make_unique<ScriptedDesktop>(); }
     void cleanup() { mDesktop.reset(); }
     void aSecondStartBringsTheFirstUp();
-    void anotherCatalogueIsAnotherProgram();
     void aRunThatDidNotEndIsNoticed();
     void aFirstThatDoesNotAnswer();
 
@@ -27,7 +26,7 @@ private:
     QString lockFile() const
     {
         const QDir folder = QFileInfo(mDesktop->settings).dir();
-        return folder.filePath(folder.entryList({QStringLiteral("songcase-*.lock")}).value(0));
+        return folder.filePath(folder.entryList({u"songcase-*.lock"_s}).value(0));
     }
 
     std::unique_ptr<ScriptedDesktop> mDesktop;
@@ -50,14 +49,6 @@ void tst_SingleInstance::aSecondStartBringsTheFirstUp()
     SingleInstance next(mDesktop->folder);
     QCOMPARE(next.take(), Outcome::First);
     QVERIFY(!next.lastRunBroken());
-}
-
-void tst_SingleInstance::anotherCatalogueIsAnotherProgram()
-{
-    SingleInstance first(mDesktop->folder);
-    QCOMPARE(first.take(), Outcome::First);
-    SingleInstance other(mDesktop->folder + QStringLiteral("/other"));
-    QCOMPARE(other.take(), Outcome::First);
 }
 
 void tst_SingleInstance::aRunThatDidNotEndIsNoticed()
