@@ -5,7 +5,6 @@
 #include <QDirIterator>
 #include <QFile>
 #include <QRegularExpression>
-#include <QTest>
 
 /// The architecture as a test: which folder may include which, and how long a file may be.
 class tst_Rooms : public QObject
@@ -14,7 +13,6 @@ class tst_Rooms : public QObject
 
 private slots:
     void initTestCase();
-    void everyFileHasARoom();
     void includesPointDownwards();
     void librariesStayInTheirRooms_data();
     void librariesStayInTheirRooms();
@@ -73,12 +71,8 @@ void tst_Rooms::initTestCase()
             QString::fromUtf8(file.readAll()).split(QLatin1Char('\n'));
     }
     QVERIFY(mSources.size() > 50);
-}
-
-void tst_Rooms::everyFileHasARoom()
-{
-    for (auto it = mSources.cbegin(); it != mSources.cend(); ++it)
-        QVERIFY2(roomOf(it.key()) >= 0, qPrintable(it.key()));
+    for (auto file = mSources.cbegin(); file != mSources.cend(); ++file)
+        QVERIFY2(roomOf(file.key()) >= 0, qPrintable(file.key()));
 }
 
 void tst_Rooms::includesPointDownwards()

@@ -8,8 +8,6 @@
 #include "support/scripteddesktop.h"
 #include "support/testcatalogue.h"
 
-#include <QTest>
-
 /// The rules that all writers of the catalogue share: ids, quoting, the clean-up of orphans.
 class tst_CleanOrphans : public QObject
 {

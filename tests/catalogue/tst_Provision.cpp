@@ -12,7 +12,6 @@
 
 #include <QDir>
 #include <QFile>
-#include <QTest>
 
 /// The folder that the very first start makes, and the starts that must make none.
 class tst_Provision : public QObject
@@ -22,7 +21,6 @@ class tst_Provision : public QObject
 private slots:
     void init();
     void firstStart();
-    void makesNone_data();
     void makesNone();
     void cannotBeMade();
 
@@ -61,28 +59,20 @@ void tst_Provision::firstStart()
     QVERIFY(!QFile::exists(catalogue()));
 }
 
-void tst_Provision::makesNone_data()
-{
-    const DataRows<QString> row("because");
-    row("started before", "session");
-    row("another folder", "other");
-    row("folder is there", "there");
-}
-
 void tst_Provision::makesNone()
 {
-    QFETCH(QString, because);
-    if (because == QLatin1String("session")) {
-        clsRegistry().CreateKey(settingsKey);
-        clsRegistry().SetValue(settingsKey, u"Session"_s, 1);
-    } else if (because == QLatin1String("other")) {
-        mDesktop->folder = mHome->filePath(u"elsewhere"_s);
-    } else {
-        QDir().mkpath(mDesktop->folder);
-    }
-    provisionCatalogue();
-    QVERIFY(!QFile::exists(catalogue()));
-    QCOMPARE(QFile::exists(mDesktop->folder), because == QLatin1String("there"));
+    const QString own = mDesktop->folder;
+    mDesktop->folder = mHome->filePath(u"elsewhere"_s);
+    provisionCatalogue(); // not his own folder
+    QVERIFY(!QFile::exists(mDesktop->folder));
+    mDesktop->folder = own;
+    QDir().mkpath(own);
+    provisionCatalogue(); // it is there already
+    QVERIFY(QDir(own).isEmpty() && QDir().rmdir(own));
+    clsRegistry().CreateKey(settingsKey);
+    clsRegistry().SetValue(settingsKey, u"Session"_s, 1);
+    provisionCatalogue(); // started before
+    QVERIFY(!QFile::exists(own));
 }
 
 void tst_Provision::cannotBeMade()

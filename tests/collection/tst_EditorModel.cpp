@@ -4,12 +4,9 @@
 #include "collection/frmCDRoot.h"
 #include "collection/frmCDRootE.h"
 #include "platform/ado/connection.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
 #include "support/editing.h"
 
 #include <QRandomGenerator>
-#include <QTest>
 #include <map>
 #include <set>
 

@@ -1,14 +1,11 @@
 // Label: screen
 #include "collection/frmCDList.h"
 #include "collection/recordtree.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
 #include "support/editing.h"
 #include "support/screentest.h"
 
 #include <QElapsedTimer>
 #include <QTabWidget>
-#include <QTest>
 
 /// The record tree in the browser, level by level, down to the editor of a disc.
 class tst_RecordTree : public ScreenTest
@@ -22,7 +19,6 @@ private slots:
     void artistsUnderTheirRoots();
     void fromArtistToDisc();
     void aDiscOpensItsEditor();
-    void aReloadClosesTheTree();
     void largeNodesOpenAtOnce();
 
 private:
@@ -146,19 +142,6 @@ void tst_RecordTree::aDiscOpensItsEditor()
     mTree->setCurrentItem(mTree->node(u"C1"_s));
     QTest::keyClick(mTree, Qt::Key_Return);
     QCOMPARE(openEditors(), texts("frmCDRootE U 2", "frmCDRoot U 1"));
-}
-
-void tst_RecordTree::aReloadClosesTheTree()
-{
-    fill();
-    show();
-    open("E");
-    open("A12");
-    mScreen->RefreshLists();
-    QCOMPARE(mTree->topLevelItemCount(), 27);
-    QVERIFY(!mTree->node(u"A12"_s));
-    QVERIFY(!mTree->node(u"E"_s)->isExpanded());
-    QCOMPARE(below(open("E")), texts("eddy", "Emma"));
 }
 
 // A slow way to insert or to look for nodes takes seconds here.

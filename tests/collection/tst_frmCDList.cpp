@@ -3,15 +3,12 @@
 #include "collection/recordtree.h"
 #include "controls/DBListViewCTL.h"
 #include "platform/ado/connection.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
 #include "support/editing.h"
 #include "support/screentest.h"
 
 #include <QPushButton>
 #include <QStatusBar>
 #include <QTabWidget>
-#include <QTest>
 
 /// The browser on a real catalogue file.
 class tst_frmCDList : public ScreenTest

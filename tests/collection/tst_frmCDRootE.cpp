@@ -1,12 +1,9 @@
 // Label: screen
 #include "collection/frmCDRootE.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
 #include "support/editing.h"
 
 #include <QApplication>
 #include <QLabel>
-#include <QTest>
 
 /// The editor of albums, as far as it differs from that of compilations: the artist.
 class tst_frmCDRootE : public QObject
@@ -26,8 +23,6 @@ private slots:
     void theNewArtistsOwnTrackWins();
     void aSongTwiceOnTheAlbum();
     void twoArtistsOfOneNameGiveAThird();
-    void whatASaveTouches_data();
-    void whatASaveTouches();
     void aFailureTakesTheArtistBackToo();
     void anAlbumOfTheSameNameByAnother();
 
@@ -166,33 +161,6 @@ void tst_frmCDRootE::twoArtistsOfOneNameGiveAThird()
     editor->SaveAtUserRequest();
     QCOMPARE(artists(), texts("Anna", "Bob", "anna", "Anna"));
     QCOMPARE(mE->catalogue.rows("select Artiest_ID from CDTitels where ID=3"), texts("8"));
-}
-
-void tst_frmCDRootE::whatASaveTouches_data()
-{
-    const DataRows<QString, bool, bool, int> row("field", "updates", "moves", "refreshes");
-    row("nothing", "", false, false, 0);
-    row("year", "txtYear", true, false, 0);
-    row("title", "txtTitel", true, false, 1);
-    row("artist", "txtArtiest", true, true, 1);
-}
-
-void tst_frmCDRootE::whatASaveTouches()
-{
-    QFETCH(QString, field);
-    CdEditor *editor = openAlbum();
-    mE->catalogue.exec("create table Log(x);"
-                       "create trigger t after update on CDTitels begin "
-                       "insert into Log values ('title'); end;"
-                       "create trigger l after update on CompactDiscs begin "
-                       "insert into Log values ('link'); end");
-    if (!field.isEmpty())
-        mE->editor->findChild<QLineEdit *>(field)->setText(u"2001"_s);
-    editor->SaveAtUserRequest();
-    const QStringList log = mE->catalogue.rows("select distinct x from Log");
-    QTEST(log.contains(u"title"), "updates");
-    QTEST(log.contains(u"link"), "moves");
-    QTEST(mE->browser->refreshed, "refreshes");
 }
 
 void tst_frmCDRootE::aFailureTakesTheArtistBackToo()

@@ -8,7 +8,6 @@
 #include <QHeaderView>
 #include <QScrollBar>
 #include <QSignalSpy>
-#include <QTest>
 #include <QTimer>
 
 using namespace ADODB;
@@ -101,9 +100,7 @@ private slots:
     void populatesAnew();
     void showsAnEmptyRecordset();
     void keepsItsRows();
-    void sorts_data();
-    void sorts();
-    void keepsSelectionOverSort();
+    void sortsAndKeepsTheSelection();
     void writesFollowTheRecord();
     void itemsOfOldRowsAreNothing();
     void tellsKeys_data();
@@ -123,20 +120,16 @@ void tst_DBListViewCTL::populatesAnew()
 {
     ShownList list;
     list.ColumnHeaders().Item(2).setText(u"Artist"_s);
-    list.ColumnHeaders().Item(2).setWidth(300);
     list.ListItems().Item(2).setBold(true);
-    list.ListItems().Item(2).setSubItems(1, u"changed"_s);
     list.setSelectedItem(list.ListItems().Item(4));
     list.setSortKey(2);
     list.setSorted(true);
     list.Populate();
     QCOMPARE(shown(list), u"11*< 9 30 4 5"_s);
-    QVERIFY(!list.Sorted());
+    QVERIFY(!list.Sorted() && !list.ListItems().Item(2).Bold());
+    QVERIFY(!list.ListItems().Item(0) && !list.ListItems().Item(6));
     QVERIFY(list.ColumnHeaders().Item(1).Width() > 0);
-    QCOMPARE(list.ColumnHeaders().Item(2).Width(), list.ColumnHeaders().Item(3).Width());
     QCOMPARE(list.ColumnHeaders().Item(2).Text(), u"Artiest"_s);
-    QCOMPARE(list.ListItems().Item(2).SubItems(1), u"abba"_s);
-    QVERIFY(!list.ListItems().Item(2).Bold());
 
     list.setRecordset(manyDiscs(300));
     list.Populate();
@@ -188,46 +181,30 @@ void tst_DBListViewCTL::keepsItsRows()
     QCOMPARE(list.ListItems().Count(), 4);
 }
 
-void tst_DBListViewCTL::sorts_data()
-{
-    const DataRows<int, QString> row("key", "expected");
-    row("numbers by value", 0, "4 5 9 11*< 30");
-    row("texts, equal ones in order", 1, "9 4 30 5 11*<");
-    row("no such column", 3, "11*< 9 30 4 5");
-}
-
-void tst_DBListViewCTL::sorts()
-{
-    QFETCH(int, key);
-    ShownList list;
-    list.setSortKey(2); // an earlier order must not show in the later one
-    list.setSorted(true);
-    list.setSortKey(key);
-    QTEST(shown(list), "expected");
-    QCOMPARE(list.horizontalHeader()->sortIndicatorSection(), key < 3 ? key : -1);
-    list.setSorted(false);
-    QCOMPARE(shown(list), u"11*< 9 30 4 5"_s);
-    QCOMPARE(list.horizontalHeader()->sortIndicatorSection(), -1);
-}
-
-void tst_DBListViewCTL::keepsSelectionOverSort()
+void tst_DBListViewCTL::sortsAndKeepsTheSelection()
 {
     ShownList list;
     list.setSelectedItem(list.ListItems().Item(2));
     list.ListItems().Item(5).setSelected(true);
     list.ListItems().Item(4).setSelected(true);
-    QCOMPARE(shown(list), u"11 9*< 30 4* 5*"_s);
-    list.setSortKey(1);
+    list.setSortKey(2); // an earlier order must not show in the later one
     list.setSorted(true);
+    list.setSortKey(1);
     QCOMPARE(shown(list), u"9*< 4* 30 5* 11"_s);
+    QCOMPARE(list.horizontalHeader()->sortIndicatorSection(), 1);
     QCOMPARE(list.selectionModel()->selection().size(), 2);
     // Going on from the current row by keys takes its new place.
     QTest::keyClick(&list, Qt::Key_Down);
     QCOMPARE(shown(list), u"9 4*< 30 5 11"_s);
-
     list.ListItems().Item(2).setSelected(false);
     list.setSortKey(0);
     QCOMPARE(shown(list), u"4< 5 9 11 30"_s);
+    list.setSortKey(3); // no such column
+    QCOMPARE(shown(list), u"11 9 30 4< 5"_s);
+    list.setSortKey(0);
+    list.setSorted(false);
+    QCOMPARE(shown(list), u"11 9 30 4< 5"_s);
+    QCOMPARE(list.horizontalHeader()->sortIndicatorSection(), -1);
 }
 
 void tst_DBListViewCTL::writesFollowTheRecord()
@@ -276,17 +253,12 @@ void tst_DBListViewCTL::tellsKeys_data()
                                                                        "taken");
     row("Delete", Qt::Key_Delete, {}, {46, 0}, false);
     row("Insert", Qt::Key_Insert, {}, {45, 0}, false);
-    row("Shift+Insert", Qt::Key_Insert, Qt::ShiftModifier, {}, false);
     row("Ctrl+Insert", Qt::Key_Insert, Qt::ControlModifier, {}, false);
-    row("Enter", Qt::Key_Return, {}, {13, 0}, false);
     row("Enter of the number block", Qt::Key_Enter, Qt::KeypadModifier, {13, 0}, false);
     row("Esc", Qt::Key_Escape, {}, {27, 0}, false);
-    row("F1", Qt::Key_F1, {}, {}, false);
     row("F8", Qt::Key_F8, {}, {}, false);
     row("Tab", Qt::Key_Tab, {}, {9, 0}, false);
-    row("Down", Qt::Key_Down, {}, {40, 0}, true);
     row("Shift+Up", Qt::Key_Up, Qt::ShiftModifier, {38, 1}, true);
-    row("Home", Qt::Key_Home, {}, {36, 0}, true);
     row("Ctrl+Alt+PgDn", Qt::Key_PageDown, Qt::ControlModifier | Qt::AltModifier, {34, 6}, true);
     row("letter", Qt::Key_Q, {}, {81, 0}, true);
     row("Ctrl+Z", Qt::Key_Z, Qt::ControlModifier, {90, 2}, false);
@@ -313,6 +285,7 @@ void tst_DBListViewCTL::tellsKeys()
     QCOMPARE(up.value(0), told);
 }
 
+// A screen may fill, disable or close the list at a key; the list then leaves it.
 void tst_DBListViewCTL::keyDownComesFirst()
 {
     ShownList list;
@@ -321,14 +294,12 @@ void tst_DBListViewCTL::keyDownComesFirst()
     QTest::keyClick(&list, Qt::Key_End);
     QCOMPARE(before, u"11*< 9 30 4 5"_s);
     QCOMPARE(shown(list), u"11 9 30 4 5*<"_s);
-    // A screen may fill or disable the list at a key; the list then leaves it.
     connect(&list, &DBListViewCTL::KeyDown, &list, [&] {
         list.Populate();
         list.setEnabled(false);
     });
     QTest::keyClick(&list, Qt::Key_Down);
     QCOMPARE(shown(list), u"11*< 9 30 4 5"_s);
-    // It may even close it.
     auto *own = new ShownList;
     connect(own, &DBListViewCTL::KeyDown, own, [own] { delete own; });
     QKeyEvent press(QEvent::KeyPress, Qt::Key_Return, {});

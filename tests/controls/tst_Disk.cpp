@@ -3,15 +3,12 @@
 #include "controls/DiskE.h"
 #include "controls/celledit.h"
 #include "platform/ado/connection.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
 #include "support/screentest.h"
 
 #include <QApplication>
 #include <QClipboard>
 #include <QListWidget>
 #include <QSignalSpy>
-#include <QTest>
 #include <QVBoxLayout>
 
 /// Both track grids on a screen with a field before and one behind, as a person uses them.
@@ -32,7 +29,6 @@ private slots:
     void keysOfTheToolbar();
     void tabLeavesAtTheEnds();
     void focusIsTheGridsWhileItEdits();
-    void yearsAreChecked_data();
     void yearsAreChecked();
     void completion();
     void genres();
@@ -150,20 +146,14 @@ void tst_Disk::typing_data()
     const DataRows<QByteArray, QString, QString> row("keys", "cells", "place");
     const char *const asItWas = "Abba,Waterloo,Pop,1974/Beck,Loser,,1994/";
     row("Cher{Return}", "Cher,Waterloo,Pop,1974/Beck,Loser,,1994/", "2.2");
-    row("{Return}!{Return}", "Abba!,Waterloo,Pop,1974/Beck,Loser,,1994/", "2.2");
-    row("{F2}x{Esc}", asItWas, "1.2");
     row("x{Esc}{Esc}", asItWas, "1.2");
     row("{Left}x{Tab}", "x,Waterloo,Pop,1974/Beck,Loser,,1994/", "1.3");
     row("{Tab}x{Tab}y{Shift+Tab}z{Return}", "Abba,z,y,1974/Beck,Loser,,1994/", "2.3");
     row("{Delete}", ",Waterloo,Pop,1974/Beck,Loser,,1994/", "1.2");
     row("{Down}{Down}Cher{Tab}Believe{Tab}{Tab}1998{Tab}Dido",
         "Abba,Waterloo,Pop,1974/Beck,Loser,,1994/Cher,Believe,,1998/", "4.2");
-    row("{Down}{Down}{Down}Cher{Return}", "Abba,Waterloo,Pop,1974/Beck,Loser,,1994/Cher,,,/",
-        "4.2");
-    row("x{Down}", "x,Waterloo,Pop,1974/Beck,Loser,,1994/", "2.2");
     row("x{Home}y{End}z{Return}", "yxz,Waterloo,Pop,1974/Beck,Loser,,1994/", "2.2");
     row("x{Insert}", ",,,/x,Waterloo,Pop,1974/Beck,Loser,,1994/", "1.2");
-    row("{PgDown}{Insert}q{PgUp}", "Abba,Waterloo,Pop,1974/q,,,/Beck,Loser,,1994/", "1.2");
     row("{End}", "Beck,Loser,,1994/", "1.2");
 }
 
@@ -246,33 +236,21 @@ void tst_Disk::focusIsTheGridsWhileItEdits()
     QCOMPARE(cells(), u"x,Waterloo,Pop,1974/y,Loser,,1994/"_s); // kept
 }
 
-void tst_Disk::yearsAreChecked_data()
-{
-    const DataRows<QByteArray, bool> row("year", "taken");
-    for (const char *year : {"1901", "1e10", "2020 "})
-        row(year, true);
-    for (const char *year : {"1900", "abcd", "0x7c"})
-        row(year, false);
-}
-
 void tst_Disk::yearsAreChecked()
 {
-    QFETCH(QByteArray, year);
-    QFETCH(bool, taken);
     showDisk();
     mGrid->setCurrentRow(2);
-    mGrid->setCurrentColumn(5);
-    if (!taken)
+    for (const char *year : {"1900", "abcd", "0x7c"}) {
+        mGrid->setCurrentColumn(5);
         mDesktop->expectBox(u"error [Songcase] Invalid year!"_s);
-    type(QByteArray(year + "{Return}").constData());
-    mDesktop->verifyAllCame();
-    QCOMPARE(place(), taken ? u"3.5"_s : u"2.5"_s);
-    QCOMPARE(edit() != nullptr, !taken);
-    if (!taken) {
-        QCOMPARE(edit()->selectedText(), QString::fromLatin1(year));
-        type("1980{Return}");
-        QCOMPARE(place(), u"3.5"_s);
+        type(year);
+        type("{Return}");
+        mDesktop->verifyAllCame();
+        QCOMPARE(place(), u"2.5"_s);
+        QCOMPARE(edit()->selectedText(), QLatin1String(year));
     }
+    type("1e10{Return}");
+    QCOMPARE(place(), u"3.5"_s);
     save();
     QVERIFY(!mGrid->HasError());
 }

@@ -7,8 +7,6 @@
 #include "support/datarows.h"
 #include "support/testcatalogue.h"
 
-#include <QTest>
-
 using Artists = TrackStore::Artists;
 
 /// The tracks of a disc in a real catalogue: what a save writes, and what it leaves alone.

@@ -3,7 +3,6 @@
 #include "support/datarows.h"
 #include "support/icuorder.h"
 
-#include <QTest>
 #include <algorithm>
 #include <numeric>
 #include <random>

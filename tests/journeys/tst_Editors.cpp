@@ -1,8 +1,6 @@
 // Label: journey
 #include "controls/DBListViewCTL.h"
 #include "platform/ado/connection.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
 #include "support/editing.h"
 #include "support/journey.h"
 
@@ -10,7 +8,6 @@
 #include <QMdiArea>
 #include <QMdiSubWindow>
 #include <QTabWidget>
-#include <QTest>
 
 /// A person enters and changes discs in the whole program, with the keyboard alone.
 class tst_Editors : public Journey

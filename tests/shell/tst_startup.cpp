@@ -7,8 +7,6 @@
 #include "support/scripteddesktop.h"
 #include "support/testcatalogue.h"
 
-#include <QTest>
-
 /// The settings side of a start, and the opening of the catalogue.
 class tst_startup : public QObject
 {

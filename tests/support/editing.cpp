@@ -1,7 +1,5 @@
 #include "support/editing.h"
 
-#include "shell/services/globals.h"
-
 #include <QApplication>
 #include <QTest>
 

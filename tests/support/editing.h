@@ -2,6 +2,8 @@
 
 #include "collection/cdeditor.h"
 #include "controls/trackgrid.h"
+#include "shell/services/globals.h"
+#include "shell/services/messages.h"
 #include "support/countingbrowser.h"
 #include "support/datarows.h"
 #include "support/scripteddesktop.h"

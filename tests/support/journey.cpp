@@ -2,8 +2,6 @@
 
 #include "catalogue/cataloguefile.h"
 #include "controls/DBListViewCTL.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
 
 void Journey::languages()
 {

@@ -1,8 +1,5 @@
 #include "support/screentest.h"
 
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
-
 #include <QCoreApplication>
 
 void ScreenTest::init()

@@ -1,18 +1,13 @@
 // Label: screen
 #include "catalogue/cataloguefile.h"
 #include "platform/ado/recordset.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
 #include "support/importfixture.h"
-#include "support/scripteddesktop.h"
-#include "support/testcatalogue.h"
 #include "textimport/catalogueload.h"
 #include "textimport/filereading.h"
 #include "textimport/frmImportDBBusy.h"
 
 #include <QApplication>
 #include <QProcess>
-#include <QTest>
 #include <csignal>
 #include <cstdio>
 #include <sys/mount.h>

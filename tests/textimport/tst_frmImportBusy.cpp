@@ -1,14 +1,11 @@
 // Label: screen
 #include "platform/ado/recordset.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
 #include "support/importfixture.h"
 #include "textimport/frmImportBusy.h"
 
 #include <QLabel>
 #include <QProgressBar>
 #include <QPushButton>
-#include <QTest>
 #include <QTimer>
 
 /// The reading of a file behind its progress: what is refused, and that nobody closes it meanwhile.

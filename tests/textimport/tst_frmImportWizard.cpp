@@ -1,13 +1,10 @@
 // Label: screen
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
 #include "support/importfixture.h"
 #include "textimport/frmImportWizard.h"
 
 #include <QCheckBox>
 #include <QLineEdit>
 #include <QPushButton>
-#include <QTest>
 
 /// The choice of a file and of its format.
 class tst_frmImportWizard : public ImportTest

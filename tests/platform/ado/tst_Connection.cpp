@@ -6,7 +6,6 @@
 #include "support/testcatalogue.h"
 
 #include <QElapsedTimer>
-#include <QTest>
 #include <sqlite3.h>
 
 using namespace ADODB;
@@ -27,10 +26,8 @@ private slots:
     void abandonedTransaction();
     void handlerInsideARunningRoutine();
     void failedCommit();
-    void fateOfATransaction();
     void firstRowsReadsNoMore();
     void engineRollsBackByItself();
-    void closesWithOpenTransaction();
     void lockedByAnotherProgram();
     void opensWhatIsNamed();
     void nextIdReadsAnIndex();
@@ -234,33 +231,6 @@ void tst_Connection::failedCommit()
     QCOMPARE(catalogue.count("select max(id) from artiesten"), 2);
 }
 
-void tst_Connection::fateOfATransaction()
-{
-    TestCatalogue catalogue;
-    QVERIFY(!gConnection->fate());
-    std::shared_ptr<const TransactionFate> kept, joined, joinedLost, outer;
-    {
-        Transaction t(*gConnection);
-        outer = gConnection->fate();
-        {
-            Transaction inner(*gConnection);
-            joinedLost = gConnection->fate();
-            inner.RollbackTrans();
-        }
-        Transaction inner(*gConnection);
-        joined = gConnection->fate();
-        inner.CommitTrans();
-        QVERIFY(joinedLost->undone() && !joined->undone() && !outer->undone());
-        t.RollbackTrans();
-        QVERIFY(joined->undone() && outer->undone());
-    }
-    Transaction t(*gConnection);
-    kept = gConnection->fate();
-    t.CommitTrans();
-    gConnection->RollbackTrans();
-    QVERIFY(!kept->undone());
-}
-
 // A row further on would be an error: it must not be reached.
 void tst_Connection::firstRowsReadsNoMore()
 {
@@ -296,20 +266,6 @@ void tst_Connection::engineRollsBackByItself()
     QCOMPARE(artists(), 0);
     addArtist(4);
     QCOMPARE(catalogue.count("select count(*) from artiesten"), 1);
-}
-
-void tst_Connection::closesWithOpenTransaction()
-{
-    TestCatalogue catalogue;
-    {
-        Transaction t(*gConnection);
-        addArtist(1);
-        gConnection->Close();
-        QCOMPARE(numberOf([&] { t.CommitTrans(); }), int(errNotPermitted));
-        QCOMPARE(numberOf([] { artists(); }), int(errObjectClosed));
-        openConnection(catalogue.file()); // the old one is gone when t ends
-    }
-    QCOMPARE(artists(), 0);
 }
 
 void tst_Connection::lockedByAnotherProgram()

@@ -3,8 +3,6 @@
 #include "platform/ado/error.h"
 #include "support/datarows.h"
 
-#include <QTest>
-
 using namespace ADODB;
 
 /// What becomes of a statement on its way to the engine. A "|" parts the lifted literals in the

@@ -5,7 +5,6 @@
 #include "support/datarows.h"
 #include "support/testcatalogue.h"
 
-#include <QTest>
 #include <sqlite3.h>
 
 using namespace ADODB;
@@ -44,19 +43,15 @@ void tst_SqlFunctions::expressions_data()
 {
     const DataRows<QString, QString> row("expression", "value");
     row("left('\U0001F3B5\U0001F3B5x',1)", "\U0001F3B5");
-    row("left('ab',5)", "ab");
     row("left('ab',-1)", "");
     row("left(1985,2)", "19");
     row("left(null,1)", "NULL");
     row("isnumeric(' -1.5 ')", "1");
-    row("isnumeric('1a')", "0");
     row("isnumeric(null)", "0");
     row("iif(isnumeric(left('10cc',1)),1,0)", "1");
     row("iif('v'='V','Compilation','Album')", "Album"); // a literal has no collation
     row("'ÉDITH' like 'éd%'", "1");
-    row("'Edith' like 'éd%'", "0");
     row("null like '%'", "NULL");
-    row("1985 like '19__'", "1");
     row("'a' between 'A' and 'b'", "1");
 }
 

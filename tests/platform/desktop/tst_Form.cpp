@@ -8,7 +8,6 @@
 #include <QLineEdit>
 #include <QMessageBox>
 #include <QPushButton>
-#include <QTest>
 #include <QTimer>
 #include <QVBoxLayout>
 
@@ -23,7 +22,6 @@ private slots:
     void loadsOnceAndGoes();
     void reloadsOnTheSpot();
     void unloadsWhileLoading();
-    void modalEndsWithUnloadOrHide();
     void hostedOnesAreBroughtUp();
     void buttonsOfEnterAndEsc_data();
     void buttonsOfEnterAndEsc();
@@ -157,19 +155,6 @@ void tst_Form::unloadsWhileLoading()
         form->leavesAtLoad = true;
         modal ? form->ShowModal() : form->Show();
         QVERIFY(form->isUnloaded() && !form->isVisible());
-    }
-}
-
-void tst_Form::modalEndsWithUnloadOrHide()
-{
-    QtDesktop real;
-    for (const bool hides : {false, true}) {
-        Desktop::setCurrent(&real);
-        auto *form = new TestForm;
-        QTimer::singleShot(0, form, [=] { hides ? form->hide() : void(form->Unload()); });
-        form->ShowModal();
-        QVERIFY(!form->isVisible());
-        QCOMPARE(form->isUnloaded(), !hides);
     }
 }
 

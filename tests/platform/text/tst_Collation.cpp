@@ -4,7 +4,6 @@
 #include "support/icuorder.h"
 
 #include <QString>
-#include <QTest>
 #include <random>
 
 /// Holds the short ways of the order of texts against ICU itself.

@@ -3,8 +3,6 @@
 #include "platform/text/textrules.h"
 #include "support/datarows.h"
 
-#include <QTest>
-
 /// What is a number, proper case, cutting, line ends and code pages.
 class tst_TextRules : public QObject
 {
@@ -13,8 +11,6 @@ class tst_TextRules : public QObject
 private slots:
     void isNumeric_data();
     void isNumeric();
-    void properCase_data();
-    void properCase();
     void windows1252();
 };
 
@@ -35,27 +31,6 @@ void tst_TextRules::isNumeric()
 {
     QFETCH(QString, text);
     QTEST(text::isNumeric(text), "numeric");
-}
-
-void tst_TextRules::properCase_data()
-{
-    const DataRows<QString, QString> row("from", "to");
-    row("", "");
-    row("THE dark SIDE", "The Dark Side");
-    row("o'neill-mc (live)", "O'neill-mc (live)");
-    row("  two\tblanks", "  Two\tBlanks");
-    row("élan VITAL", "Élan Vital");
-    row("straße ßa", "Straße ßa");
-    row("10cc a1B", "10cc A1b");
-    row("\U00010428\U00010400", "\U00010400\U00010428");
-    row("line\rbreak", "Line\rBreak");
-}
-
-void tst_TextRules::properCase()
-{
-    QFETCH(QString, from);
-    QTEST(text::properCase(from), "to");
-    QCOMPARE(text::properCase(from).size(), from.size());
 }
 
 // Byte by byte; the five that the code page leaves open stay as they

@@ -6,7 +6,6 @@
 
 #include <QDir>
 #include <QFile>
-#include <QTest>
 
 /// Files, folders and the walk through a tree, on a real one.
 class tst_FileUtilities : public QObject

@@ -6,7 +6,6 @@
 
 #include <QCryptographicHash>
 #include <QSet>
-#include <QTest>
 
 /// The texts of the program: the fixed table as a whole, and the look-up.
 class tst_Messages : public QObject

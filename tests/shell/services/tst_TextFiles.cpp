@@ -6,7 +6,6 @@
 #include <QDir>
 #include <QFile>
 #include <QSaveFile>
-#include <QTest>
 #include <csignal>
 #include <sys/resource.h>
 

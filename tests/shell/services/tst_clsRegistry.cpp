@@ -8,7 +8,6 @@
 #include <QDir>
 #include <QFile>
 #include <QFileInfo>
-#include <QTest>
 #include <sys/wait.h>
 
 /// The store of settings on a real file, and what it tells of failures.
@@ -22,7 +21,6 @@ private slots:
     void keepsTexts();
     void spellingsOfTheKey();
     void missingOnes();
-    void deletes();
     void otherContentOfTheFile();
     void damagedFileIsSetAside_data();
     void damagedFileIsSetAside();
@@ -116,22 +114,6 @@ void tst_clsRegistry::missingOnes()
     QCOMPARE(mEvents.size(), 3);
     mRegistry->DeleteValue(settingsKey, u"Session"_s); // soft for reads alone
     QCOMPARE(mEvents.size(), 4);
-}
-
-void tst_clsRegistry::deletes()
-{
-    const QString below = u"Software\\A\\B\\C"_s, beside = u"Software\\AB"_s;
-    for (const QString &key : {below, beside}) {
-        mRegistry->CreateKey(key);
-        mRegistry->SetValue(key, u"v"_s, 2);
-    }
-    mRegistry->DeleteKey(u"software\\"_s, u"a"_s);
-    QVERIFY(!mRegistry->GetValue(below, u"v"_s).isValid());
-    QCOMPARE(mRegistry->GetValue(beside, u"v"_s), QVariant(2));
-    mEvents.clear();
-    mRegistry->DeleteKey(u"Software"_s, u"A"_s);
-    mRegistry->DeleteValue(beside, u"w"_s);
-    QCOMPARE(mEvents, texts("DeleteKey Software\\A  2", "DeleteValue Software\\AB w 2"));
 }
 
 // Bytes, and what a person may have typed into the file, read as empty and stay when others change.
