@@ -21,7 +21,6 @@ private slots:
     void changingTheArtist();
     void theOldArtistStaysWhereItIsNeeded();
     void theNewArtistsOwnTrackWins();
-    void aSongTwiceOnTheAlbum();
     void twoArtistsOfOneNameGiveAThird();
     void aFailureTakesTheArtistBackToo();
     void anAlbumOfTheSameNameByAnother();
@@ -140,16 +139,6 @@ void tst_frmCDRootE::theNewArtistsOwnTrackWins()
                  "select ID, Genre, Hitjaar from Tracks where Artiest_ID=2 and Titel='Two'"),
              texts("4|Rock|2000"));
     QCOMPARE(mE->catalogue.rows("select Track_ID from CompactDiscs where ID=2"), texts("4"));
-}
-
-void tst_frmCDRootE::aSongTwiceOnTheAlbum()
-{
-    CdEditor *editor = openAlbum();
-    mE->catalogue.exec("update CompactDiscs set Track_ID=1 where ID=3");
-    mE->field("txtArtiest")->setText(u"Cleo"_s);
-    editor->SaveAtUserRequest();
-    QCOMPARE(mE->tracks(3), texts("1/1 Cleo - One", "1/2 Cleo - Two", "2/1 Cleo - One"));
-    QCOMPARE(mE->catalogue.count("select count(*) from Tracks where Artiest_ID=3"), 2);
 }
 
 void tst_frmCDRootE::twoArtistsOfOneNameGiveAThird()

@@ -36,7 +36,6 @@ private slots:
     void refusedRows_data();
     void refusedRows();
     void keptValuesAreTold();
-    void savesWhatIsBeingTyped();
     void aRollbackUndoesTheSave();
 
 private:
@@ -368,22 +367,6 @@ void tst_Disk::keptValuesAreTold()
     save(); // and are not told again
     mGrid->LoadDisc();
     QCOMPARE(cells(), u"Abba,Waterloo,Pop,1974/Beck,Loser,,1994/"_s);
-}
-
-void tst_Disk::savesWhatIsBeingTyped()
-{
-    show<DiskE>();
-    QVERIFY(!mGrid->IsChanged());
-    type("{Down}New");
-    QVERIFY(mGrid->IsChanged());
-    save();
-    QVERIFY(!mGrid->IsChanged());
-    QCOMPARE(mCatalogue->rows("select titel from tracks where id > 3"), texts("New"));
-    type("{Up}y");
-    mGrid->LoadDisc(); // forgets
-    QCOMPARE(cells(), u"Waterloo,Pop,1974/New,,/"_s);
-    mGrid->RemoveDisc();
-    QCOMPARE(mCatalogue->count("select count(*) from compactdiscs where cdtitels_id = 2"), 0);
 }
 
 // The disk is full when the screen commits: nothing of the save counts, and the next one makes up.

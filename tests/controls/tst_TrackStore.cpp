@@ -28,7 +28,6 @@ private slots:
     void theSameSongTwice();
     void albums();
     void linksThatAreGoneComeBack();
-    void noLinkWithoutATitle();
     void removes();
     void completes();
 
@@ -231,15 +230,6 @@ void tst_TrackStore::linksThatAreGoneComeBack()
              texts("16|1|1|1", "17|1|2|2", "18|1|3|3"));
     QCOMPARE(mCatalogue->rows("select cdtitels_id from compactdiscs where id=10"), texts("2"));
     QCOMPARE(mCatalogue->rows("select titel, genre from tracks where id = 2"), texts("SOS|Pop"));
-}
-
-void tst_TrackStore::noLinkWithoutATitle()
-{
-    mCatalogue->exec("delete from cdtitels where id = 1");
-    watchWrites();
-    const auto outcome = save([](TrackModel &m) { m.setText(0, TitleField, u"x"_s); });
-    QVERIFY(outcome.refused);
-    QCOMPARE(mCatalogue->count("select count(*) from seen"), 0);
 }
 
 void tst_TrackStore::removes()

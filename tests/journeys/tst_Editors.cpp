@@ -17,7 +17,7 @@ class tst_Editors : public Journey
 private slots:
     void aNewCompilationOfTwoDiscs_data() { languages(); }
     void aNewCompilationOfTwoDiscs();
-    void closingWithYesNoAndRefused();
+    void closingIsRefused();
     void saveAllOverThreeEditors();
     void aMinimizedEditorComesUpAgain();
     void theProgramEndsThroughTheQuestion();
@@ -98,21 +98,13 @@ void tst_Editors::aNewCompilationOfTwoDiscs()
     closeWindow();
 }
 
-void tst_Editors::closingWithYesNoAndRefused()
+void tst_Editors::closingIsRefused()
 {
     start(languageEnglish);
     newCompilation(u"T"_s);
     keyboard::fill(texts("Anna", "One"));
     mDesktop->expectBox(GetMessage("QuestSaveChanges"), vbYes);
     closeWindow();
-    QCOMPARE(stored().size(), 1);
-
-    QTest::keyClick(mProgram->control<DBListViewCTL>("frmCDList", "ColList"), Qt::Key_Return);
-    keyboard::type("Never kept");
-    mDesktop->expectBox(GetMessage("QuestSaveChanges"), vbNo);
-    closeWindow();
-    QCOMPARE(column("ColList", 1), texts("T"));
-
     QTest::keyClick(mProgram->control<DBListViewCTL>("frmCDList", "ColList"), Qt::Key_Return);
     press(Qt::Key_Delete);
     mDesktop->expectBox(GetMessage("QuestSaveChanges"), vbYes);

@@ -19,9 +19,7 @@ private slots:
     void faults();
     void fields_data();
     void fields();
-    void idsFollowTheCatalogue();
     void filesThatGiveNothing();
-    void oneLineOfMegabytes();
     void progress();
 
 private:
@@ -169,15 +167,6 @@ void tst_FileReading::fields()
     QCOMPARE(track(artist.toUtf8() + "*t**"), u"1|"_s + kept + u"|T|||X|2|1|1"_s);
 }
 
-void tst_FileReading::idsFollowTheCatalogue()
-{
-    mCatalogue->exec("insert into CompactDiscs(ID) values (40), (7);"
-                     "insert into CDTitels(ID) values (99);");
-    QCOMPARE(read('A', "x\n1\n1\na\nb\n\n\n"), u"read"_s);
-    QCOMPARE(importRows(), texts("41|A|B|||X|100|1|1"));
-    QCOMPARE(track("a*b**"), u"41|A|B|||X|101|1|1"_s);
-}
-
 void tst_FileReading::filesThatGiveNothing()
 {
     writeFile(mCatalogue->path("empty.txt"), {});
@@ -190,12 +179,6 @@ void tst_FileReading::filesThatGiveNothing()
         QCOMPARE(readFile(format, mCatalogue->path("folder.txt")), u"not readable, 0"_s);
         QVERIFY(importRows().isEmpty());
     }
-}
-
-void tst_FileReading::oneLineOfMegabytes()
-{
-    const QByteArray line(10 << 20, 'a');
-    QCOMPARE(track(line + "*b**"), u"1|A"_s + QString(254, u'a') + u"|B|||X|2|1|1"_s);
 }
 
 // The word behind the percentage is Dutch in both languages, except where a reader takes it from

@@ -2,6 +2,7 @@
 #include "platform/ado/dialect.h"
 #include "platform/ado/error.h"
 #include "support/datarows.h"
+#include "support/testcatalogue.h"
 
 using namespace ADODB;
 
@@ -16,7 +17,6 @@ private slots:
     void rewrites();
     void refuses_data();
     void refuses();
-    void takesUpAfterARefusal();
 };
 
 namespace
@@ -163,19 +163,8 @@ void tst_Dialect::refuses()
 {
     QFETCH(QString, statement);
     Dialect dialect;
-    try {
-        dialect.translate(statement);
-        QFAIL(dialect.sql().c_str());
-    } catch (const Error &error) {
-        QCOMPARE(error.Number, int(errSyntax));
-    }
-}
-
-void tst_Dialect::takesUpAfterARefusal()
-{
-    Dialect dialect;
-    QVERIFY_EXCEPTION_THROWN(dialect.translate(u"insert into t values (1,(2 order by 'x"_s), Error);
-    dialect.translate(u"select 'a', 2 from t"_s);
+    QCOMPARE(numberOf([&] { dialect.translate(statement); }), int(errSyntax));
+    dialect.translate(u"select 'a', 2 from t"_s); // nothing of it is left
     QCOMPARE(dialect.sql(), std::string("select ?, ? from t"));
     QCOMPARE(literalsOf(dialect), u"ta|2"_s);
 }

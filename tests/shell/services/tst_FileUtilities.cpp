@@ -19,7 +19,6 @@ private slots:
     void dirExists();
     void walks_data();
     void walks();
-    void walkSums();
     void moves();
     void movesNot();
 
@@ -105,15 +104,6 @@ void tst_FileUtilities::walks()
         found.sort();
         QTEST(found.join(QLatin1Char('|')), "found");
     }
-}
-
-void tst_FileUtilities::walkSums()
-{
-    put("a.mp3", "12345");
-    put("b/c.mp3", "123");
-    put("SYSTEM FILES/d.mp3", "1234567"); // counts, is not listed
-    put("e.txt", "12345678");
-    QCOMPARE(ScanFolderTree(mFolder->path(), u"*.mp3"_s, 0, 0), 15.0);
 }
 
 void tst_FileUtilities::moves()
