@@ -6,22 +6,6 @@
 #include <QFile>
 #include <QRegularExpression>
 
-/// The architecture as a test: which folder may include which, and how long a file may be.
-class tst_Rooms : public QObject
-{
-    Q_OBJECT
-
-private slots:
-    void initTestCase();
-    void includesPointDownwards();
-    void librariesStayInTheirRooms_data();
-    void librariesStayInTheirRooms();
-    void filesStayShort();
-
-private:
-    QMap<QString, QStringList> mSources; // lines by name below src/
-};
-
 namespace
 {
 
@@ -60,79 +44,90 @@ QStringList includesIn(const QStringList &lines, QChar open, QChar close)
 
 } // namespace
 
-void tst_Rooms::initTestCase()
+/// The architecture as a test: which folder may include which, and how long a file may be.
+class tst_Rooms : public QObject
 {
-    const QDir src(qEnvironmentVariable("SONGCASE_SOURCE") + u"/src"_s);
-    QDirIterator it(src.path(), {u"*.cpp"_s, u"*.h"_s}, QDir::Files, QDirIterator::Subdirectories);
-    while (it.hasNext()) {
-        QFile file(it.next());
-        QVERIFY(file.open(QIODevice::ReadOnly));
-        mSources[src.relativeFilePath(file.fileName())] =
-            QString::fromUtf8(file.readAll()).split(QLatin1Char('\n'));
-    }
-    QVERIFY(mSources.size() > 50);
-    for (auto file = mSources.cbegin(); file != mSources.cend(); ++file)
-        QVERIFY2(roomOf(file.key()) >= 0, qPrintable(file.key()));
-}
+    Q_OBJECT
 
-void tst_Rooms::includesPointDownwards()
-{
-    QStringList wrong;
-    for (auto it = mSources.cbegin(); it != mSources.cend(); ++it) {
-        for (const QString &included : includesIn(it.value(), u'"', u'"')) {
-            const bool generated = included.startsWith(QLatin1String("ui_")) ||
-                                   included.endsWith(QLatin1String(".moc"));
-            const int room = roomOf(included); // -1 too if it is not written from src
-            if (!generated && (room < 0 || room > roomOf(it.key())))
-                wrong.append(it.key() + u" includes "_s + included);
+private:
+    QMap<QString, QStringList> mSources; // lines by name below src/
+
+private slots:
+    void initTestCase()
+    {
+        const QDir src(qEnvironmentVariable("SONGCASE_SOURCE") + u"/src"_s);
+        QDirIterator it(src.path(), {u"*.cpp"_s, u"*.h"_s}, QDir::Files,
+                        QDirIterator::Subdirectories);
+        while (it.hasNext()) {
+            QFile file(it.next());
+            QVERIFY(file.open(QIODevice::ReadOnly));
+            mSources[src.relativeFilePath(file.fileName())] =
+                QString::fromUtf8(file.readAll()).split(QLatin1Char('\n'));
         }
+        QVERIFY(mSources.size() > 50);
+        for (auto file = mSources.cbegin(); file != mSources.cend(); ++file)
+            QVERIFY2(roomOf(file.key()) >= 0, qPrintable(file.key()));
     }
-    QVERIFY2(wrong.isEmpty(), qPrintable(wrong.join(QLatin1Char('\n'))));
-}
 
-void tst_Rooms::librariesStayInTheirRooms_data()
-{
-    // allowed: starts of file names, "|" between
-    const DataRows<QString, QString> row("header", "allowed");
-    row("^sqlite3", "platform/ado/|catalogue/cataloguefile");
-    row("^unicode/", "platform/text/");
-    row("^taglib/|^(id3v2|mpeg|tag)[a-z0-9]*\\.h", "mp3/");
-    row("^cdio/", "discdata/");
-    row("^mdb|^glib", "catalogue/");
-    row("^QSql|^QtSql", "nowhere");
-    row("^QMessageBox|^QFileDialog|^QDesktopServices", "platform/desktop/");
-    row("^QtTest|^QTest|^benchmark/", "nowhere");
-}
-
-void tst_Rooms::librariesStayInTheirRooms()
-{
-    QFETCH(QString, header);
-    QFETCH(QString, allowed);
-    const QRegularExpression expression(header);
-    const QStringList starts = allowed.split(QLatin1Char('|'));
-    QStringList wrong;
-    for (auto it = mSources.cbegin(); it != mSources.cend(); ++it) {
-        const bool fine = std::any_of(starts.begin(), starts.end(), [&](const QString &start) {
-            return it.key().startsWith(start);
-        });
-        for (const QString &included : includesIn(it.value(), u'<', u'>')) {
-            if (!fine && expression.match(included).hasMatch())
-                wrong.append(it.key() + u" includes "_s + included);
+    void includesPointDownwards()
+    {
+        QStringList wrong;
+        for (auto it = mSources.cbegin(); it != mSources.cend(); ++it) {
+            for (const QString &included : includesIn(it.value(), u'"', u'"')) {
+                const bool generated = included.startsWith(QLatin1String("ui_")) ||
+                                       included.endsWith(QLatin1String(".moc"));
+                const int room = roomOf(included); // -1 too if it is not written from src
+                if (!generated && (room < 0 || room > roomOf(it.key())))
+                    wrong.append(it.key() + u" includes "_s + included);
+            }
         }
+        QVERIFY2(wrong.isEmpty(), qPrintable(wrong.join(QLatin1Char('\n'))));
     }
-    QVERIFY2(wrong.isEmpty(), qPrintable(wrong.join(QLatin1Char('\n'))));
-}
 
-void tst_Rooms::filesStayShort()
-{
-    QStringList tooLong;
-    for (auto it = mSources.cbegin(); it != mSources.cend(); ++it) {
-        const bool frame = it.key() == QLatin1String("shell/MainScreen.cpp");
-        if (it.value().size() > (frame ? 400 : 650))
-            tooLong.append(it.key() + u": "_s + QString::number(it.value().size()));
+    void librariesStayInTheirRooms_data()
+    {
+        // allowed: starts of file names, "|" between
+        const DataRows<QString, QString> row("header", "allowed");
+        row("^sqlite3", "platform/ado/|catalogue/cataloguefile");
+        row("^unicode/", "platform/text/");
+        row("^taglib/|^(id3v2|mpeg|tag)[a-z0-9]*\\.h", "mp3/");
+        row("^cdio/", "discdata/");
+        row("^mdb|^glib", "catalogue/");
+        row("^QSql|^QtSql", "nowhere");
+        row("^QMessageBox|^QFileDialog|^QDesktopServices", "platform/desktop/");
+        row("^QtTest|^QTest|^benchmark/", "nowhere");
     }
-    QVERIFY2(tooLong.isEmpty(), qPrintable(tooLong.join(QLatin1Char('\n'))));
-}
+
+    void librariesStayInTheirRooms()
+    {
+        QFETCH(QString, header);
+        QFETCH(QString, allowed);
+        const QRegularExpression expression(header);
+        const QStringList starts = allowed.split(QLatin1Char('|'));
+        QStringList wrong;
+        for (auto it = mSources.cbegin(); it != mSources.cend(); ++it) {
+            const bool fine = std::any_of(starts.begin(), starts.end(), [&](const QString &start) {
+                return it.key().startsWith(start);
+            });
+            for (const QString &included : includesIn(it.value(), u'<', u'>')) {
+                if (!fine && expression.match(included).hasMatch())
+                    wrong.append(it.key() + u" includes "_s + included);
+            }
+        }
+        QVERIFY2(wrong.isEmpty(), qPrintable(wrong.join(QLatin1Char('\n'))));
+    }
+
+    void filesStayShort()
+    {
+        QStringList tooLong;
+        for (auto it = mSources.cbegin(); it != mSources.cend(); ++it) {
+            const bool frame = it.key() == QLatin1String("shell/MainScreen.cpp");
+            if (it.value().size() > (frame ? 400 : 650))
+                tooLong.append(it.key() + u": "_s + QString::number(it.value().size()));
+        }
+        QVERIFY2(tooLong.isEmpty(), qPrintable(tooLong.join(QLatin1Char('\n'))));
+    }
+};
 
 QTEST_APPLESS_MAIN(tst_Rooms)
 #include "tst_Rooms.moc"

@@ -12,32 +12,6 @@
 #include <sqlite3.h>
 #include <sys/wait.h>
 
-/// The file itself: a new one, wrong ones of every kind, one left behind by a crash.
-class tst_CatalogueFile : public QObject
-{
-    Q_OBJECT
-
-private slots:
-    void init();
-    void cleanup() { gConnection.reset(); }
-    void newOne();
-    void makesNoneOverAnother();
-    void wrongOnes_data();
-    void wrongOnes();
-    void survivesACrash();
-    void sortOrderOfAnotherVersion();
-
-private:
-    using Snapshot = QMap<QString, QByteArray>;
-    Snapshot snapshot() const; // of all files in the folder
-    void exec(const QByteArray &sql);
-    QString opening(bool thorough = true);
-    QString folder() const { return mTemporary->filePath(u"data"_s); }
-    QString file() const { return folder() + u"/Compact4.orv"_s; }
-
-    std::unique_ptr<QTemporaryDir> mTemporary;
-};
-
 namespace
 {
 
@@ -57,189 +31,208 @@ template <typename Change> void edit(const QString &name, Change change)
 
 } // namespace
 
-void tst_CatalogueFile::init()
+/// The file itself: a new one, wrong ones of every kind, one left behind by a crash.
+class tst_CatalogueFile : public QObject
 {
-    mTemporary = std::make_unique<QTemporaryDir>();
-    QFile::setPermissions(mTemporary->path(), QFile::Permissions(0x7777));
-    QDir().mkpath(folder());
-    cataloguefile::create(file());
-    exec(someRows);
-}
+    Q_OBJECT
 
-tst_CatalogueFile::Snapshot tst_CatalogueFile::snapshot() const
-{
-    Snapshot all;
-    for (const QString &name : QDir(folder()).entryList(QDir::Files | QDir::Hidden))
-        all[name] = readFile(folder() + u'/' + name);
-    return all;
-}
-
-void tst_CatalogueFile::exec(const QByteArray &sql)
-{
-    const OtherProgram raw(file());
-    QVERIFY2(raw.run(sql) == SQLITE_OK, sqlite3_errmsg(raw.db));
-}
-
-// Opens it as the program does; gives what is told to the user, nothing if it went well.
-QString tst_CatalogueFile::opening(bool thorough)
-{
-    try {
-        cataloguefile::inspect(file());
-        openConnection(file());
-        cataloguefile::verify(*gConnection, thorough);
-        return {};
-    } catch (const ADODB::Error &error) {
-        return error.Description;
-    }
-}
-
-void tst_CatalogueFile::newOne()
-{
-    QFile::remove(file());
-    cataloguefile::create(file());
-    QCOMPARE(QDir(folder()).entryList(QDir::Files).size(), 1);
-    QCOMPARE(opening(), QString());
-    QCOMPARE(gConnection->housekeeping("PRAGMA application_id"), u"1399811687"_s);
-    QCOMPARE(gConnection->housekeeping("PRAGMA user_version").toInt() >> 24, 4);
-    QCOMPARE(gConnection->housekeeping("PRAGMA encoding"), u"UTF-8"_s);
-    const char *tables[][2] = {{"Artiesten", "ID,Naam"},
-                               {"Tracks", "ID,Artiest_ID,Titel,Genre,Hitjaar"},
-                               {"CDTitels", "ID,Titel,Artiest_ID,CD_Type,Genre,Hitjaar"},
-                               {"CompactDiscs", "ID,CDTitels_ID,DiskNo,TrackNo,Track_ID,Opmerking"},
-                               {"MP3Collections", "ID,Map,Album"},
-                               {"MP3Files", "ID,Volgnummer,FileName,CollectionId"}};
-    for (const auto &[table, columns] : tables) {
-        const QByteArray names =
-            QByteArray("select group_concat(name) from pragma_table_info('") + table + "')";
-        QCOMPARE(gConnection->housekeeping(names), QLatin1String(columns));
-    }
-}
-
-void tst_CatalogueFile::makesNoneOverAnother()
-{
-    const auto before = snapshot();
-    QVERIFY_EXCEPTION_THROWN(cataloguefile::create(file()), ADODB::Error);
-    QCOMPARE(snapshot(), before);
-    const QString nowhere = folder() + u"/none/Compact4.orv"_s;
-    QVERIFY_EXCEPTION_THROWN(cataloguefile::create(nowhere), ADODB::Error);
-    QVERIFY(!QFile::exists(nowhere));
-}
-
-void tst_CatalogueFile::wrongOnes_data()
-{
-    const DataRows<QString, QString> row("kind", "told");
-    row("empty", "not a catalogue");
-    row("folder", "not a catalogue");
-    row("database of another program", "not a catalogue");
-    row("not there", "cannot be opened");
-    row("no rights", "cannot be opened");
-    row("newer", "newer version");
-    row("table missing", "table is missing");
-    row("half", "damaged");
-    row("garbage schema", "damaged");
-    row("overwritten middle", "damaged");
-    row("read-only", "read-only");
-    row("read-only folder", "read-only");
-}
-
-void tst_CatalogueFile::wrongOnes()
-{
-    QFETCH(QString, kind);
-    const QString f = file();
-    const qint64 size = QFileInfo(f).size();
-    const auto is = [&](const char *k) { return kind == QLatin1String(k); };
-    if (is("empty")) {
-        QFile::resize(f, 0);
-    } else if (is("folder")) {
-        QFile::remove(f);
-        QDir().mkpath(f);
-    } else if (is("database of another program")) {
-        QFile::remove(f);
-        exec("create table artiesten(id)");
-    } else if (is("not there")) {
-        QFile::remove(f);
-    } else if (is("no rights")) {
-        QFile::setPermissions(f, {});
-    } else if (is("newer")) {
-        exec("pragma user_version=83886080"); // 5 << 24
-    } else if (is("table missing")) {
-        exec("drop table MP3Files");
-    } else if (is("half")) {
-        QFile::resize(f, size / 2 / 4096 * 4096);
-    } else if (is("garbage schema")) {
-        edit(f, [&](QFile &o) { o.seek(100) && o.write(QByteArray(3996, '\x5A')); });
-    } else if (is("overwritten middle")) {
-        edit(f, [&](QFile &o) { o.seek(size / 2) && o.write(QByteArray(9000, 'x')); });
-    } else if (is("read-only")) {
-        QFile::setPermissions(f, QFile::Permissions(0x4444));
-    } else {
-        QFile::setPermissions(folder(), QFile::Permissions(0x5555));
-    }
-    const auto before = snapshot();
-    QString said;
+private:
+    using Snapshot = QMap<QString, QByteArray>;
+    // of all files in the folder
+    Snapshot snapshot() const
     {
-        const auto user = is("no rights") ? std::make_unique<OrdinaryUser>() : nullptr;
-        said = opening();
-        gConnection.reset();
+        Snapshot all;
+        for (const QString &name : QDir(folder()).entryList(QDir::Files | QDir::Hidden))
+            all[name] = readFile(folder() + u'/' + name);
+        return all;
     }
-    const auto after = snapshot();
-    QFile::setPermissions(folder(), QFile::Permissions(0x7700));
-    QFETCH(QString, told);
-    QVERIFY2(said.contains(told), qPrintable(said));
-    QCOMPARE(after, before);
-}
 
-// The program is killed in the middle of a large change that has reached the file in part.
-void tst_CatalogueFile::survivesACrash()
-{
-    const auto before = snapshot();
-    const pid_t child = fork();
-    QVERIFY(child >= 0);
-    if (child == 0) {
+    void exec(const QByteArray &sql)
+    {
         const OtherProgram raw(file());
-        raw.run(
-            "pragma cache_size=5; begin; update tracks set titel='changed'; delete from artiesten");
-        kill(getpid(), SIGKILL);
+        QVERIFY2(raw.run(sql) == SQLITE_OK, sqlite3_errmsg(raw.db));
     }
-    int status = 0;
-    QCOMPARE(waitpid(child, &status, 0), child);
-    QVERIFY(WIFSIGNALED(status));
-    const auto crashed = snapshot();
-    QVERIFY(crashed.size() == 2 && crashed[u"Compact4.orv"_s] != before.first());
-    QCOMPARE(opening(), QString());
-    gConnection.reset();
-    QCOMPARE(snapshot(), before); // every byte is back, and no journal beside it
-}
 
-void tst_CatalogueFile::sortOrderOfAnotherVersion()
-{
+    // Opens it as the program does; gives what is told to the user, nothing if it went well.
+    QString opening(bool thorough = true)
     {
-        const OtherProgram other(file());
-        const auto bytewise = [](void *, int n, const void *a, int m, const void *b) {
-            const int c = memcmp(a, b, std::size_t(std::min(n, m)));
-            return c ? c : n - m;
-        };
-        sqlite3_create_collation(other.db, "SONGCASE", SQLITE_UTF8, nullptr, bytewise);
-        QCOMPARE(other.run("insert into artiesten values (2001,'Zappa'),(2002,'abba'),"
-                           "(2003,'Abc'),(2004,'zz'); pragma user_version=67108865"),
-                 SQLITE_OK);
+        try {
+            cataloguefile::inspect(file());
+            openConnection(file());
+            cataloguefile::verify(*gConnection, thorough);
+            return {};
+        } catch (const ADODB::Error &error) {
+            return error.Description;
+        }
     }
-    const auto found = [] {
-        ADODB::Recordset rs;
-        rs.Open(u"Select ID From Artiesten where Naam in ('ZAPPA','abba','ABC','Zz','Artist 7')"_s,
+
+    QString folder() const { return mTemporary->filePath(u"data"_s); }
+    QString file() const { return folder() + u"/Compact4.orv"_s; }
+
+    std::unique_ptr<QTemporaryDir> mTemporary;
+
+private slots:
+    void init()
+    {
+        mTemporary = std::make_unique<QTemporaryDir>();
+        QFile::setPermissions(mTemporary->path(), QFile::Permissions(0x7777));
+        QDir().mkpath(folder());
+        cataloguefile::create(file());
+        exec(someRows);
+    }
+
+    void cleanup() { gConnection.reset(); }
+
+    void newOne()
+    {
+        QFile::remove(file());
+        cataloguefile::create(file());
+        QCOMPARE(QDir(folder()).entryList(QDir::Files).size(), 1);
+        QCOMPARE(opening(), QString());
+        QCOMPARE(gConnection->housekeeping("PRAGMA application_id"), u"1399811687"_s);
+        QCOMPARE(gConnection->housekeeping("PRAGMA user_version").toInt() >> 24, 4);
+        QCOMPARE(gConnection->housekeeping("PRAGMA encoding"), u"UTF-8"_s);
+        const char *tables[][2] = {
+            {"Artiesten", "ID,Naam"},
+            {"Tracks", "ID,Artiest_ID,Titel,Genre,Hitjaar"},
+            {"CDTitels", "ID,Titel,Artiest_ID,CD_Type,Genre,Hitjaar"},
+            {"CompactDiscs", "ID,CDTitels_ID,DiskNo,TrackNo,Track_ID,Opmerking"},
+            {"MP3Collections", "ID,Map,Album"},
+            {"MP3Files", "ID,Volgnummer,FileName,CollectionId"}};
+        for (const auto &[table, columns] : tables) {
+            const QByteArray names =
+                QByteArray("select group_concat(name) from pragma_table_info('") + table + "')";
+            QCOMPARE(gConnection->housekeeping(names), QLatin1String(columns));
+        }
+    }
+
+    void makesNoneOverAnother()
+    {
+        const auto before = snapshot();
+        QVERIFY_EXCEPTION_THROWN(cataloguefile::create(file()), ADODB::Error);
+        QCOMPARE(snapshot(), before);
+        const QString nowhere = folder() + u"/none/Compact4.orv"_s;
+        QVERIFY_EXCEPTION_THROWN(cataloguefile::create(nowhere), ADODB::Error);
+        QVERIFY(!QFile::exists(nowhere));
+    }
+
+    void wrongOnes_data()
+    {
+        const DataRows<QString, QString> row("kind", "told");
+        row("empty", "not a catalogue");
+        row("folder", "not a catalogue");
+        row("database of another program", "not a catalogue");
+        row("not there", "cannot be opened");
+        row("no rights", "cannot be opened");
+        row("newer", "newer version");
+        row("table missing", "table is missing");
+        row("half", "damaged");
+        row("garbage schema", "damaged");
+        row("overwritten middle", "damaged");
+        row("read-only", "read-only");
+        row("read-only folder", "read-only");
+    }
+
+    void wrongOnes()
+    {
+        QFETCH(QString, kind);
+        const QString f = file();
+        const qint64 size = QFileInfo(f).size();
+        const auto is = [&](const char *k) { return kind == QLatin1String(k); };
+        if (is("empty")) {
+            QFile::resize(f, 0);
+        } else if (is("folder")) {
+            QFile::remove(f);
+            QDir().mkpath(f);
+        } else if (is("database of another program")) {
+            QFile::remove(f);
+            exec("create table artiesten(id)");
+        } else if (is("not there")) {
+            QFile::remove(f);
+        } else if (is("no rights")) {
+            QFile::setPermissions(f, {});
+        } else if (is("newer")) {
+            exec("pragma user_version=83886080"); // 5 << 24
+        } else if (is("table missing")) {
+            exec("drop table MP3Files");
+        } else if (is("half")) {
+            QFile::resize(f, size / 2 / 4096 * 4096);
+        } else if (is("garbage schema")) {
+            edit(f, [&](QFile &o) { o.seek(100) && o.write(QByteArray(3996, '\x5A')); });
+        } else if (is("overwritten middle")) {
+            edit(f, [&](QFile &o) { o.seek(size / 2) && o.write(QByteArray(9000, 'x')); });
+        } else if (is("read-only")) {
+            QFile::setPermissions(f, QFile::Permissions(0x4444));
+        } else {
+            QFile::setPermissions(folder(), QFile::Permissions(0x5555));
+        }
+        const auto before = snapshot();
+        QString said;
+        {
+            const auto user = is("no rights") ? std::make_unique<OrdinaryUser>() : nullptr;
+            said = opening();
+            gConnection.reset();
+        }
+        const auto after = snapshot();
+        QFile::setPermissions(folder(), QFile::Permissions(0x7700));
+        QFETCH(QString, told);
+        QVERIFY2(said.contains(told), qPrintable(said));
+        QCOMPARE(after, before);
+    }
+
+    // The program is killed in the middle of a large change that has reached the file in part.
+    void survivesACrash()
+    {
+        const auto before = snapshot();
+        const pid_t child = fork();
+        QVERIFY(child >= 0);
+        if (child == 0) {
+            const OtherProgram raw(file());
+            raw.run("pragma cache_size=5; begin; update tracks set titel='changed'; delete from "
+                    "artiesten");
+            kill(getpid(), SIGKILL);
+        }
+        int status = 0;
+        QCOMPARE(waitpid(child, &status, 0), child);
+        QVERIFY(WIFSIGNALED(status));
+        const auto crashed = snapshot();
+        QVERIFY(crashed.size() == 2 && crashed[u"Compact4.orv"_s] != before.first());
+        QCOMPARE(opening(), QString());
+        gConnection.reset();
+        QCOMPARE(snapshot(), before); // every byte is back, and no journal beside it
+    }
+
+    void sortOrderOfAnotherVersion()
+    {
+        {
+            const OtherProgram other(file());
+            const auto bytewise = [](void *, int n, const void *a, int m, const void *b) {
+                const int c = memcmp(a, b, std::size_t(std::min(n, m)));
+                return c ? c : n - m;
+            };
+            sqlite3_create_collation(other.db, "SONGCASE", SQLITE_UTF8, nullptr, bytewise);
+            QCOMPARE(other.run("insert into artiesten values (2001,'Zappa'),(2002,'abba'),"
+                               "(2003,'Abc'),(2004,'zz'); pragma user_version=67108865"),
+                     SQLITE_OK);
+        }
+        const auto found = [] {
+            ADODB::Recordset rs;
+            rs.Open(
+                u"Select ID From Artiesten where Naam in ('ZAPPA','abba','ABC','Zz','Artist 7')"_s,
                 *gConnection);
-        return int(rs.RecordCount());
-    };
-    openConnection(file());
-    QVERIFY(found() < 5);
-    QCOMPARE(opening(), QString());
-    QCOMPARE(found(), 5);
-    gConnection.reset();
-    const auto mended = snapshot();
-    QCOMPARE(opening(), QString()); // once, not at every start
-    gConnection.reset();
-    QCOMPARE(snapshot(), mended);
-}
+            return int(rs.RecordCount());
+        };
+        openConnection(file());
+        QVERIFY(found() < 5);
+        QCOMPARE(opening(), QString());
+        QCOMPARE(found(), 5);
+        gConnection.reset();
+        const auto mended = snapshot();
+        QCOMPARE(opening(), QString()); // once, not at every start
+        gConnection.reset();
+        QCOMPARE(snapshot(), mended);
+    }
+};
 
 QTEST_GUILESS_MAIN(tst_CatalogueFile)
 #include "tst_CatalogueFile.moc"

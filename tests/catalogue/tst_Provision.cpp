@@ -18,79 +18,74 @@ class tst_Provision : public QObject
 {
     Q_OBJECT
 
-private slots:
-    void init();
-    void firstStart();
-    void makesNone();
-    void cannotBeMade();
-
 private:
     QString catalogue() const { return mDesktop->folder + u"/Compact4.orv"_s; }
     std::unique_ptr<QTemporaryDir> mHome;
     std::unique_ptr<ScriptedDesktop> mDesktop;
-};
 
-void tst_Provision::init()
-{
-    mHome = std::make_unique<QTemporaryDir>();
-    qputenv("XDG_DATA_HOME", QFile::encodeName(mHome->path()));
-    mDesktop = std::make_unique<ScriptedDesktop>();
-    mDesktop->folder = programfolder::userFolder();
-    QVERIFY(mDesktop->folder.startsWith(mHome->path()));
-}
-
-void tst_Provision::firstStart()
-{
-    // An attempt that was cut off stands beside it.
-    QDir().mkpath(mDesktop->folder + u".new"_s);
-    writeFile(mDesktop->folder + u".new/Compact4.orv"_s, "half");
-    provisionCatalogue();
-    QCOMPARE(QDir(mDesktop->folder).entryList(QDir::Files), QStringList{u"Compact4.orv"_s});
-    QVERIFY(!QFile::exists(mDesktop->folder + u".new"_s));
-    cataloguefile::inspect(catalogue());
-    openConnection(catalogue());
-    cataloguefile::verify(*gConnection, true);
-    gConnection->Execute(u"insert into artiesten values (1,'x')"_s);
-    gConnection.reset();
-
-    provisionCatalogue(); // not again, whatever has become of the file
-    QVERIFY(QFile::remove(catalogue()));
-    provisionCatalogue();
-    QVERIFY(!QFile::exists(catalogue()));
-}
-
-void tst_Provision::makesNone()
-{
-    const QString own = mDesktop->folder;
-    mDesktop->folder = mHome->filePath(u"elsewhere"_s);
-    provisionCatalogue(); // not his own folder
-    QVERIFY(!QFile::exists(mDesktop->folder));
-    mDesktop->folder = own;
-    QDir().mkpath(own);
-    provisionCatalogue(); // it is there already
-    QVERIFY(QDir(own).isEmpty() && QDir().rmdir(own));
-    clsRegistry().CreateKey(settingsKey);
-    clsRegistry().SetValue(settingsKey, u"Session"_s, 1);
-    provisionCatalogue(); // started before
-    QVERIFY(!QFile::exists(own));
-}
-
-void tst_Provision::cannotBeMade()
-{
-    QFile::setPermissions(mHome->path(), QFile::Permissions(0x5555));
-    QString told;
+private slots:
+    void init()
     {
-        const OrdinaryUser user;
-        try {
-            provisionCatalogue();
-        } catch (const ADODB::Error &error) {
-            told = error.Description;
-        }
+        mHome = std::make_unique<QTemporaryDir>();
+        qputenv("XDG_DATA_HOME", QFile::encodeName(mHome->path()));
+        mDesktop = std::make_unique<ScriptedDesktop>();
+        mDesktop->folder = programfolder::userFolder();
+        QVERIFY(mDesktop->folder.startsWith(mHome->path()));
     }
-    QFile::setPermissions(mHome->path(), QFile::Permissions(0x7700));
-    QVERIFY2(told.contains(mDesktop->folder), qPrintable(told));
-    QVERIFY(QDir(mHome->path()).isEmpty());
-}
+
+    void firstStart()
+    {
+        // An attempt that was cut off stands beside it.
+        QDir().mkpath(mDesktop->folder + u".new"_s);
+        writeFile(mDesktop->folder + u".new/Compact4.orv"_s, "half");
+        provisionCatalogue();
+        QCOMPARE(QDir(mDesktop->folder).entryList(QDir::Files), QStringList{u"Compact4.orv"_s});
+        QVERIFY(!QFile::exists(mDesktop->folder + u".new"_s));
+        cataloguefile::inspect(catalogue());
+        openConnection(catalogue());
+        cataloguefile::verify(*gConnection, true);
+        gConnection->Execute(u"insert into artiesten values (1,'x')"_s);
+        gConnection.reset();
+
+        provisionCatalogue(); // not again, whatever has become of the file
+        QVERIFY(QFile::remove(catalogue()));
+        provisionCatalogue();
+        QVERIFY(!QFile::exists(catalogue()));
+    }
+
+    void makesNone()
+    {
+        const QString own = mDesktop->folder;
+        mDesktop->folder = mHome->filePath(u"elsewhere"_s);
+        provisionCatalogue(); // not his own folder
+        QVERIFY(!QFile::exists(mDesktop->folder));
+        mDesktop->folder = own;
+        QDir().mkpath(own);
+        provisionCatalogue(); // it is there already
+        QVERIFY(QDir(own).isEmpty() && QDir().rmdir(own));
+        clsRegistry().CreateKey(settingsKey);
+        clsRegistry().SetValue(settingsKey, u"Session"_s, 1);
+        provisionCatalogue(); // started before
+        QVERIFY(!QFile::exists(own));
+    }
+
+    void cannotBeMade()
+    {
+        QFile::setPermissions(mHome->path(), QFile::Permissions(0x5555));
+        QString told;
+        {
+            const OrdinaryUser user;
+            try {
+                provisionCatalogue();
+            } catch (const ADODB::Error &error) {
+                told = error.Description;
+            }
+        }
+        QFile::setPermissions(mHome->path(), QFile::Permissions(0x7700));
+        QVERIFY2(told.contains(mDesktop->folder), qPrintable(told));
+        QVERIFY(QDir(mHome->path()).isEmpty());
+    }
+};
 
 QTEST_GUILESS_MAIN(tst_Provision)
 #include "tst_Provision.moc"

@@ -20,459 +20,435 @@ class tst_frmCDRoot : public QObject
 {
     Q_OBJECT
 
-private slots:
-    void init() { mE = std::make_unique<Editing>(languageEnglish); }
-    void cleanup() { mE.reset(); }
-    void aNewRecord();
-    void aRecordThatCannotBeShown();
-    void anExistingRecord();
-    void leavingTheYear();
-    void keysOfTheFields();
-    void signsAreText();
-    void buttonsOfTheToolbar();
-    void firstSave();
-    void whatASaveTouches_data();
-    void whatASaveTouches();
-    void refusedSaves_data();
-    void refusedSaves();
-    void leavingADiscRefused();
-    void deletingADisc_data();
-    void deletingADisc();
-    void closing_data();
-    void closing();
-    void aFullDisk();
-    void aDiscThatCannotBeDeleted();
-    void aFailureOfTheFirstSave();
-    void aRecordDeletedMeanwhile();
-    void anIdGivenToAnotherMeanwhile();
-    void nobodyClosesABusyForm();
-
 private:
     // Compilation 3 "It's 100%1": disc 1 with two tracks, disc 2 with one, disc 3 with one.
-    void fillThree();
-    CdEditor *openThree();
+    void fillThree()
+    {
+        mE->catalogue.exec(R"(
+            insert into Artiesten values (1,'Anna'),(2,'Bob'),(3,'Cleo');
+            insert into Tracks values (1,1,'One','Pop',1985),(2,2,'Two',null,null),(3,1,'Three',null,null),
+                (4,3,'Four',null,null);
+            insert into CDTitels values (3,'It''s 100%1',null,'V','Rock',1999),(4,'Other',null,'V',null,null);
+            insert into CompactDiscs values (1,3,1,1,1,null),(2,3,1,2,2,null),(3,3,2,1,3,null),(4,3,3,1,4,null),
+                (5,4,1,1,4,null);)");
+    }
+
+    CdEditor *openThree()
+    {
+        fillThree();
+        return mE->open<frmCDRoot>("U", 3);
+    }
+
     QStringList three() { return mE->catalogue.rows(titleRow.arg(3)) + mE->tracks(3); }
-    void refuse(const char *when); // a statement to fail until allow()
+    // a statement to fail until allow()
+    void refuse(const char *when)
+    {
+        mE->catalogue.exec(u"create trigger refuse before "_s + QLatin1String(when) +
+                           u" begin select raise(abort, 'not this one'); end"_s);
+    }
+
     void allow() { mE->catalogue.exec("drop trigger refuse"); }
 
     std::unique_ptr<Editing> mE;
-};
 
-void tst_frmCDRoot::fillThree()
-{
-    mE->catalogue.exec(R"(
-        insert into Artiesten values (1,'Anna'),(2,'Bob'),(3,'Cleo');
-        insert into Tracks values (1,1,'One','Pop',1985),(2,2,'Two',null,null),(3,1,'Three',null,null),
-            (4,3,'Four',null,null);
-        insert into CDTitels values (3,'It''s 100%1',null,'V','Rock',1999),(4,'Other',null,'V',null,null);
-        insert into CompactDiscs values (1,3,1,1,1,null),(2,3,1,2,2,null),(3,3,2,1,3,null),(4,3,3,1,4,null),
-            (5,4,1,1,4,null);)");
-}
+private slots:
+    void init() { mE = std::make_unique<Editing>(languageEnglish); }
+    void cleanup() { mE.reset(); }
 
-CdEditor *tst_frmCDRoot::openThree()
-{
-    fillThree();
-    return mE->open<frmCDRoot>("U", 3);
-}
-
-void tst_frmCDRoot::refuse(const char *when)
-{
-    mE->catalogue.exec(u"create trigger refuse before "_s + QLatin1String(when) +
-                       u" begin select raise(abort, 'not this one'); end"_s);
-}
-
-void tst_frmCDRoot::aNewRecord()
-{
-    CdEditor *editor = mE->open<frmCDRoot>("I");
-    QCOMPARE(editor->windowTitle(), u"Compilation"_s);
-    QCOMPARE(mE->genre()->count(), 27);
-    QCOMPARE(mE->genre()->currentText(), QString());
-    QCOMPARE(mE->tabs()->count(), 1);
-    QCOMPARE(mE->tabs()->tabText(0), u"Disc &1"_s);
-    QCOMPARE(QApplication::focusWidget(), mE->field("txtTitel"));
-    for (int n = 1; n <= 11; ++n)
-        QCOMPARE(mE->button(n)->isEnabled(), n != 4 && n != 5 && n != 11);
-    QTest::keyClick(editor, Qt::Key_Escape);
-    QVERIFY2(editor->isUnloaded(), "an untouched record closes without a question");
-}
-
-void tst_frmCDRoot::aRecordThatCannotBeShown()
-{
-    fillThree();
-    mE->desktop.expectBox(u"error [System error] Invalid system mode!"_s);
-    QVERIFY(mE->open<frmCDRoot>("X", 3)->isUnloaded());
-    mE->desktop.expectBox(u"error [System error] 3021 "_s);
-    QVERIFY(mE->open<frmCDRoot>("U", 77)->isVisible()); // an unknown id: it stays
-}
-
-void tst_frmCDRoot::anExistingRecord()
-{
-    openThree();
-    QCOMPARE(mE->field("txtTitel")->text(), u"It's 100%1"_s);
-    QCOMPARE(mE->genre()->currentText(), u"Rock"_s);
-    QCOMPARE(mE->field("txtYear")->text(), u"1999"_s);
-    QCOMPARE(mE->tabs()->count(), 3);
-    QCOMPARE(mE->cell(2, 2), u"Bob"_s);
-    QTest::keyClick(QApplication::focusWidget(), Qt::Key_3, Qt::AltModifier);
-    QCOMPARE(mE->tabs()->currentIndex(), 2);
-    QCOMPARE(mE->cell(1, 3), u"Four"_s);
-    emit mE->disk()->LeaveForward();
-    QCOMPARE(QApplication::focusWidget(), mE->field("txtTitel"));
-    emit mE->disk()->LeaveBackward();
-    QCOMPARE(QApplication::focusWidget(), mE->field("txtYear"));
-}
-
-void tst_frmCDRoot::leavingTheYear()
-{
-    mE->open<frmCDRoot>("I");
-    QLineEdit *field = mE->field("txtYear");
-    const auto leave = [&](const QString &year, Qt::Key key) {
-        field->setFocus();
-        field->setText(year);
-        keyboard::press(key);
-        return QApplication::focusWidget() != field;
-    };
-    for (const Qt::Key key : {Qt::Key_Tab, Qt::Key_Backtab}) {
-        QVERIFY(leave(u"1985"_s, key));
-        QVERIFY(!leave({}, key)); // by design
-        mE->desktop.expectBox(u"Invalid year!"_s);
-        QVERIFY(!leave(u"1900"_s, key));
-        QCOMPARE(field->text(), QString());
+    void aNewRecord()
+    {
+        CdEditor *editor = mE->open<frmCDRoot>("I");
+        QCOMPARE(editor->windowTitle(), u"Compilation"_s);
+        QCOMPARE(mE->genre()->count(), 27);
+        QCOMPARE(mE->genre()->currentText(), QString());
+        QCOMPARE(mE->tabs()->count(), 1);
+        QCOMPARE(mE->tabs()->tabText(0), u"Disc &1"_s);
+        QCOMPARE(QApplication::focusWidget(), mE->field("txtTitel"));
+        for (int n = 1; n <= 11; ++n)
+            QCOMPARE(mE->button(n)->isEnabled(), n != 4 && n != 5 && n != 11);
+        QTest::keyClick(editor, Qt::Key_Escape);
+        QVERIFY2(editor->isUnloaded(), "an untouched record closes without a question");
     }
-    QVERIFY2(leave(u"19"_s, Qt::Key_PageDown), "there is a way out by the keyboard");
-    QCOMPARE(field->text(), u"19"_s);
-}
 
-void tst_frmCDRoot::keysOfTheFields()
-{
-    openThree();
-    for (const char *field : {"txtTitel", "Genre", "txtYear"}) {
-        auto *widget = mE->control<QWidget>(field);
-        widget->setFocus();
-        keyboard::press(Qt::Key_PageDown);
-        QVERIFY(mE->disk()->hasFocus() && mE->disk()->CurrentRow() == 2);
-        widget->setFocus();
-        keyboard::press(Qt::Key_PageUp);
-        QCOMPARE(mE->disk()->CurrentRow(), 1);
-        widget->setFocus();
-        for (const auto key : {Qt::Key_End, Qt::Key_Insert}) {
+    void aRecordThatCannotBeShown()
+    {
+        fillThree();
+        mE->desktop.expectBox(u"error [System error] Invalid system mode!"_s);
+        QVERIFY(mE->open<frmCDRoot>("X", 3)->isUnloaded());
+        mE->desktop.expectBox(u"error [System error] 3021 "_s);
+        QVERIFY(mE->open<frmCDRoot>("U", 77)->isVisible()); // an unknown id: it stays
+    }
+
+    void anExistingRecord()
+    {
+        openThree();
+        QCOMPARE(mE->field("txtTitel")->text(), u"It's 100%1"_s);
+        QCOMPARE(mE->genre()->currentText(), u"Rock"_s);
+        QCOMPARE(mE->field("txtYear")->text(), u"1999"_s);
+        QCOMPARE(mE->tabs()->count(), 3);
+        QCOMPARE(mE->cell(2, 2), u"Bob"_s);
+        QTest::keyClick(QApplication::focusWidget(), Qt::Key_3, Qt::AltModifier);
+        QCOMPARE(mE->tabs()->currentIndex(), 2);
+        QCOMPARE(mE->cell(1, 3), u"Four"_s);
+        emit mE->disk()->LeaveForward();
+        QCOMPARE(QApplication::focusWidget(), mE->field("txtTitel"));
+        emit mE->disk()->LeaveBackward();
+        QCOMPARE(QApplication::focusWidget(), mE->field("txtYear"));
+    }
+
+    void leavingTheYear()
+    {
+        mE->open<frmCDRoot>("I");
+        QLineEdit *field = mE->field("txtYear");
+        const auto leave = [&](const QString &year, Qt::Key key) {
+            field->setFocus();
+            field->setText(year);
             keyboard::press(key);
-            keyboard::press(key, Qt::ControlModifier);
+            return QApplication::focusWidget() != field;
+        };
+        for (const Qt::Key key : {Qt::Key_Tab, Qt::Key_Backtab}) {
+            QVERIFY(leave(u"1985"_s, key));
+            QVERIFY(!leave({}, key)); // by design
+            mE->desktop.expectBox(u"Invalid year!"_s);
+            QVERIFY(!leave(u"1900"_s, key));
+            QCOMPARE(field->text(), QString());
         }
+        QVERIFY2(leave(u"19"_s, Qt::Key_PageDown), "there is a way out by the keyboard");
+        QCOMPARE(field->text(), u"19"_s);
+    }
+
+    void keysOfTheFields()
+    {
+        openThree();
+        for (const char *field : {"txtTitel", "Genre", "txtYear"}) {
+            auto *widget = mE->control<QWidget>(field);
+            widget->setFocus();
+            keyboard::press(Qt::Key_PageDown);
+            QVERIFY(mE->disk()->hasFocus() && mE->disk()->CurrentRow() == 2);
+            widget->setFocus();
+            keyboard::press(Qt::Key_PageUp);
+            QCOMPARE(mE->disk()->CurrentRow(), 1);
+            widget->setFocus();
+            for (const auto key : {Qt::Key_End, Qt::Key_Insert}) {
+                keyboard::press(key);
+                keyboard::press(key, Qt::ControlModifier);
+            }
+            QCOMPARE(mE->tabs()->count(), 3);
+            keyboard::press(Qt::Key_Insert, Qt::ShiftModifier);
+            QCOMPARE(mE->tabs()->currentIndex(), 3);
+            keyboard::press(Qt::Key_End, Qt::ShiftModifier);
+            QCOMPARE(mE->tabs()->count(), 3);
+            mE->tabs()->setCurrentIndex(0);
+        }
+    }
+
+    // Signs whose codes are those of keys without a sign: page up and down, End, Insert, Delete.
+    void signsAreText()
+    {
+        openThree();
+        mE->field("txtTitel")->setFocus();
+        for (const char sign : {'!', '"', '#', '&', '(', '-', '.'})
+            QTest::keyClick(mE->field("txtTitel"), sign, Qt::ShiftModifier);
+        QCOMPARE(mE->field("txtTitel")->text(), u"!\"#&(-.It's 100%1"_s);
         QCOMPARE(mE->tabs()->count(), 3);
-        keyboard::press(Qt::Key_Insert, Qt::ShiftModifier);
-        QCOMPARE(mE->tabs()->currentIndex(), 3);
-        keyboard::press(Qt::Key_End, Qt::ShiftModifier);
-        QCOMPARE(mE->tabs()->count(), 3);
-        mE->tabs()->setCurrentIndex(0);
+        QCOMPARE(QApplication::focusWidget(), mE->field("txtTitel"));
     }
-}
 
-// Signs whose codes are those of keys without a sign: page up and down, End, Insert, Delete.
-void tst_frmCDRoot::signsAreText()
-{
-    openThree();
-    mE->field("txtTitel")->setFocus();
-    for (const char sign : {'!', '"', '#', '&', '(', '-', '.'})
-        QTest::keyClick(mE->field("txtTitel"), sign, Qt::ShiftModifier);
-    QCOMPARE(mE->field("txtTitel")->text(), u"!\"#&(-.It's 100%1"_s);
-    QCOMPARE(mE->tabs()->count(), 3);
-    QCOMPARE(QApplication::focusWidget(), mE->field("txtTitel"));
-}
-
-void tst_frmCDRoot::buttonsOfTheToolbar()
-{
-    openThree();
-    mE->field("txtTitel")->setFocus();
-    mE->button(10)->trigger();
-    QVERIFY(mE->disk()->hasFocus());
-    const auto placeAfter = [this](int n) {
-        mE->button(n)->trigger();
-        return QPoint(mE->disk()->CurrentColumn(), mE->disk()->CurrentRow());
-    };
-    QCOMPARE(placeAfter(10), QPoint(2, 2));
-    QCOMPARE(placeAfter(11), QPoint(2, 1));
-    QCOMPARE(placeAfter(7), QPoint(2, 2));
-    QCOMPARE(placeAfter(6), QPoint(2, 1));
-    QCOMPARE(placeAfter(8), QPoint(3, 1));
-    QCOMPARE(placeAfter(9), QPoint(2, 1));
-    mE->button(4)->trigger();
-    QCOMPARE(mE->cell(1, 2) + mE->cell(2, 2), u"Anna"_s);
-    mE->button(5)->trigger();
-    QCOMPARE(mE->cell(1, 2), u"Anna"_s);
-    mE->field("txtTitel")->setFocus();
-    mE->button(8)->trigger();
-    QVERIFY2(mE->genre()->hasFocus(), "the next field of whatever has the focus");
-    for (const int n : {4, 5, 11})
-        QVERIFY(!mE->button(n)->isEnabled());
-}
-
-void tst_frmCDRoot::firstSave()
-{
-    CdEditor *editor = mE->open<frmCDRoot>("I");
-    const QString title = u"O'Neill's 50%2 off \U0001F3B5"_s;
-    keyboard::fill({title, u"folk 'n \"r\""_s, u"1e10"_s}); // the genre stays as typed
-    mE->addTracks(texts("Anna|One|Pop|1985", "Bob|Two"));
-    for (int time = 1; time <= 2; ++time) {
-        editor->SaveKeepingPosition();
-        QCOMPARE(editor->Mode, u"U"_s);
-        QCOMPARE(editor->CdId, 1);
-        QCOMPARE(mE->catalogue.rows(titleRow.arg(1)),
-                 QStringList(title + u"|V|folk 'n \"r\"|10000000000|NULL"_s));
-        QCOMPARE(mE->tracks(1), texts("1/1 Anna - One", "1/2 Bob - Two"));
-        QCOMPARE(mE->browser->refreshed, 1);
-        QVERIFY(!mE->disk()->IsChanged());
-        QVERIFY(mE->disk()->CurrentRow() == 2 && mE->disk()->hasFocus());
+    void buttonsOfTheToolbar()
+    {
+        openThree();
+        mE->field("txtTitel")->setFocus();
+        mE->button(10)->trigger();
+        QVERIFY(mE->disk()->hasFocus());
+        const auto placeAfter = [this](int n) {
+            mE->button(n)->trigger();
+            return QPoint(mE->disk()->CurrentColumn(), mE->disk()->CurrentRow());
+        };
+        QCOMPARE(placeAfter(10), QPoint(2, 2));
+        QCOMPARE(placeAfter(11), QPoint(2, 1));
+        QCOMPARE(placeAfter(7), QPoint(2, 2));
+        QCOMPARE(placeAfter(6), QPoint(2, 1));
+        QCOMPARE(placeAfter(8), QPoint(3, 1));
+        QCOMPARE(placeAfter(9), QPoint(2, 1));
+        mE->button(4)->trigger();
+        QCOMPARE(mE->cell(1, 2) + mE->cell(2, 2), u"Anna"_s);
+        mE->button(5)->trigger();
+        QCOMPARE(mE->cell(1, 2), u"Anna"_s);
+        mE->field("txtTitel")->setFocus();
+        mE->button(8)->trigger();
+        QVERIFY2(mE->genre()->hasFocus(), "the next field of whatever has the focus");
+        for (const int n : {4, 5, 11})
+            QVERIFY(!mE->button(n)->isEnabled());
     }
-}
 
-void tst_frmCDRoot::whatASaveTouches_data()
-{
-    const DataRows<QString, bool, int> row("field", "updates", "refreshes");
-    row("nothing", "", false, 0);
-    row("title", "txtTitel", true, 1);
-    row("title, case only", "case", true, 1);
-    row("year", "txtYear", true, 0);
-    row("genre", "Genre", true, 0);
-    row("track", "grid", false, 1);
-}
-
-void tst_frmCDRoot::whatASaveTouches()
-{
-    QFETCH(QString, field);
-    CdEditor *editor = openThree();
-    mE->catalogue.exec("create table Log(x); create trigger logged after update on CDTitels "
-                       "begin insert into Log values (1); end");
-    if (field == u"case")
-        mE->field("txtTitel")->setText(u"IT'S 100%1"_s);
-    else if (field == u"grid")
-        mE->setCell(2, 3, "Other song");
-    else if (field == u"Genre")
-        mE->genre()->setEditText(u"Jazz"_s);
-    else if (!field.isEmpty())
-        mE->editor->findChild<QLineEdit *>(field)->setText(u"2001"_s);
-    editor->SaveAtUserRequest();
-    editor->SaveAtUserRequest(); // nothing more
-    QTEST(mE->catalogue.count("select count(*) from Log") == 1, "updates");
-    QTEST(mE->browser->refreshed, "refreshes");
-}
-
-void tst_frmCDRoot::refusedSaves_data()
-{
-    const DataRows<QString, QString, QString, QString> row("title", "year", "track", "box");
-    row("no title", "", "19", "", "Please fill in the title of this compilation!");
-    row("no year", "T", "1900", "", "Invalid year!");
-    row("track without a title", "T", "", "Zoe", "please fill in the title!");
-}
-
-void tst_frmCDRoot::refusedSaves()
-{
-    QFETCH(QString, title);
-    QFETCH(QString, year);
-    QFETCH(QString, track);
-    QFETCH(QString, box);
-    CdEditor *editor = openThree();
-    const QStringList before = three();
-    mE->field("txtTitel")->setText(title);
-    mE->field("txtYear")->setText(year);
-    if (!track.isEmpty())
-        mE->addTracks({track});
-    mE->desktop.expectBox(box);
-    editor->SaveKeepingPosition();
-    QCOMPARE(three(), before);
-    QCOMPARE(mE->browser->refreshed, 0);
-    QVERIFY(editor->updatesEnabled() && editor->cursor().shape() == Qt::ArrowCursor);
-}
-
-void tst_frmCDRoot::leavingADiscRefused()
-{
-    openThree();
-    mE->field("txtTitel")->clear();
-    mE->disk()->setFocus();
-    mE->disk()->setCurrentRow(2);
-    mE->disk()->setCurrentColumn(4);
-    const auto clickThird = [this] {
-        QTest::mouseClick(mE->tabs(), Qt::LeftButton, {}, mE->tabs()->tabRect(2).center());
-    };
-    mE->desktop.expectBox(GetMessage("MsgCompNoTitle"));
-    mE->desktop.expectBox(u"information [Songcase] "_s + GetMessage("MsgDiscNav"));
-    clickThird();
-    QCOMPARE(mE->tabs()->currentIndex(), 0);
-    QCOMPARE(mE->cell(1, 3), u"One"_s);
-    QVERIFY(mE->disk()->CurrentRow() == 2 && mE->disk()->CurrentColumn() == 4);
-    mE->desktop.expectBox(GetMessage("MsgCompNoTitle"));
-    mE->desktop.expectBox(u"information [Songcase] "_s + GetMessage("MsgAddDisc"));
-    mE->button(1)->trigger();
-    QCOMPARE(mE->tabs()->count(), 3);
-    mE->field("txtTitel")->setText(u"T"_s);
-    clickThird();
-    QCOMPARE(mE->cell(1, 3), u"Four"_s);
-}
-
-void tst_frmCDRoot::deletingADisc_data()
-{
-    const DataRows<int, int, QString> row("tab", "tabAfter", "shown");
-    row("first", 0, 0, "Three");
-    row("middle", 1, 1, "Four");
-    row("last", 2, 1, "Three");
-}
-
-void tst_frmCDRoot::deletingADisc()
-{
-    QFETCH(int, tab);
-    CdEditor *editor = openThree();
-    mE->tabs()->setCurrentIndex(tab);
-    mE->disk()->setFocus();
-    const QPoint place = editor->pos();
-    keyboard::press(Qt::Key_End, Qt::ShiftModifier);
-    QVERIFY(mE->editor == editor && editor->isVisible() && editor->pos() == place);
-    QCOMPARE(mE->tabs()->count(), 2);
-    QTEST(mE->tabs()->currentIndex(), "tabAfter");
-    QTEST(mE->cell(1, 3), "shown");
-    QCOMPARE(mE->catalogue.rows("select distinct DiskNo from CompactDiscs where CDTitels_ID=3"),
-             texts("1", "2"));
-    QVERIFY2(mE->disk()->hasFocus() && mE->button(4)->isEnabled(), "the grid keeps the focus");
-    QVERIFY(mE->browser->refreshed >= 1);
-    QVERIFY(editor->updatesEnabled());
-}
-
-void tst_frmCDRoot::closing_data()
-{
-    const DataRows<QString, QString, bool> row("change", "how", "saved");
-    row("title, cancel", "title", "cancel", false);
-    row("track, yes", "track", "yes", true);
-    row("cell, yes", "cell", "yes", true);
-    row("cell, no", "cell", "no", false);
-}
-
-void tst_frmCDRoot::closing()
-{
-    QFETCH(QString, change);
-    QFETCH(QString, how);
-    QFETCH(bool, saved);
-    CdEditor *editor = openThree();
-    if (change == u"title") {
-        mE->field("txtTitel")->setText(u"X"_s);
-    } else if (change == u"track") {
-        mE->setCell(1, 3, "X");
-    } else { // still being typed
-        mE->disk()->setFocus();
-        mE->disk()->setCurrentColumn(3);
-        keyboard::type("X");
+    void firstSave()
+    {
+        CdEditor *editor = mE->open<frmCDRoot>("I");
+        const QString title = u"O'Neill's 50%2 off \U0001F3B5"_s;
+        keyboard::fill({title, u"folk 'n \"r\""_s, u"1e10"_s}); // the genre stays as typed
+        mE->addTracks(texts("Anna|One|Pop|1985", "Bob|Two"));
+        for (int time = 1; time <= 2; ++time) {
+            editor->SaveKeepingPosition();
+            QCOMPARE(editor->Mode, u"U"_s);
+            QCOMPARE(editor->CdId, 1);
+            QCOMPARE(mE->catalogue.rows(titleRow.arg(1)),
+                     QStringList(title + u"|V|folk 'n \"r\"|10000000000|NULL"_s));
+            QCOMPARE(mE->tracks(1), texts("1/1 Anna - One", "1/2 Bob - Two"));
+            QCOMPARE(mE->browser->refreshed, 1);
+            QVERIFY(!mE->disk()->IsChanged());
+            QVERIFY(mE->disk()->CurrentRow() == 2 && mE->disk()->hasFocus());
+        }
     }
-    if (how == u"cancel") {
-        mE->control<QPushButton>("cmdCancel")->click();
-    } else {
-        mE->desktop.expectBox(u"Do yo want to save changes?"_s, how == u"yes" ? vbYes : vbNo);
-        editor->close();
+
+    void whatASaveTouches_data()
+    {
+        const DataRows<QString, bool, int> row("field", "updates", "refreshes");
+        row("nothing", "", false, 0);
+        row("title", "txtTitel", true, 1);
+        row("title, case only", "case", true, 1);
+        row("year", "txtYear", true, 0);
+        row("genre", "Genre", true, 0);
+        row("track", "grid", false, 1);
     }
-    QVERIFY(editor->isUnloaded());
-    QCOMPARE(mE->catalogue.count("select count(*) from (select Titel from CDTitels union all "
-                                 "select Titel from Tracks) where Titel = 'X'"),
-             int(saved));
-}
 
-// The engine itself reports it, at a size that the file may not pass.
-void tst_frmCDRoot::aFullDisk()
-{
-    CdEditor *editor = openThree();
-    const QStringList before = three();
-    QStringList lines;
-    for (int i = 0; i < 100; ++i)
-        lines.append(u"Anna\t"_s + QString(200, QLatin1Char('x')) + QString::number(i));
-    QApplication::clipboard()->setText(lines.join(QLatin1Char('\n')));
-    mE->disk()->setFocus();
-    mE->disk()->setCurrentRow(3);
-    mE->disk()->setCurrentColumn(2);
-    keyboard::press(Qt::Key_V, Qt::ControlModifier);
-    gConnection->housekeeping("PRAGMA max_page_count=1"); // as many as there are
-    mE->desktop.expectBox(u"The disk is full; nothing was written."_s);
-    editor->SaveKeepingPosition();
-    QCOMPARE(three(), before);
-    gConnection->housekeeping("PRAGMA max_page_count=100000");
-    editor->SaveKeepingPosition();
-    QCOMPARE(mE->tracks(3).size(), 104);
-}
-
-void tst_frmCDRoot::aDiscThatCannotBeDeleted()
-{
-    CdEditor *editor = openThree();
-    refuse("delete on CompactDiscs");
-    mE->tabs()->setCurrentIndex(1);
-    mE->desktop.expectBox(u"not this one"_s);
-    mE->button(2)->trigger();
-    QCOMPARE(mE->tracks(3).size(), 4);
-    QCOMPARE(mE->tabs()->count(), 3);
-    QCOMPARE(mE->cell(1, 3), u"Three"_s);
-    allow();
-    mE->button(2)->trigger();
-    QCOMPARE(mE->tabs()->count(), 2);
-    QVERIFY(editor->updatesEnabled());
-}
-
-// The id is given anew, and by then to another record.
-void tst_frmCDRoot::aFailureOfTheFirstSave()
-{
-    CdEditor *editor = mE->open<frmCDRoot>("I");
-    mE->field("txtTitel")->setText(u"T"_s);
-    mE->addTracks(texts("Anna|One"));
-    refuse("insert on CompactDiscs");
-    mE->desktop.expectBox(u"error"_s);
-    editor->SaveAtUserRequest();
-    QCOMPARE(editor->Mode, u"I"_s);
-    allow();
-    fillThree();
-    editor->SaveAtUserRequest();
-    QCOMPARE(editor->CdId, 5);
-    QCOMPARE(mE->tracks(5), texts("1/1 Anna - One"));
-    QCOMPARE(mE->tracks(3).size(), 4);
-}
-
-void tst_frmCDRoot::aRecordDeletedMeanwhile()
-{
-    CdEditor *editor = openThree();
-    mE->catalogue.exec("delete from CompactDiscs where CDTitels_ID=3; delete from CDTitels where "
-                       "ID=3; delete from Tracks where ID<4; delete from Artiesten where ID<3");
-    mE->addTracks(texts("Dora|Five"));
-    editor->SaveKeepingPosition();
-    QCOMPARE(mE->catalogue.rows(titleRow.arg(3)), texts("It's 100%1|V|Rock|1999|NULL"));
-    QCOMPARE(mE->tracks(3), texts("1/1 Anna - One", "1/2 Bob - Two", "1/3 Dora - Five"));
-    QCOMPARE(mE->browser->refreshed, 1);
-}
-
-void tst_frmCDRoot::anIdGivenToAnotherMeanwhile()
-{
-    CdEditor *editor = openThree();
-    mE->catalogue.exec("update CDTitels set Titel='Another' where ID=3;"
-                       "update CompactDiscs set Track_ID=4 where CDTitels_ID=3");
-    const QStringList before = three();
-    mE->addTracks(texts("Dora|Five"));
-    mE->desktop.expectBox(u"Nothing was saved"_s);
-    editor->SaveKeepingPosition();
-    QCOMPARE(three(), before);
-    QVERIFY(mE->disk()->IsChanged());
-}
-
-// While events are handled in the middle of a save, no other command begins.
-void tst_frmCDRoot::nobodyClosesABusyForm()
-{
-    CdEditor *editor = openThree();
-    mE->field("txtTitel")->setText(u"New title"_s);
-    bool came = false;
-    QTimer::singleShot(0, editor, [&] {
-        came = true;
-        mE->control<QPushButton>("cmdCancel")->click();
-        mE->button(1)->trigger();
-        mE->tabs()->setCurrentIndex(2);
+    void whatASaveTouches()
+    {
+        QFETCH(QString, field);
+        CdEditor *editor = openThree();
+        mE->catalogue.exec("create table Log(x); create trigger logged after update on CDTitels "
+                           "begin insert into Log values (1); end");
+        if (field == u"case")
+            mE->field("txtTitel")->setText(u"IT'S 100%1"_s);
+        else if (field == u"grid")
+            mE->setCell(2, 3, "Other song");
+        else if (field == u"Genre")
+            mE->genre()->setEditText(u"Jazz"_s);
+        else if (!field.isEmpty())
+            mE->editor->findChild<QLineEdit *>(field)->setText(u"2001"_s);
         editor->SaveAtUserRequest();
-    });
-    editor->SaveKeepingPosition();
-    QVERIFY(came);
-    QVERIFY(mE->editor && !editor->isUnloaded());
-    QCOMPARE(mE->tabs()->count(), 3);
-    QCOMPARE(mE->tabs()->currentIndex(), 0);
-    QCOMPARE(mE->cell(1, 3), u"One"_s);
-}
+        editor->SaveAtUserRequest(); // nothing more
+        QTEST(mE->catalogue.count("select count(*) from Log") == 1, "updates");
+        QTEST(mE->browser->refreshed, "refreshes");
+    }
+
+    void refusedSaves_data()
+    {
+        const DataRows<QString, QString, QString, QString> row("title", "year", "track", "box");
+        row("no title", "", "19", "", "Please fill in the title of this compilation!");
+        row("no year", "T", "1900", "", "Invalid year!");
+        row("track without a title", "T", "", "Zoe", "please fill in the title!");
+    }
+
+    void refusedSaves()
+    {
+        QFETCH(QString, title);
+        QFETCH(QString, year);
+        QFETCH(QString, track);
+        QFETCH(QString, box);
+        CdEditor *editor = openThree();
+        const QStringList before = three();
+        mE->field("txtTitel")->setText(title);
+        mE->field("txtYear")->setText(year);
+        if (!track.isEmpty())
+            mE->addTracks({track});
+        mE->desktop.expectBox(box);
+        editor->SaveKeepingPosition();
+        QCOMPARE(three(), before);
+        QCOMPARE(mE->browser->refreshed, 0);
+        QVERIFY(editor->updatesEnabled() && editor->cursor().shape() == Qt::ArrowCursor);
+    }
+
+    void leavingADiscRefused()
+    {
+        openThree();
+        mE->field("txtTitel")->clear();
+        mE->disk()->setFocus();
+        mE->disk()->setCurrentRow(2);
+        mE->disk()->setCurrentColumn(4);
+        const auto clickThird = [this] {
+            QTest::mouseClick(mE->tabs(), Qt::LeftButton, {}, mE->tabs()->tabRect(2).center());
+        };
+        mE->desktop.expectBox(GetMessage("MsgCompNoTitle"));
+        mE->desktop.expectBox(u"information [Songcase] "_s + GetMessage("MsgDiscNav"));
+        clickThird();
+        QCOMPARE(mE->tabs()->currentIndex(), 0);
+        QCOMPARE(mE->cell(1, 3), u"One"_s);
+        QVERIFY(mE->disk()->CurrentRow() == 2 && mE->disk()->CurrentColumn() == 4);
+        mE->desktop.expectBox(GetMessage("MsgCompNoTitle"));
+        mE->desktop.expectBox(u"information [Songcase] "_s + GetMessage("MsgAddDisc"));
+        mE->button(1)->trigger();
+        QCOMPARE(mE->tabs()->count(), 3);
+        mE->field("txtTitel")->setText(u"T"_s);
+        clickThird();
+        QCOMPARE(mE->cell(1, 3), u"Four"_s);
+    }
+
+    void deletingADisc_data()
+    {
+        const DataRows<int, int, QString> row("tab", "tabAfter", "shown");
+        row("first", 0, 0, "Three");
+        row("middle", 1, 1, "Four");
+        row("last", 2, 1, "Three");
+    }
+
+    void deletingADisc()
+    {
+        QFETCH(int, tab);
+        CdEditor *editor = openThree();
+        mE->tabs()->setCurrentIndex(tab);
+        mE->disk()->setFocus();
+        const QPoint place = editor->pos();
+        keyboard::press(Qt::Key_End, Qt::ShiftModifier);
+        QVERIFY(mE->editor == editor && editor->isVisible() && editor->pos() == place);
+        QCOMPARE(mE->tabs()->count(), 2);
+        QTEST(mE->tabs()->currentIndex(), "tabAfter");
+        QTEST(mE->cell(1, 3), "shown");
+        QCOMPARE(mE->catalogue.rows("select distinct DiskNo from CompactDiscs where CDTitels_ID=3"),
+                 texts("1", "2"));
+        QVERIFY2(mE->disk()->hasFocus() && mE->button(4)->isEnabled(), "the grid keeps the focus");
+        QVERIFY(mE->browser->refreshed >= 1);
+        QVERIFY(editor->updatesEnabled());
+    }
+
+    void closing_data()
+    {
+        const DataRows<QString, QString, bool> row("change", "how", "saved");
+        row("title, cancel", "title", "cancel", false);
+        row("track, yes", "track", "yes", true);
+        row("cell, yes", "cell", "yes", true);
+        row("cell, no", "cell", "no", false);
+    }
+
+    void closing()
+    {
+        QFETCH(QString, change);
+        QFETCH(QString, how);
+        QFETCH(bool, saved);
+        CdEditor *editor = openThree();
+        if (change == u"title") {
+            mE->field("txtTitel")->setText(u"X"_s);
+        } else if (change == u"track") {
+            mE->setCell(1, 3, "X");
+        } else { // still being typed
+            mE->disk()->setFocus();
+            mE->disk()->setCurrentColumn(3);
+            keyboard::type("X");
+        }
+        if (how == u"cancel") {
+            mE->control<QPushButton>("cmdCancel")->click();
+        } else {
+            mE->desktop.expectBox(u"Do yo want to save changes?"_s, how == u"yes" ? vbYes : vbNo);
+            editor->close();
+        }
+        QVERIFY(editor->isUnloaded());
+        QCOMPARE(mE->catalogue.count("select count(*) from (select Titel from CDTitels union all "
+                                     "select Titel from Tracks) where Titel = 'X'"),
+                 int(saved));
+    }
+
+    // The engine itself reports it, at a size that the file may not pass.
+    void aFullDisk()
+    {
+        CdEditor *editor = openThree();
+        const QStringList before = three();
+        QStringList lines;
+        for (int i = 0; i < 100; ++i)
+            lines.append(u"Anna\t"_s + QString(200, QLatin1Char('x')) + QString::number(i));
+        QApplication::clipboard()->setText(lines.join(QLatin1Char('\n')));
+        mE->disk()->setFocus();
+        mE->disk()->setCurrentRow(3);
+        mE->disk()->setCurrentColumn(2);
+        keyboard::press(Qt::Key_V, Qt::ControlModifier);
+        gConnection->housekeeping("PRAGMA max_page_count=1"); // as many as there are
+        mE->desktop.expectBox(u"The disk is full; nothing was written."_s);
+        editor->SaveKeepingPosition();
+        QCOMPARE(three(), before);
+        gConnection->housekeeping("PRAGMA max_page_count=100000");
+        editor->SaveKeepingPosition();
+        QCOMPARE(mE->tracks(3).size(), 104);
+    }
+
+    void aDiscThatCannotBeDeleted()
+    {
+        CdEditor *editor = openThree();
+        refuse("delete on CompactDiscs");
+        mE->tabs()->setCurrentIndex(1);
+        mE->desktop.expectBox(u"not this one"_s);
+        mE->button(2)->trigger();
+        QCOMPARE(mE->tracks(3).size(), 4);
+        QCOMPARE(mE->tabs()->count(), 3);
+        QCOMPARE(mE->cell(1, 3), u"Three"_s);
+        allow();
+        mE->button(2)->trigger();
+        QCOMPARE(mE->tabs()->count(), 2);
+        QVERIFY(editor->updatesEnabled());
+    }
+
+    // The id is given anew, and by then to another record.
+    void aFailureOfTheFirstSave()
+    {
+        CdEditor *editor = mE->open<frmCDRoot>("I");
+        mE->field("txtTitel")->setText(u"T"_s);
+        mE->addTracks(texts("Anna|One"));
+        refuse("insert on CompactDiscs");
+        mE->desktop.expectBox(u"error"_s);
+        editor->SaveAtUserRequest();
+        QCOMPARE(editor->Mode, u"I"_s);
+        allow();
+        fillThree();
+        editor->SaveAtUserRequest();
+        QCOMPARE(editor->CdId, 5);
+        QCOMPARE(mE->tracks(5), texts("1/1 Anna - One"));
+        QCOMPARE(mE->tracks(3).size(), 4);
+    }
+
+    void aRecordDeletedMeanwhile()
+    {
+        CdEditor *editor = openThree();
+        mE->catalogue.exec(
+            "delete from CompactDiscs where CDTitels_ID=3; delete from CDTitels where "
+            "ID=3; delete from Tracks where ID<4; delete from Artiesten where ID<3");
+        mE->addTracks(texts("Dora|Five"));
+        editor->SaveKeepingPosition();
+        QCOMPARE(mE->catalogue.rows(titleRow.arg(3)), texts("It's 100%1|V|Rock|1999|NULL"));
+        QCOMPARE(mE->tracks(3), texts("1/1 Anna - One", "1/2 Bob - Two", "1/3 Dora - Five"));
+        QCOMPARE(mE->browser->refreshed, 1);
+    }
+
+    void anIdGivenToAnotherMeanwhile()
+    {
+        CdEditor *editor = openThree();
+        mE->catalogue.exec("update CDTitels set Titel='Another' where ID=3;"
+                           "update CompactDiscs set Track_ID=4 where CDTitels_ID=3");
+        const QStringList before = three();
+        mE->addTracks(texts("Dora|Five"));
+        mE->desktop.expectBox(u"Nothing was saved"_s);
+        editor->SaveKeepingPosition();
+        QCOMPARE(three(), before);
+        QVERIFY(mE->disk()->IsChanged());
+    }
+
+    // While events are handled in the middle of a save, no other command begins.
+    void nobodyClosesABusyForm()
+    {
+        CdEditor *editor = openThree();
+        mE->field("txtTitel")->setText(u"New title"_s);
+        bool came = false;
+        QTimer::singleShot(0, editor, [&] {
+            came = true;
+            mE->control<QPushButton>("cmdCancel")->click();
+            mE->button(1)->trigger();
+            mE->tabs()->setCurrentIndex(2);
+            editor->SaveAtUserRequest();
+        });
+        editor->SaveKeepingPosition();
+        QVERIFY(came);
+        QVERIFY(mE->editor && !editor->isUnloaded());
+        QCOMPARE(mE->tabs()->count(), 3);
+        QCOMPARE(mE->tabs()->currentIndex(), 0);
+        QCOMPARE(mE->cell(1, 3), u"One"_s);
+    }
+};
 
 QTEST_MAIN(tst_frmCDRoot)
 #include "tst_frmCDRoot.moc"

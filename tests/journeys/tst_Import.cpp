@@ -9,23 +9,6 @@
 #include <QStatusBar>
 #include <QTabWidget>
 
-/// A person reads text files into an empty catalogue and sees them in the browser; all through the
-/// menu.
-class tst_Import : public Journey
-{
-    Q_OBJECT
-
-private slots:
-    void aFileOfEachFormat_data();
-    void aFileOfEachFormat();
-    void aBrokenFileChangesNothing();
-
-private:
-    void read(const QByteArray &content, bool albums, bool flat);
-    void load(const char *countText, int count);
-    void import(const QByteArray &content, bool albums, bool flat, int tracks);
-};
-
 namespace
 {
 
@@ -43,79 +26,90 @@ const QByteArray albumFlat =
 
 } // namespace
 
-// The wizard, from the menu to the review or to the boxes of a refusal.
-void tst_Import::read(const QByteArray &content, bool albums, bool flat)
+/// A person reads text files into an empty catalogue and sees them in the browser; all through the
+/// menu.
+class tst_Import : public Journey
 {
-    mDesktop->expectFile(writeFile(mDesktop->folder + u"/tracks.txt"_s, content));
-    mProgram->choose("Import");
-    QVERIFY(!mProgram->entry("Import")->isEnabled());
-    QVERIFY(!mProgram->control<QPushButton>("frmImportWizard", "cmdImport")->isEnabled());
-    mProgram->control<QPushButton>("frmImportWizard", "cmdBrowse")->click();
-    if (albums)
-        mProgram->control<QCheckBox>("frmImportWizard", "Enkel")->click();
-    if (flat)
-        mProgram->control<QCheckBox>("frmImportWizard", "Plat")->click();
-    mDesktop->expectModal(u"frmImportBusy"_s);
-    mProgram->control<QPushButton>("frmImportWizard", "cmdImport")->click();
-}
+    Q_OBJECT
 
-void tst_Import::load(const char *countText, int count)
-{
-    QVERIFY(!mProgram->entry("Import")->isEnabled());
-    mDesktop->expectModal(u"frmImportDBBusy"_s);
-    mDesktop->expectBox(GetMessage(countText) + (count >= 0 ? QString::number(count) : QString()));
-    mProgram->control<QPushButton>("frmImport", "StartDBImport")->click();
-}
-
-void tst_Import::import(const QByteArray &content, bool albums, bool flat, int tracks)
-{
-    read(content, albums, flat);
-    QCOMPARE(mProgram->control<DBListViewCTL>("frmImport", "ImportListView")->ListItems().Count(),
-             tracks);
-    load("MsgNumImpTracks", tracks);
-    QVERIFY(!mProgram->screen("frmImport"));
-    QVERIFY(mProgram->entry("Import")->isEnabled());
-}
-
-void tst_Import::aFileOfEachFormat_data()
-{
-    const DataRows<int, QByteArray, bool, bool> row("language", "content", "albums", "flat");
-    row("compilations, nested", languageDutch, compilationNested, false, false);
-    row("compilations, flat", languageEnglish, compilationFlat, false, true);
-    row("albums, nested", languageEnglish, albumNested, true, false);
-    row("albums, flat", languageDutch, albumFlat, true, true);
-}
-
-void tst_Import::aFileOfEachFormat()
-{
-    QFETCH(int, language);
-    QFETCH(QByteArray, content);
-    QFETCH(bool, albums);
-    QFETCH(bool, flat);
-    start(language);
-    import(content, albums, flat, 3);
-    if (albums) {
-        QCOMPARE(column("SngList", 1), texts("Pink Freud"));
-        QCOMPARE(column("SngList", 2), texts("The Wail"));
-    } else {
-        QCOMPARE(column("ColList", 1), texts("The Best Of 1985"));
-        mProgram->control<QTabWidget>("frmCDList", "CDTab")->setCurrentIndex(2);
-        QCOMPARE(mProgram->control<QStatusBar>("frmCDList", "TheStatusBar")->currentMessage(),
-                 GetMessage("DiffTracks") + QLatin1Char('3'));
+private:
+    // The wizard, from the menu to the review or to the boxes of a refusal.
+    void read(const QByteArray &content, bool albums, bool flat)
+    {
+        mDesktop->expectFile(writeFile(mDesktop->folder + u"/tracks.txt"_s, content));
+        mProgram->choose("Import");
+        QVERIFY(!mProgram->entry("Import")->isEnabled());
+        QVERIFY(!mProgram->control<QPushButton>("frmImportWizard", "cmdImport")->isEnabled());
+        mProgram->control<QPushButton>("frmImportWizard", "cmdBrowse")->click();
+        if (albums)
+            mProgram->control<QCheckBox>("frmImportWizard", "Enkel")->click();
+        if (flat)
+            mProgram->control<QCheckBox>("frmImportWizard", "Plat")->click();
+        mDesktop->expectModal(u"frmImportBusy"_s);
+        mProgram->control<QPushButton>("frmImportWizard", "cmdImport")->click();
     }
-}
 
-void tst_Import::aBrokenFileChangesNothing()
-{
-    start(languageEnglish);
-    mDesktop->expectBox(u"error [File error] Error at line 7: Invalid year found!"_s);
-    mDesktop->expectBox(u"Error at line 7: Invalid file format!"_s);
-    read("Pink Freud\nThe Wail\n1\n1\nIn\n\n79\n", true, false);
-    mDesktop->verifyAllCame();
-    QVERIFY(!mProgram->screen("frmImport"));
-    QVERIFY(mProgram->entry("Import")->isEnabled());
-    QVERIFY(column("SngList", 1).isEmpty());
-}
+    void load(const char *countText, int count)
+    {
+        QVERIFY(!mProgram->entry("Import")->isEnabled());
+        mDesktop->expectModal(u"frmImportDBBusy"_s);
+        mDesktop->expectBox(GetMessage(countText) +
+                            (count >= 0 ? QString::number(count) : QString()));
+        mProgram->control<QPushButton>("frmImport", "StartDBImport")->click();
+    }
+
+    void import(const QByteArray &content, bool albums, bool flat, int tracks)
+    {
+        read(content, albums, flat);
+        QCOMPARE(
+            mProgram->control<DBListViewCTL>("frmImport", "ImportListView")->ListItems().Count(),
+            tracks);
+        load("MsgNumImpTracks", tracks);
+        QVERIFY(!mProgram->screen("frmImport"));
+        QVERIFY(mProgram->entry("Import")->isEnabled());
+    }
+
+private slots:
+    void aFileOfEachFormat_data()
+    {
+        const DataRows<int, QByteArray, bool, bool> row("language", "content", "albums", "flat");
+        row("compilations, nested", languageDutch, compilationNested, false, false);
+        row("compilations, flat", languageEnglish, compilationFlat, false, true);
+        row("albums, nested", languageEnglish, albumNested, true, false);
+        row("albums, flat", languageDutch, albumFlat, true, true);
+    }
+
+    void aFileOfEachFormat()
+    {
+        QFETCH(int, language);
+        QFETCH(QByteArray, content);
+        QFETCH(bool, albums);
+        QFETCH(bool, flat);
+        start(language);
+        import(content, albums, flat, 3);
+        if (albums) {
+            QCOMPARE(column("SngList", 1), texts("Pink Freud"));
+            QCOMPARE(column("SngList", 2), texts("The Wail"));
+        } else {
+            QCOMPARE(column("ColList", 1), texts("The Best Of 1985"));
+            mProgram->control<QTabWidget>("frmCDList", "CDTab")->setCurrentIndex(2);
+            QCOMPARE(mProgram->control<QStatusBar>("frmCDList", "TheStatusBar")->currentMessage(),
+                     GetMessage("DiffTracks") + QLatin1Char('3'));
+        }
+    }
+
+    void aBrokenFileChangesNothing()
+    {
+        start(languageEnglish);
+        mDesktop->expectBox(u"error [File error] Error at line 7: Invalid year found!"_s);
+        mDesktop->expectBox(u"Error at line 7: Invalid file format!"_s);
+        read("Pink Freud\nThe Wail\n1\n1\nIn\n\n79\n", true, false);
+        mDesktop->verifyAllCame();
+        QVERIFY(!mProgram->screen("frmImport"));
+        QVERIFY(mProgram->entry("Import")->isEnabled());
+        QVERIFY(column("SngList", 1).isEmpty());
+    }
+};
 
 QTEST_MAIN(tst_Import)
 #include "tst_Import.moc"

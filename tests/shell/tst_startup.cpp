@@ -12,11 +12,6 @@ class tst_startup : public QObject
 {
     Q_OBJECT
 
-private slots:
-    void settingsAreReadAndMended_data();
-    void settingsAreReadAndMended();
-    void proxySettingsCountOnlyWhenOneIsUsed();
-
 private:
     static QVariant stored(const char *name)
     {
@@ -28,55 +23,56 @@ private:
         settings.CreateKey(settingsKey);
         settings.SetValue(settingsKey, QLatin1String(name), value);
     }
+
+private slots:
+    void settingsAreReadAndMended_data()
+    {
+        const DataRows<QString, QVariant, int, int, int, bool> row(
+            "name", "before", "after", "session", "language", "conversion");
+        const QVariant none;
+        row("first session", "Session", none, 1, 1, 1, false);
+        row("next session", "Session", 41, 42, 42, 1, false);
+        row("session as text", "Session", u"6"_s, 7, 7, 1, false);
+        row("session is words", "Session", u"x"_s, 1, 1, 1, false);
+        row("Dutch", "Language", 19, 19, 1, 19, false);
+        row("no such language", "Language", 5, 1, 1, 1, false);
+        row("language is words", "Language", u"abc"_s, 1, 1, 1, false);
+        row("generation 3", "DBVersion", 3, 4, 1, 1, true);
+        row("generation 4", "DBVersion", 4, 4, 1, 1, false);
+        row("no generation", "DBVersion", none, 4, 1, 1, false);
+    }
+
+    void settingsAreReadAndMended()
+    {
+        QFETCH(QString, name);
+        QFETCH(QVariant, before);
+        ScriptedDesktop desktop;
+        if (before.isValid())
+            store(name.toLatin1().constData(), before);
+        const auto found = startup::readSettings(desktop.folder);
+        QTEST(stored(name.toLatin1().constData()).toInt(), "after");
+        QTEST(found.session, "session");
+        QTEST(gLanguage, "language");
+        QTEST(found.conversionPending, "conversion");
+        if (name == QLatin1String("DBVersion"))
+            QVERIFY2(!startup::readSettings(desktop.folder).conversionPending, "offered once only");
+    }
+
+    void proxySettingsCountOnlyWhenOneIsUsed()
+    {
+        ScriptedDesktop desktop;
+        store("ProxyServer", u"proxy"_s);
+        store("ProxyServerPort", u"8080"_s);
+        QCOMPARE(startup::ReadProxySettings(), QString());
+        QVERIFY(!gUseProxy);
+        QCOMPARE(gProxyServer, QString());
+        QCOMPARE(gProxyServerPort, u"0"_s);
+        store("UseProxy", 1);
+        QCOMPARE(startup::ReadProxySettings(), u"1"_s);
+        QVERIFY(gUseProxy);
+        QCOMPARE(gProxyServer + gProxyServerPort, u"proxy8080"_s);
+    }
 };
-
-void tst_startup::settingsAreReadAndMended_data()
-{
-    const DataRows<QString, QVariant, int, int, int, bool> row("name", "before", "after", "session",
-                                                               "language", "conversion");
-    const QVariant none;
-    row("first session", "Session", none, 1, 1, 1, false);
-    row("next session", "Session", 41, 42, 42, 1, false);
-    row("session as text", "Session", u"6"_s, 7, 7, 1, false);
-    row("session is words", "Session", u"x"_s, 1, 1, 1, false);
-    row("Dutch", "Language", 19, 19, 1, 19, false);
-    row("no such language", "Language", 5, 1, 1, 1, false);
-    row("language is words", "Language", u"abc"_s, 1, 1, 1, false);
-    row("generation 3", "DBVersion", 3, 4, 1, 1, true);
-    row("generation 4", "DBVersion", 4, 4, 1, 1, false);
-    row("no generation", "DBVersion", none, 4, 1, 1, false);
-}
-
-void tst_startup::settingsAreReadAndMended()
-{
-    QFETCH(QString, name);
-    QFETCH(QVariant, before);
-    ScriptedDesktop desktop;
-    if (before.isValid())
-        store(name.toLatin1().constData(), before);
-    const auto found = startup::readSettings(desktop.folder);
-    QTEST(stored(name.toLatin1().constData()).toInt(), "after");
-    QTEST(found.session, "session");
-    QTEST(gLanguage, "language");
-    QTEST(found.conversionPending, "conversion");
-    if (name == QLatin1String("DBVersion"))
-        QVERIFY2(!startup::readSettings(desktop.folder).conversionPending, "offered once only");
-}
-
-void tst_startup::proxySettingsCountOnlyWhenOneIsUsed()
-{
-    ScriptedDesktop desktop;
-    store("ProxyServer", u"proxy"_s);
-    store("ProxyServerPort", u"8080"_s);
-    QCOMPARE(startup::ReadProxySettings(), QString());
-    QVERIFY(!gUseProxy);
-    QCOMPARE(gProxyServer, QString());
-    QCOMPARE(gProxyServerPort, u"0"_s);
-    store("UseProxy", 1);
-    QCOMPARE(startup::ReadProxySettings(), u"1"_s);
-    QVERIFY(gUseProxy);
-    QCOMPARE(gProxyServer + gProxyServerPort, u"proxy8080"_s);
-}
 
 QTEST_MAIN(tst_startup)
 #include "tst_startup.moc"

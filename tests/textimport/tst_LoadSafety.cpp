@@ -14,17 +14,6 @@
 #include <sys/resource.h>
 #include <unistd.h>
 
-/// What happens to the catalogue when a load is killed or the disk fills up: nothing.
-class tst_LoadSafety : public QObject
-{
-    Q_OBJECT
-
-private slots:
-    void aKilledLoadLeavesNoTrace_data();
-    void aKilledLoadLeavesNoTrace();
-    void aFullDiskLeavesNoTrace();
-};
-
 namespace
 {
 
@@ -126,68 +115,75 @@ private:
 
 } // namespace
 
-void tst_LoadSafety::aKilledLoadLeavesNoTrace_data()
+/// What happens to the catalogue when a load is killed or the disk fills up: nothing.
+class tst_LoadSafety : public QObject
 {
-    const DataRows<int, bool> row("track", "loaded");
-    row("early", 30, false);
-    row("before the last track", trackCount, false);
-    row("behind the commit", trackCount + 1, true);
-}
+    Q_OBJECT
 
-void tst_LoadSafety::aKilledLoadLeavesNoTrace()
-{
-    QFETCH(int, track);
-    QFETCH(bool, loaded);
-    TestCatalogue catalogue;
-    catalogue.exec("insert into Artiesten values (1,'Artist 1'); "
-                   "insert into Tracks values (1,1,'X',NULL,NULL)");
-    gConnection->Close();
-    const QStringList before = everything(catalogue);
-    const QString file = writeFile(catalogue.path("in.txt"), manyTracks());
+private slots:
+    void aKilledLoadLeavesNoTrace_data()
+    {
+        const DataRows<int, bool> row("track", "loaded");
+        row("early", 30, false);
+        row("before the last track", trackCount, false);
+        row("behind the commit", trackCount + 1, true);
+    }
 
-    QProcess other;
-    other.start(QCoreApplication::applicationFilePath(),
-                {u"--load"_s, catalogue.file(), file, QString::number(track)});
-    QVERIFY(other.waitForReadyRead(20000));
-    QCOMPARE(other.readAllStandardOutput().trimmed(), QByteArray("here"));
-    const bool halfWritten = track > 1 && !loaded;
-    QCOMPARE(QFileInfo(catalogue.file() + u"-journal"_s).size() > 0, halfWritten);
-    other.kill();
-    QVERIFY(other.waitForFinished());
+    void aKilledLoadLeavesNoTrace()
+    {
+        QFETCH(int, track);
+        QFETCH(bool, loaded);
+        TestCatalogue catalogue;
+        catalogue.exec("insert into Artiesten values (1,'Artist 1'); "
+                       "insert into Tracks values (1,1,'X',NULL,NULL)");
+        gConnection->Close();
+        const QStringList before = everything(catalogue);
+        const QString file = writeFile(catalogue.path("in.txt"), manyTracks());
 
-    openConnection(catalogue.file());
-    cataloguefile::verify(*gConnection, true);
-    if (loaded)
-        QCOMPARE(catalogue.count("select count(*) from CompactDiscs"), trackCount);
-    else
-        QCOMPARE(everything(catalogue), before);
-}
+        QProcess other;
+        other.start(QCoreApplication::applicationFilePath(),
+                    {u"--load"_s, catalogue.file(), file, QString::number(track)});
+        QVERIFY(other.waitForReadyRead(20000));
+        QCOMPARE(other.readAllStandardOutput().trimmed(), QByteArray("here"));
+        const bool halfWritten = track > 1 && !loaded;
+        QCOMPARE(QFileInfo(catalogue.file() + u"-journal"_s).size() > 0, halfWritten);
+        other.kill();
+        QVERIFY(other.waitForFinished());
 
-void tst_LoadSafety::aFullDiskLeavesNoTrace()
-{
-    ScriptedDesktop desktop;
-    QTemporaryDir folder;
-    SmallDisk disk(folder.path());
-    const QString file = folder.filePath(u"Compact4.orv"_s);
-    cataloguefile::create(file);
-    openConnection(file);
-    gConnection->Execute(u"insert into Artiesten(ID,Naam) values (1,'Artist 1')"_s);
-    QTemporaryDir elsewhere;
-    chooseImport('C', writeFile(elsewhere.filePath(u"in.txt"_s), manyTracks()));
-    FileReading().run();
+        openConnection(catalogue.file());
+        cataloguefile::verify(*gConnection, true);
+        if (loaded)
+            QCOMPARE(catalogue.count("select count(*) from CompactDiscs"), trackCount);
+        else
+            QCOMPARE(everything(catalogue), before);
+    }
 
-    disk.fill();
-    load(desktop, {disk.message(), disk.message()});
-    QCOMPARE(gConnection->housekeeping("select group_concat(ID) from Artiesten"), u"1"_s);
-    QCOMPARE(gConnection->housekeeping("select count(*) from Tracks"), u"0"_s);
-    QCOMPARE(gConnection->housekeeping("PRAGMA integrity_check"), u"ok"_s);
+    void aFullDiskLeavesNoTrace()
+    {
+        ScriptedDesktop desktop;
+        QTemporaryDir folder;
+        SmallDisk disk(folder.path());
+        const QString file = folder.filePath(u"Compact4.orv"_s);
+        cataloguefile::create(file);
+        openConnection(file);
+        gConnection->Execute(u"insert into Artiesten(ID,Naam) values (1,'Artist 1')"_s);
+        QTemporaryDir elsewhere;
+        chooseImport('C', writeFile(elsewhere.filePath(u"in.txt"_s), manyTracks()));
+        FileReading().run();
 
-    disk.makeRoom();
-    load(desktop, {u"Number of imported tracks: %1"_s.arg(trackCount)});
-    QCOMPARE(gConnection->housekeeping("select count(*) from CompactDiscs"),
-             QString::number(trackCount));
-    gConnection.reset();
-}
+        disk.fill();
+        load(desktop, {disk.message(), disk.message()});
+        QCOMPARE(gConnection->housekeeping("select group_concat(ID) from Artiesten"), u"1"_s);
+        QCOMPARE(gConnection->housekeeping("select count(*) from Tracks"), u"0"_s);
+        QCOMPARE(gConnection->housekeeping("PRAGMA integrity_check"), u"ok"_s);
+
+        disk.makeRoom();
+        load(desktop, {u"Number of imported tracks: %1"_s.arg(trackCount)});
+        QCOMPARE(gConnection->housekeeping("select count(*) from CompactDiscs"),
+                 QString::number(trackCount));
+        gConnection.reset();
+    }
+};
 
 int main(int argc, char **argv)
 {

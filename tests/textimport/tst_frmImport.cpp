@@ -8,24 +8,6 @@
 
 #include <QPushButton>
 
-/// The review, and the load that it starts.
-class tst_frmImport : public ImportTest
-{
-    Q_OBJECT
-
-private slots:
-    void showsTheTracks();
-    void aCancelledLoadCanBeRepeated();
-    void aFailedLoadTellsTwice();
-
-private:
-    void review(const QByteArray &content);
-    void load();
-    DBListViewCTL *list() const { return mReview->findChild<DBListViewCTL *>(u"ImportListView"_s); }
-
-    QPointer<frmImport> mReview;
-};
-
 namespace
 {
 
@@ -33,74 +15,86 @@ const QByteArray twoTracks = "x\na*t*Pop*1985\nb*u**\n";
 
 } // namespace
 
-void tst_frmImport::review(const QByteArray &content)
+/// The review, and the load that it starts.
+class tst_frmImport : public ImportTest
 {
-    chooseContent('C', content);
-    FileReading().run();
-    setImportEnabled(false);
-    setFramePointer(vbHourglass);
-    mReview = &defaultInstance<frmImport>();
-    mReview->Show();
-    QVERIFY(QTest::qWaitForWindowExposed(mReview));
-}
+    Q_OBJECT
 
-void tst_frmImport::load()
-{
-    mDesktop->expectModal(u"frmImportDBBusy"_s);
-    mReview->findChild<QPushButton *>(u"StartDBImport"_s)->click();
-    mDesktop->verifyAllCame();
-}
-
-void tst_frmImport::showsTheTracks()
-{
-    gLanguage = languageDutch;
-    review(twoTracks);
-    QStringList heads, row;
-    for (int i = 1; i <= list()->ColumnHeaders().Count(); ++i) {
-        heads.append(list()->ColumnHeaders().Item(i).Text());
-        row.append(list()->ListItems().Item(1).SubItems(i - 1));
+private:
+    void review(const QByteArray &content)
+    {
+        chooseContent('C', content);
+        FileReading().run();
+        setImportEnabled(false);
+        setFramePointer(vbHourglass);
+        mReview = &defaultInstance<frmImport>();
+        mReview->Show();
+        QVERIFY(QTest::qWaitForWindowExposed(mReview));
     }
-    QCOMPARE(heads, texts("Nr", "Artiest", "Titel", "Genre", "Hitjaar", "CD-titel", "CD-nr",
-                          "Disknr", "Tracknr"));
-    QCOMPARE(list()->ListItems().Count(), 2);
-    QCOMPARE(row.join(u'|'), u"1|A|T|Pop|1985|X|2|1|1"_s);
-    QVERIFY(!mFrame->hourglass() && !mFrame->importEnabled);
-    mReview->close();
-    QVERIFY(mFrame->importEnabled && !gImportRecords);
-}
 
-void tst_frmImport::aCancelledLoadCanBeRepeated()
-{
-    CountingBrowser browser;
-    mCatalogue->exec("insert into CDTitels values (1,'X',NULL,'V',NULL,NULL)");
-    review(twoTracks);
-    mDesktop->expectBox(u"yes-no-cancel"_s, vbCancel);
-    mDesktop->expectBox(u"Cancelled importing. There were no discs imported!"_s);
-    load();
-    QCOMPARE(browser.refreshed, 0);
-    QVERIFY(!mReview->isUnloaded());
-    QVERIFY(!mFrame->importEnabled);
-    QVERIFY(!mFrame->hourglass());
-    mDesktop->expectBox(u"yes-no-cancel"_s, vbYes);
-    mDesktop->expectBox(u"Number of imported tracks: 2"_s);
-    load();
-    QCOMPARE(browser.refreshed, 1);
-    QVERIFY(!mReview || mReview->isUnloaded());
-    QVERIFY(mFrame->importEnabled && !mFrame->hourglass() && !gImportRecords);
-}
+    void load()
+    {
+        mDesktop->expectModal(u"frmImportDBBusy"_s);
+        mReview->findChild<QPushButton *>(u"StartDBImport"_s)->click();
+        mDesktop->verifyAllCame();
+    }
 
-void tst_frmImport::aFailedLoadTellsTwice()
-{
-    review("x\na*t*R 'n R*\n");
-    mDesktop->expectBox(u"-2147217900 - "_s);
-    mDesktop->expectBox(u"-2147217900 - "_s);
-    load();
-    QCOMPARE(mDesktop->boxes.value(0), mDesktop->boxes.value(1));
-    QVERIFY(!mReview->isUnloaded());
-    QVERIFY(mFrame->hourglass()); // by design
-    gConnection->Execute(u"insert into Artiesten(ID,Naam) values (1,'kept')"_s);
-    QCOMPARE(mCatalogue->rows("select Naam from Artiesten"), texts("kept"));
-}
+    DBListViewCTL *list() const { return mReview->findChild<DBListViewCTL *>(u"ImportListView"_s); }
+
+    QPointer<frmImport> mReview;
+
+private slots:
+    void showsTheTracks()
+    {
+        gLanguage = languageDutch;
+        review(twoTracks);
+        QStringList heads, row;
+        for (int i = 1; i <= list()->ColumnHeaders().Count(); ++i) {
+            heads.append(list()->ColumnHeaders().Item(i).Text());
+            row.append(list()->ListItems().Item(1).SubItems(i - 1));
+        }
+        QCOMPARE(heads, texts("Nr", "Artiest", "Titel", "Genre", "Hitjaar", "CD-titel", "CD-nr",
+                              "Disknr", "Tracknr"));
+        QCOMPARE(list()->ListItems().Count(), 2);
+        QCOMPARE(row.join(u'|'), u"1|A|T|Pop|1985|X|2|1|1"_s);
+        QVERIFY(!mFrame->hourglass() && !mFrame->importEnabled);
+        mReview->close();
+        QVERIFY(mFrame->importEnabled && !gImportRecords);
+    }
+
+    void aCancelledLoadCanBeRepeated()
+    {
+        CountingBrowser browser;
+        mCatalogue->exec("insert into CDTitels values (1,'X',NULL,'V',NULL,NULL)");
+        review(twoTracks);
+        mDesktop->expectBox(u"yes-no-cancel"_s, vbCancel);
+        mDesktop->expectBox(u"Cancelled importing. There were no discs imported!"_s);
+        load();
+        QCOMPARE(browser.refreshed, 0);
+        QVERIFY(!mReview->isUnloaded());
+        QVERIFY(!mFrame->importEnabled);
+        QVERIFY(!mFrame->hourglass());
+        mDesktop->expectBox(u"yes-no-cancel"_s, vbYes);
+        mDesktop->expectBox(u"Number of imported tracks: 2"_s);
+        load();
+        QCOMPARE(browser.refreshed, 1);
+        QVERIFY(!mReview || mReview->isUnloaded());
+        QVERIFY(mFrame->importEnabled && !mFrame->hourglass() && !gImportRecords);
+    }
+
+    void aFailedLoadTellsTwice()
+    {
+        review("x\na*t*R 'n R*\n");
+        mDesktop->expectBox(u"-2147217900 - "_s);
+        mDesktop->expectBox(u"-2147217900 - "_s);
+        load();
+        QCOMPARE(mDesktop->boxes.value(0), mDesktop->boxes.value(1));
+        QVERIFY(!mReview->isUnloaded());
+        QVERIFY(mFrame->hourglass()); // by design
+        gConnection->Execute(u"insert into Artiesten(ID,Naam) values (1,'kept')"_s);
+        QCOMPARE(mCatalogue->rows("select Naam from Artiesten"), texts("kept"));
+    }
+};
 
 QTEST_MAIN(tst_frmImport)
 #include "tst_frmImport.moc"

@@ -13,13 +13,6 @@ class tst_frmImportBusy : public ImportTest
 {
     Q_OBJECT
 
-private slots:
-    void refusals_data();
-    void refusals();
-    void nothingToReview();
-    void itStaysWhileItReads();
-    void closedBeforeItBegins();
-
 private:
     void read()
     {
@@ -27,88 +20,90 @@ private:
         defaultInstance<frmImportBusy>().ShowModal();
     }
     static Form *review() { return Form::openForms().value(0); }
-};
 
-void tst_frmImportBusy::refusals_data()
-{
-    const DataRows<int, char, QByteArray, QStringList> row("language", "format", "content",
-                                                           "boxes");
-    row("a fault in the data", languageEnglish, 'C', "x\n*b**\n",
-        texts("error [File error] Error at line 2: Found empty line, whereas artist is obligatory!",
-              "error [Songcase] Error at line 2: Invalid file format!"));
-    row("a fault in the data, Dutch", languageDutch, 'A', "x\n\n",
-        texts("error [Bestandsfout] Fout op regel 2: Er werd een getal verwacht maar niet "
-              "gevonden!",
-              "error [Songcase] Fout op regel 2: Onjuist bestandsformaat"));
-    row("no such file at all", languageEnglish, 'C', "x\na*b\n",
-        texts("error [Songcase] Error at line 2: Invalid file format!"));
-}
-
-void tst_frmImportBusy::refusals()
-{
-    QFETCH(int, language);
-    QFETCH(char, format);
-    QFETCH(QByteArray, content);
-    QFETCH(QStringList, boxes);
-    gLanguage = language;
-    for (const QString &box : boxes)
-        mDesktop->expectBox(box);
-    chooseContent(format, content);
-    read();
-    QVERIFY(mFrame->importEnabled && !mFrame->hourglass());
-    QVERIFY(!review());
-}
-
-void tst_frmImportBusy::nothingToReview()
-{
-    chooseContent('A', {});
-    for (const QString &name : texts("in.txt", "missing.txt")) {
-        gImportFile = mCatalogue->path(name);
-        read();
-        QVERIFY(review() && !mFrame->importEnabled);
-        QVERIFY(!review()->findChild<QPushButton *>(u"StartDBImport"_s)->isEnabled());
-        review()->close();
-        QVERIFY(mFrame->importEnabled);
+private slots:
+    void refusals_data()
+    {
+        const DataRows<int, char, QByteArray, QStringList> row("language", "format", "content",
+                                                               "boxes");
+        row("a fault in the data", languageEnglish, 'C', "x\n*b**\n",
+            texts("error [File error] Error at line 2: Found empty line, whereas artist is "
+                  "obligatory!",
+                  "error [Songcase] Error at line 2: Invalid file format!"));
+        row("a fault in the data, Dutch", languageDutch, 'A', "x\n\n",
+            texts("error [Bestandsfout] Fout op regel 2: Er werd een getal verwacht maar niet "
+                  "gevonden!",
+                  "error [Songcase] Fout op regel 2: Onjuist bestandsformaat"));
+        row("no such file at all", languageEnglish, 'C', "x\na*b\n",
+            texts("error [Songcase] Error at line 2: Invalid file format!"));
     }
-}
 
-// Somebody keeps on closing it, at each pump.
-void tst_frmImportBusy::itStaysWhileItReads()
-{
-    chooseContent('C', "x\n" + QByteArray("a*b**\n").repeated(50000));
-    int refused = 0, highest = 0;
-    QString title, label;
-    mDesktop->expectModal(u"frmImportBusy"_s, [&](Form &busy) {
-        auto *again = new QTimer(&busy);
-        connect(again, &QTimer::timeout, &busy, [&] {
-            if (busy.findChild<QTimer *>(u"StartReading"_s)->isActive())
-                return;
-            refused += busy.isVisible() && !busy.Unload();
-            title = busy.windowTitle();
-            label = busy.findChild<QLabel *>(u"lblRead"_s)->text();
-            highest = busy.findChild<QProgressBar *>(u"ImportProgressBar"_s)->value();
-            QVERIFY(mFrame->hourglass());
+    void refusals()
+    {
+        QFETCH(int, language);
+        QFETCH(char, format);
+        QFETCH(QByteArray, content);
+        QFETCH(QStringList, boxes);
+        gLanguage = language;
+        for (const QString &box : boxes)
+            mDesktop->expectBox(box);
+        chooseContent(format, content);
+        read();
+        QVERIFY(mFrame->importEnabled && !mFrame->hourglass());
+        QVERIFY(!review());
+    }
+
+    void nothingToReview()
+    {
+        chooseContent('A', {});
+        for (const QString &name : texts("in.txt", "missing.txt")) {
+            gImportFile = mCatalogue->path(name);
+            read();
+            QVERIFY(review() && !mFrame->importEnabled);
+            QVERIFY(!review()->findChild<QPushButton *>(u"StartDBImport"_s)->isEnabled());
+            review()->close();
+            QVERIFY(mFrame->importEnabled);
+        }
+    }
+
+    // Somebody keeps on closing it, at each pump.
+    void itStaysWhileItReads()
+    {
+        chooseContent('C', "x\n" + QByteArray("a*b**\n").repeated(50000));
+        int refused = 0, highest = 0;
+        QString title, label;
+        mDesktop->expectModal(u"frmImportBusy"_s, [&](Form &busy) {
+            auto *again = new QTimer(&busy);
+            connect(again, &QTimer::timeout, &busy, [&] {
+                if (busy.findChild<QTimer *>(u"StartReading"_s)->isActive())
+                    return;
+                refused += busy.isVisible() && !busy.Unload();
+                title = busy.windowTitle();
+                label = busy.findChild<QLabel *>(u"lblRead"_s)->text();
+                highest = busy.findChild<QProgressBar *>(u"ImportProgressBar"_s)->value();
+                QVERIFY(mFrame->hourglass());
+            });
+            again->start(0);
         });
-        again->start(0);
-    });
-    defaultInstance<frmImportBusy>().ShowModal();
-    QVERIFY(refused > 0);
-    QCOMPARE(title, u"Busy reading file: "_s + gImportFile);
-    QCOMPARE(label, QString::number(highest) + u"% ingelezen"_s);
-    QVERIFY(review());
-    QCOMPARE(gImportRecords->RecordCount(), 50000);
-    QVERIFY(!mFrame->hourglass());
-}
+        defaultInstance<frmImportBusy>().ShowModal();
+        QVERIFY(refused > 0);
+        QCOMPARE(title, u"Busy reading file: "_s + gImportFile);
+        QCOMPARE(label, QString::number(highest) + u"% ingelezen"_s);
+        QVERIFY(review());
+        QCOMPARE(gImportRecords->RecordCount(), 50000);
+        QVERIFY(!mFrame->hourglass());
+    }
 
-void tst_frmImportBusy::closedBeforeItBegins()
-{
-    frmImportBusy &busy = defaultInstance<frmImportBusy>();
-    busy.Load();
-    QVERIFY(!mFrame->importEnabled);
-    QVERIFY(busy.Unload());
-    QVERIFY(mFrame->importEnabled);
-    QVERIFY(!busy.findChild<QTimer *>(u"StartReading"_s)->isActive());
-}
+    void closedBeforeItBegins()
+    {
+        frmImportBusy &busy = defaultInstance<frmImportBusy>();
+        busy.Load();
+        QVERIFY(!mFrame->importEnabled);
+        QVERIFY(busy.Unload());
+        QVERIFY(mFrame->importEnabled);
+        QVERIFY(!busy.findChild<QTimer *>(u"StartReading"_s)->isActive());
+    }
+};
 
 QTEST_MAIN(tst_frmImportBusy)
 #include "tst_frmImportBusy.moc"

@@ -10,29 +10,6 @@
 
 using namespace ADODB;
 
-/// The connection to a real file: values on their way in and out, transactions, failures.
-class tst_Connection : public QObject
-{
-    Q_OBJECT
-
-private slots:
-    void keepsValues_data();
-    void keepsValues();
-    void findsText_data();
-    void findsText();
-    void bindsAgain();
-    void commitsAndRollsBack();
-    void joinedRoutineTakesBackItsOwn();
-    void abandonedTransaction();
-    void handlerInsideARunningRoutine();
-    void failedCommit();
-    void firstRowsReadsNoMore();
-    void engineRollsBackByItself();
-    void lockedByAnotherProgram();
-    void opensWhatIsNamed();
-    void nextIdReadsAnIndex();
-};
-
 namespace
 {
 
@@ -56,273 +33,282 @@ int artists()
 
 } // namespace
 
-void tst_Connection::keepsValues_data()
+/// The connection to a real file: values on their way in and out, transactions, failures.
+class tst_Connection : public QObject
 {
-    const DataRows<QString, QString, QString> row("literal", "type", "text");
-    row("'1e10'", "text", "1e10");
-    row("1e10", "real", "10000000000");
-    row("'007'", "text", "007");
-    row("-9223372036854775807", "integer", "-9223372036854775807");
-    row("1.5", "real", "1.5");
-    row("''", "text", "");
-    row("NULL", "null", "");
-    row("'d''Arc'", "text", "d'Arc");
-    row("'\U0001F3B5 Cafe\u0301'", "text", "\U0001F3B5 Caf\u00e9");
-    row("NUL", u"'a\0b'"_s, "text", u"a\0b"_s);
-    row("long", u'\'' + QString(3 << 20, u'\u00e9') + u'\'', "text", QString(3 << 20, u'\u00e9'));
-}
+    Q_OBJECT
 
-void tst_Connection::keepsValues()
-{
-    QFETCH(QString, literal);
-    TestCatalogue catalogue;
-    catalogue.exec("create table loose(v)");
-    gConnection->Execute(u"insert into loose values ("_s + literal + u')');
-    QTEST(single(u"select typeof(v) from loose"_s).toText(), "type");
-    const Value v = single(u"select v from loose"_s);
-    QTEST(v.toText(), "text");
-    QCOMPARE(v.isNull(), literal == u"NULL");
-}
-
-void tst_Connection::findsText_data()
-{
-    const DataRows<QString, QString, bool> row("stored", "asked", "found");
-    row("case", "Björk", "BJÖRK", true);
-    row("greek case", "Βαγγέλης", "ΒΑΓΓΈΛΗΣ", true);
-    row("accent", "Édith", "Edith", false);
-    row("decomposed", "Édith", "E\u0301dith", true);
-    row("blank behind", "Abba", "Abba ", false);
-    row("apostrophe", "d''Arc", "D''ARC", true);
-    row("digits are a text", "10", "10.0", false);
-}
-
-void tst_Connection::findsText()
-{
-    QFETCH(QString, stored);
-    QFETCH(QString, asked);
-    TestCatalogue catalogue;
-    addArtist(1, stored.toUtf8().constData());
-    QTEST(single(u"Select count(*) From Artiesten where Naam = '"_s + asked + u'\'').toLong() == 1,
-          "found");
-}
-
-// One prepared statement, other values: nothing of the earlier run may be left in it.
-void tst_Connection::bindsAgain()
-{
-    TestCatalogue catalogue;
-    addArtist(1, "Abba");
-    addArtist(2, "");
-    addArtist(3, "Zz Top");
-    for (const auto &[pattern, ids] :
-         {std::pair("A%", "1"), {"%", "1,2,3"}, {"%", "1,2,3"}, {"_z%", "3"}})
-        QCOMPARE(single(u"select group_concat(ID) from artiesten where naam like '"_s +
-                        QLatin1String(pattern) + u'\'')
-                     .toText(),
-                 QLatin1String(ids));
-    for (int distinct = 0; distinct < 500; ++distinct) // more than are kept
-        QCOMPARE(single(u"select 1 as c%1"_s.arg(distinct)).toLong(), 1);
-}
-
-void tst_Connection::commitsAndRollsBack()
-{
-    TestCatalogue catalogue;
-    gConnection->RollbackTrans(); // none open: nothing
+private slots:
+    void keepsValues_data()
     {
-        Transaction t(*gConnection);
-        addArtist(1);
-        t.CommitTrans();
-        QCOMPARE(numberOf([&] { t.CommitTrans(); }), int(errNotPermitted));
+        const DataRows<QString, QString, QString> row("literal", "type", "text");
+        row("'1e10'", "text", "1e10");
+        row("1e10", "real", "10000000000");
+        row("'007'", "text", "007");
+        row("-9223372036854775807", "integer", "-9223372036854775807");
+        row("1.5", "real", "1.5");
+        row("''", "text", "");
+        row("NULL", "null", "");
+        row("'d''Arc'", "text", "d'Arc");
+        row("'\U0001F3B5 Cafe\u0301'", "text", "\U0001F3B5 Caf\u00e9");
+        row("NUL", u"'a\0b'"_s, "text", u"a\0b"_s);
+        row("long", u'\'' + QString(3 << 20, u'\u00e9') + u'\'', "text",
+            QString(3 << 20, u'\u00e9'));
     }
-    {
-        Transaction t(*gConnection);
-        addArtist(2);
-        t.RollbackTrans();
-        t.RollbackTrans();
-        addArtist(3); // outside, counts at once
-    }
-    QCOMPARE(catalogue.rows("select id from artiesten"), texts("1", "3"));
-}
 
-void tst_Connection::joinedRoutineTakesBackItsOwn()
-{
-    TestCatalogue catalogue;
-    Transaction outer(*gConnection);
-    addArtist(1);
+    void keepsValues()
     {
-        Transaction inner(*gConnection);
-        addArtist(2);
-        {
-            Transaction innermost(*gConnection);
-            addArtist(3);
-            innermost.CommitTrans();
-        }
-        inner.RollbackTrans();
-    }
-    {
-        Transaction inner(*gConnection);
-        addArtist(4);
-        inner.CommitTrans();
-    }
-    {
-        Transaction left(*gConnection); // ends without a word: its changes go, the others stay
-        addArtist(5);
-    }
-    QCOMPARE(catalogue.count("select count(*) from artiesten"), 0);
-    outer.CommitTrans();
-    QCOMPARE(catalogue.rows("select id from artiesten"), texts("1", "4"));
-}
-
-void tst_Connection::abandonedTransaction()
-{
-    for (const bool begins : {false, true}) {
+        QFETCH(QString, literal);
         TestCatalogue catalogue;
+        catalogue.exec("create table loose(v)");
+        gConnection->Execute(u"insert into loose values ("_s + literal + u')');
+        QTEST(single(u"select typeof(v) from loose"_s).toText(), "type");
+        const Value v = single(u"select v from loose"_s);
+        QTEST(v.toText(), "text");
+        QCOMPARE(v.isNull(), literal == u"NULL");
+    }
+
+    void findsText_data()
+    {
+        const DataRows<QString, QString, bool> row("stored", "asked", "found");
+        row("case", "Björk", "BJÖRK", true);
+        row("greek case", "Βαγγέλης", "ΒΑΓΓΈΛΗΣ", true);
+        row("accent", "Édith", "Edith", false);
+        row("decomposed", "Édith", "E\u0301dith", true);
+        row("blank behind", "Abba", "Abba ", false);
+        row("apostrophe", "d''Arc", "D''ARC", true);
+        row("digits are a text", "10", "10.0", false);
+    }
+
+    void findsText()
+    {
+        QFETCH(QString, stored);
+        QFETCH(QString, asked);
+        TestCatalogue catalogue;
+        addArtist(1, stored.toUtf8().constData());
+        QTEST(single(u"Select count(*) From Artiesten where Naam = '"_s + asked + u'\'').toLong() ==
+                  1,
+              "found");
+    }
+
+    // One prepared statement, other values: nothing of the earlier run may be left in it.
+    void bindsAgain()
+    {
+        TestCatalogue catalogue;
+        addArtist(1, "Abba");
+        addArtist(2, "");
+        addArtist(3, "Zz Top");
+        for (const auto &[pattern, ids] :
+             {std::pair("A%", "1"), {"%", "1,2,3"}, {"%", "1,2,3"}, {"_z%", "3"}})
+            QCOMPARE(single(u"select group_concat(ID) from artiesten where naam like '"_s +
+                            QLatin1String(pattern) + u'\'')
+                         .toText(),
+                     QLatin1String(ids));
+        for (int distinct = 0; distinct < 500; ++distinct) // more than are kept
+            QCOMPARE(single(u"select 1 as c%1"_s.arg(distinct)).toLong(), 1);
+    }
+
+    void commitsAndRollsBack()
+    {
+        TestCatalogue catalogue;
+        gConnection->RollbackTrans(); // none open: nothing
         {
-            Transaction half(*gConnection);
+            Transaction t(*gConnection);
             addArtist(1);
+            t.CommitTrans();
+            QCOMPARE(numberOf([&] { t.CommitTrans(); }), int(errNotPermitted));
         }
-        QCOMPARE(artists(), 1); // still open, and seen by who reads
-        QCOMPARE(catalogue.count("select count(*) from artiesten"), 0);
-        if (begins) {
+        {
             Transaction t(*gConnection);
             addArtist(2);
-            t.CommitTrans();
-        } else {
-            addArtist(2);
+            t.RollbackTrans();
+            t.RollbackTrans();
+            addArtist(3); // outside, counts at once
         }
-        QCOMPARE(catalogue.rows("select id from artiesten"), texts("2"));
+        QCOMPARE(catalogue.rows("select id from artiesten"), texts("1", "3"));
     }
-}
 
-void tst_Connection::handlerInsideARunningRoutine()
-{
-    TestCatalogue catalogue;
-    Transaction outer(*gConnection);
-    addArtist(1);
-    try {
-        Transaction inner(*gConnection);
-        addArtist(2);
-        addArtist(2); // the key is taken
-        QFAIL("no error");
-    } catch (const Error &error) {
-        QCOMPARE(error.Number, int(errConstraint));
-        gConnection->RollbackTrans(); // must leave the outer routine's share alone
-    }
-    outer.CommitTrans();
-    QCOMPARE(catalogue.rows("select id from artiesten"), texts("1"));
-}
-
-void tst_Connection::failedCommit()
-{
-    TestCatalogue catalogue;
-    OtherProgram reader(catalogue.file());
-    QCOMPARE(reader.run("begin; select * from artiesten"), SQLITE_OK);
-    try {
-        Transaction t(*gConnection);
-        addArtist(1);
-        t.CommitTrans(); // the reader keeps it from the file
-        QFAIL("no error");
-    } catch (const Error &error) {
-        QCOMPARE(error.Number, int(errCannotUse));
-        gConnection->RollbackTrans();
-    }
-    QCOMPARE(artists(), 0);
-    QCOMPARE(reader.run("commit"), SQLITE_OK);
-    addArtist(2);
-    QCOMPARE(catalogue.count("select max(id) from artiesten"), 2);
-}
-
-// A row further on would be an error: it must not be reached.
-void tst_Connection::firstRowsReadsNoMore()
-{
-    TestCatalogue catalogue;
-    for (const int id : {1, 2, 3})
-        addArtist(id);
-    const QString query =
-        u"select iif(ID < 3, ID, abs(-9223372036854775807 - 1)) as n from Artiesten order by ID"_s;
-    QCOMPARE(gConnection->firstRows(query, 2).RecordCount(), 2);
-    QVERIFY(numberOf([&] { gConnection->firstRows(query, 5); }) != 0);
-    QCOMPARE(gConnection->firstRows(u"select ID from Tracks"_s, 2).RecordCount(), 0);
-}
-
-// As it does when the disk is full. What the routine still writes must not count, not even if it
-// takes no notice of the failure.
-void tst_Connection::engineRollsBackByItself()
-{
-    TestCatalogue catalogue;
-    catalogue.exec("create trigger full before insert on artiesten when new.id=2 "
-                   "begin select raise(rollback,'full'); end");
+    void joinedRoutineTakesBackItsOwn()
     {
+        TestCatalogue catalogue;
         Transaction outer(*gConnection);
         addArtist(1);
         {
             Transaction inner(*gConnection);
-            QCOMPARE(numberOf([] { addArtist(2); }), int(errConstraint));
+            addArtist(2);
+            {
+                Transaction innermost(*gConnection);
+                addArtist(3);
+                innermost.CommitTrans();
+            }
+            inner.RollbackTrans();
         }
-        QCOMPARE(numberOf([] { addArtist(3); }), int(errNotPermitted));
-        QCOMPARE(numberOf([] { Transaction late(*gConnection); }), int(errNotPermitted));
-        QCOMPARE(numberOf([&] { outer.CommitTrans(); }), int(errNotPermitted));
+        {
+            Transaction inner(*gConnection);
+            addArtist(4);
+            inner.CommitTrans();
+        }
+        {
+            Transaction left(*gConnection); // ends without a word: its changes go, the others stay
+            addArtist(5);
+        }
+        QCOMPARE(catalogue.count("select count(*) from artiesten"), 0);
+        outer.CommitTrans();
+        QCOMPARE(catalogue.rows("select id from artiesten"), texts("1", "4"));
     }
-    gConnection->RollbackTrans();
-    QCOMPARE(artists(), 0);
-    addArtist(4);
-    QCOMPARE(catalogue.count("select count(*) from artiesten"), 1);
-}
 
-void tst_Connection::lockedByAnotherProgram()
-{
-    TestCatalogue catalogue;
-    OtherProgram other(catalogue.file());
-    QCOMPARE(other.run("begin exclusive"), SQLITE_OK);
-    QElapsedTimer clock;
-    clock.start();
-    try {
+    void abandonedTransaction()
+    {
+        for (const bool begins : {false, true}) {
+            TestCatalogue catalogue;
+            {
+                Transaction half(*gConnection);
+                addArtist(1);
+            }
+            QCOMPARE(artists(), 1); // still open, and seen by who reads
+            QCOMPARE(catalogue.count("select count(*) from artiesten"), 0);
+            if (begins) {
+                Transaction t(*gConnection);
+                addArtist(2);
+                t.CommitTrans();
+            } else {
+                addArtist(2);
+            }
+            QCOMPARE(catalogue.rows("select id from artiesten"), texts("2"));
+        }
+    }
+
+    void handlerInsideARunningRoutine()
+    {
+        TestCatalogue catalogue;
+        Transaction outer(*gConnection);
         addArtist(1);
-        QFAIL("no error");
-    } catch (const Error &error) {
-        QCOMPARE(error.Number, int(errCannotUse));
-        QVERIFY(error.Description.contains(QLatin1String("in use by another program")));
+        try {
+            Transaction inner(*gConnection);
+            addArtist(2);
+            addArtist(2); // the key is taken
+            QFAIL("no error");
+        } catch (const Error &error) {
+            QCOMPARE(error.Number, int(errConstraint));
+            gConnection->RollbackTrans(); // must leave the outer routine's share alone
+        }
+        outer.CommitTrans();
+        QCOMPARE(catalogue.rows("select id from artiesten"), texts("1"));
     }
-    QVERIFY(clock.elapsed() < 5000);
-    QCOMPARE(other.run("commit"), SQLITE_OK);
-    addArtist(1);
-}
 
-void tst_Connection::opensWhatIsNamed()
-{
-    const auto source = [](const char *text) {
-        return Connection::dataSource(QString::fromUtf8(text));
-    };
-    QCOMPARE(source("Provider=x;Data Source=/a/b c.orv; "), u"/a/b c.orv"_s);
-    QCOMPARE(source("data source=/a;b; c.orv; "), u"/a;b; c.orv"_s);
-    QCOMPARE(source("Provider=x"), QString());
+    void failedCommit()
+    {
+        TestCatalogue catalogue;
+        OtherProgram reader(catalogue.file());
+        QCOMPARE(reader.run("begin; select * from artiesten"), SQLITE_OK);
+        try {
+            Transaction t(*gConnection);
+            addArtist(1);
+            t.CommitTrans(); // the reader keeps it from the file
+            QFAIL("no error");
+        } catch (const Error &error) {
+            QCOMPARE(error.Number, int(errCannotUse));
+            gConnection->RollbackTrans();
+        }
+        QCOMPARE(artists(), 0);
+        QCOMPARE(reader.run("commit"), SQLITE_OK);
+        addArtist(2);
+        QCOMPARE(catalogue.count("select max(id) from artiesten"), 2);
+    }
 
-    TestCatalogue catalogue;
-    Connection connection;
-    connection.Mode = adModeReadWrite;
-    connection.ConnectionString = u"Data Source="_s + catalogue.path("none.orv") + u"; "_s;
-    QCOMPARE(numberOf([&] { connection.Open(); }), int(errCannotUse));
-    QCOMPARE(connection.State(), adStateClosed);
-    QVERIFY(!QFile::exists(catalogue.path("none.orv"))); // never made
-}
+    // A row further on would be an error: it must not be reached.
+    void firstRowsReadsNoMore()
+    {
+        TestCatalogue catalogue;
+        for (const int id : {1, 2, 3})
+            addArtist(id);
+        const QString query =
+            u"select iif(ID < 3, ID, abs(-9223372036854775807 - 1)) as n from Artiesten order by ID"_s;
+        QCOMPARE(gConnection->firstRows(query, 2).RecordCount(), 2);
+        QVERIFY(numberOf([&] { gConnection->firstRows(query, 5); }) != 0);
+        QCOMPARE(gConnection->firstRows(u"select ID from Tracks"_s, 2).RecordCount(), 0);
+    }
 
-// Counts the engine's own steps: they must not grow with the table.
-void tst_Connection::nextIdReadsAnIndex()
-{
-    TestCatalogue catalogue;
-    catalogue.exec("with recursive n(i) as (select 1 union all select i+1 from n where i<2000) "
-                   "insert into tracks select i,1,'t','g',1985 from n");
-    Dialect dialect;
-    dialect.translate(u"select max(id+1) as ID from tracks"_s);
-    const OtherProgram other(catalogue.file());
-    sqlite3_stmt *s = nullptr;
-    QCOMPARE(sqlite3_prepare_v2(other.db, dialect.sql().c_str(), -1, &s, nullptr), SQLITE_OK);
-    sqlite3_bind_int64(s, 1, dialect.literals().at(0).integer);
-    QCOMPARE(sqlite3_step(s), SQLITE_ROW);
-    QCOMPARE(sqlite3_column_int(s, 0), 2001);
-    const int steps = sqlite3_stmt_status(s, SQLITE_STMTSTATUS_VM_STEP, 0);
-    sqlite3_finalize(s);
-    QVERIFY2(steps < 50, qPrintable(QString::number(steps)));
-}
+    // As it does when the disk is full. What the routine still writes must not count, not even if
+    // it takes no notice of the failure.
+    void engineRollsBackByItself()
+    {
+        TestCatalogue catalogue;
+        catalogue.exec("create trigger full before insert on artiesten when new.id=2 "
+                       "begin select raise(rollback,'full'); end");
+        {
+            Transaction outer(*gConnection);
+            addArtist(1);
+            {
+                Transaction inner(*gConnection);
+                QCOMPARE(numberOf([] { addArtist(2); }), int(errConstraint));
+            }
+            QCOMPARE(numberOf([] { addArtist(3); }), int(errNotPermitted));
+            QCOMPARE(numberOf([] { Transaction late(*gConnection); }), int(errNotPermitted));
+            QCOMPARE(numberOf([&] { outer.CommitTrans(); }), int(errNotPermitted));
+        }
+        gConnection->RollbackTrans();
+        QCOMPARE(artists(), 0);
+        addArtist(4);
+        QCOMPARE(catalogue.count("select count(*) from artiesten"), 1);
+    }
+
+    void lockedByAnotherProgram()
+    {
+        TestCatalogue catalogue;
+        OtherProgram other(catalogue.file());
+        QCOMPARE(other.run("begin exclusive"), SQLITE_OK);
+        QElapsedTimer clock;
+        clock.start();
+        try {
+            addArtist(1);
+            QFAIL("no error");
+        } catch (const Error &error) {
+            QCOMPARE(error.Number, int(errCannotUse));
+            QVERIFY(error.Description.contains(QLatin1String("in use by another program")));
+        }
+        QVERIFY(clock.elapsed() < 5000);
+        QCOMPARE(other.run("commit"), SQLITE_OK);
+        addArtist(1);
+    }
+
+    void opensWhatIsNamed()
+    {
+        const auto source = [](const char *text) {
+            return Connection::dataSource(QString::fromUtf8(text));
+        };
+        QCOMPARE(source("Provider=x;Data Source=/a/b c.orv; "), u"/a/b c.orv"_s);
+        QCOMPARE(source("data source=/a;b; c.orv; "), u"/a;b; c.orv"_s);
+        QCOMPARE(source("Provider=x"), QString());
+
+        TestCatalogue catalogue;
+        Connection connection;
+        connection.Mode = adModeReadWrite;
+        connection.ConnectionString = u"Data Source="_s + catalogue.path("none.orv") + u"; "_s;
+        QCOMPARE(numberOf([&] { connection.Open(); }), int(errCannotUse));
+        QCOMPARE(connection.State(), adStateClosed);
+        QVERIFY(!QFile::exists(catalogue.path("none.orv"))); // never made
+    }
+
+    // Counts the engine's own steps: they must not grow with the table.
+    void nextIdReadsAnIndex()
+    {
+        TestCatalogue catalogue;
+        catalogue.exec("with recursive n(i) as (select 1 union all select i+1 from n where i<2000) "
+                       "insert into tracks select i,1,'t','g',1985 from n");
+        Dialect dialect;
+        dialect.translate(u"select max(id+1) as ID from tracks"_s);
+        const OtherProgram other(catalogue.file());
+        sqlite3_stmt *s = nullptr;
+        QCOMPARE(sqlite3_prepare_v2(other.db, dialect.sql().c_str(), -1, &s, nullptr), SQLITE_OK);
+        sqlite3_bind_int64(s, 1, dialect.literals().at(0).integer);
+        QCOMPARE(sqlite3_step(s), SQLITE_ROW);
+        QCOMPARE(sqlite3_column_int(s, 0), 2001);
+        const int steps = sqlite3_stmt_status(s, SQLITE_STMTSTATUS_VM_STEP, 0);
+        sqlite3_finalize(s);
+        QVERIFY2(steps < 50, qPrintable(QString::number(steps)));
+    }
+};
 
 QTEST_GUILESS_MAIN(tst_Connection)
 #include "tst_Connection.moc"

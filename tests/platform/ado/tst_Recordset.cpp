@@ -6,21 +6,6 @@
 
 using namespace ADODB;
 
-/// Recordsets without a connection, the rows behind them and their values.
-class tst_Recordset : public QObject
-{
-    Q_OBJECT
-
-private slots:
-    void moves();
-    void deletes();
-    void handedOutRowsNeverChange();
-    void keepsNumbers();
-    void keepsTexts();
-    void clonesBothWrite();
-    void toLong();
-};
-
 namespace
 {
 
@@ -61,132 +46,140 @@ std::shared_ptr<Rows> oneColumn()
 
 } // namespace
 
-void tst_Recordset::moves()
+/// Recordsets without a connection, the rows behind them and their values.
+class tst_Recordset : public QObject
 {
-    Recordset rs = letters("abc");
-    QCOMPARE(rs.RecordCount(), 3);
-    QCOMPARE(at(rs), u"c"_s); // AddNew goes there
-    rs.MoveFirst();
-    rs.MovePrevious();
-    QCOMPARE(at(rs), u"bof"_s);
-    QCOMPARE(numberOf([&] { rs.MovePrevious(); }), int(errNoCurrentRecord));
-    QCOMPARE(numberOf([&] { rs.Fields(0).Value(); }), int(errNoCurrentRecord));
-    rs.MoveNext();
-    QCOMPARE(at(rs), u"a"_s);
-    rs.MoveLast();
-    rs.MoveNext();
-    QCOMPARE(at(rs), u"eof"_s);
-    QCOMPARE(numberOf([&] { rs.MoveNext(); }), int(errNoCurrentRecord));
-    rs.MovePrevious();
-    QCOMPARE(at(rs), u"c"_s);
+    Q_OBJECT
 
-    Recordset none = letters("");
-    for (auto move : {&Recordset::MoveFirst, &Recordset::MoveLast, &Recordset::MoveNext,
-                      &Recordset::MovePrevious, &Recordset::Delete})
-        QCOMPARE(numberOf([&] { (none.*move)(); }), int(errNoCurrentRecord));
-    QCOMPARE(at(none), u"empty"_s);
-}
+private slots:
+    void moves()
+    {
+        Recordset rs = letters("abc");
+        QCOMPARE(rs.RecordCount(), 3);
+        QCOMPARE(at(rs), u"c"_s); // AddNew goes there
+        rs.MoveFirst();
+        rs.MovePrevious();
+        QCOMPARE(at(rs), u"bof"_s);
+        QCOMPARE(numberOf([&] { rs.MovePrevious(); }), int(errNoCurrentRecord));
+        QCOMPARE(numberOf([&] { rs.Fields(0).Value(); }), int(errNoCurrentRecord));
+        rs.MoveNext();
+        QCOMPARE(at(rs), u"a"_s);
+        rs.MoveLast();
+        rs.MoveNext();
+        QCOMPARE(at(rs), u"eof"_s);
+        QCOMPARE(numberOf([&] { rs.MoveNext(); }), int(errNoCurrentRecord));
+        rs.MovePrevious();
+        QCOMPARE(at(rs), u"c"_s);
 
-void tst_Recordset::deletes()
-{
-    const char *const around[] = {"bof b", "a c", "b eof"}; // before and behind each of "abc"
-    for (int deleted = 0; deleted < 3; ++deleted) {
-        for (const bool forward : {true, false}) {
-            Recordset rs = letters("abc");
-            rs.MoveFirst();
-            for (int i = 0; i < deleted; ++i)
-                rs.MoveNext();
-            rs.Delete();
-            QCOMPARE(rs.RecordCount(), 2);
-            QCOMPARE(at(rs), u"none"_s); // stays there, neither end
-            QCOMPARE(numberOf([&] { rs.Delete(); }), int(errNoCurrentRecord));
-            forward ? rs.MoveNext() : rs.MovePrevious();
-            QCOMPARE(at(rs), QString::fromLatin1(around[deleted]).section(u' ', forward, forward));
+        Recordset none = letters("");
+        for (auto move : {&Recordset::MoveFirst, &Recordset::MoveLast, &Recordset::MoveNext,
+                          &Recordset::MovePrevious, &Recordset::Delete})
+            QCOMPARE(numberOf([&] { (none.*move)(); }), int(errNoCurrentRecord));
+        QCOMPARE(at(none), u"empty"_s);
+    }
+
+    void deletes()
+    {
+        const char *const around[] = {"bof b", "a c", "b eof"}; // before and behind each of "abc"
+        for (int deleted = 0; deleted < 3; ++deleted) {
+            for (const bool forward : {true, false}) {
+                Recordset rs = letters("abc");
+                rs.MoveFirst();
+                for (int i = 0; i < deleted; ++i)
+                    rs.MoveNext();
+                rs.Delete();
+                QCOMPARE(rs.RecordCount(), 2);
+                QCOMPARE(at(rs), u"none"_s); // stays there, neither end
+                QCOMPARE(numberOf([&] { rs.Delete(); }), int(errNoCurrentRecord));
+                forward ? rs.MoveNext() : rs.MovePrevious();
+                QCOMPARE(at(rs),
+                         QString::fromLatin1(around[deleted]).section(u' ', forward, forward));
+            }
         }
     }
-}
 
-void tst_Recordset::handedOutRowsNeverChange()
-{
-    Recordset rs = letters("abc");
-    const auto before = rs.rows();
-    rs.MoveFirst();
-    rs.Fields(1).setValue(u"changed"_s);
-    rs.MoveNext();
-    rs.Delete();
-    rs.AddNew();
-    QCOMPARE(before->rowCount(), 3);
-    QCOMPARE(before->text(0, 1), u"a"_s);
-    QCOMPARE(before->text(1, 1), u"b"_s);
-    rs.Close();
-    QCOMPARE(before->text(2, 1), u"c"_s);
-}
-
-void tst_Recordset::keepsNumbers()
-{
-    const auto rows = oneColumn();
-    rows->addRow();
-    const qint64 edge = qint64(1) << 61;
-    for (const qint64 number :
-         {qint64(-1), edge - 1, edge, -edge, -edge - 1, std::numeric_limits<qint64>::min()}) {
-        rows->setInteger(0, 0, number);
-        QCOMPARE(rows->kind(0, 0), Rows::Kind::Integer);
-        QCOMPARE(rows->value(0, 0), Value(number));
-        rows->setReal(0, 0, double(number) + 0.5);
-        QCOMPARE(rows->kind(0, 0), Rows::Kind::Real);
-        QCOMPARE(rows->value(0, 0), Value(double(number) + 0.5));
+    void handedOutRowsNeverChange()
+    {
+        Recordset rs = letters("abc");
+        const auto before = rs.rows();
+        rs.MoveFirst();
+        rs.Fields(1).setValue(u"changed"_s);
+        rs.MoveNext();
+        rs.Delete();
+        rs.AddNew();
+        QCOMPARE(before->rowCount(), 3);
+        QCOMPARE(before->text(0, 1), u"a"_s);
+        QCOMPARE(before->text(1, 1), u"b"_s);
+        rs.Close();
+        QCOMPARE(before->text(2, 1), u"c"_s);
     }
-}
 
-void tst_Recordset::keepsTexts()
-{
-    const auto rows = oneColumn();
-    QStringList texts{QString(), u"a"_s, QString(3 << 20, u'x'), u"\uFEFF\uFEFFx"_s, u"a\0b"_s};
-    for (int i = 0; i < 3000; ++i) // over the end of a chunk, more than once
-        texts.append(QString(1000, QChar(char16_t(u'a' + i % 26))));
-    for (const QString &text : texts)
-        rows->setValue(rows->addRow(), 0, text);
-    rows->addRow();
-    for (int i = 0; i < texts.size(); ++i) {
-        QCOMPARE(rows->kind(i, 0), Rows::Kind::Text); // the empty text is not NULL
-        QCOMPARE(rows->text(i, 0), texts[i]);
+    void keepsNumbers()
+    {
+        const auto rows = oneColumn();
+        rows->addRow();
+        const qint64 edge = qint64(1) << 61;
+        for (const qint64 number :
+             {qint64(-1), edge - 1, edge, -edge, -edge - 1, std::numeric_limits<qint64>::min()}) {
+            rows->setInteger(0, 0, number);
+            QCOMPARE(rows->kind(0, 0), Rows::Kind::Integer);
+            QCOMPARE(rows->value(0, 0), Value(number));
+            rows->setReal(0, 0, double(number) + 0.5);
+            QCOMPARE(rows->kind(0, 0), Rows::Kind::Real);
+            QCOMPARE(rows->value(0, 0), Value(double(number) + 0.5));
+        }
     }
-    QCOMPARE(rows->kind(texts.size(), 0), Rows::Kind::Null);
-    rows->removeRow(0);
-    QCOMPARE(rows->rowCount(), texts.size());
-    QCOMPARE(rows->text(0, 0), u"a"_s);
-}
 
-void tst_Recordset::clonesBothWrite()
-{
-    const auto first = oneColumn();
-    first->setUtf8(first->addRow(), 0, "shared");
-    const auto second = first->clone();
-    for (int i = 0; i < 5000; ++i) {
-        first->setUtf8(first->addRow(), 0, "first" + std::to_string(i));
-        second->setUtf8(second->addRow(), 0, "second" + std::to_string(i));
+    void keepsTexts()
+    {
+        const auto rows = oneColumn();
+        QStringList texts{QString(), u"a"_s, QString(3 << 20, u'x'), u"\uFEFF\uFEFFx"_s, u"a\0b"_s};
+        for (int i = 0; i < 3000; ++i) // over the end of a chunk, more than once
+            texts.append(QString(1000, QChar(char16_t(u'a' + i % 26))));
+        for (const QString &text : texts)
+            rows->setValue(rows->addRow(), 0, text);
+        rows->addRow();
+        for (int i = 0; i < texts.size(); ++i) {
+            QCOMPARE(rows->kind(i, 0), Rows::Kind::Text); // the empty text is not NULL
+            QCOMPARE(rows->text(i, 0), texts[i]);
+        }
+        QCOMPARE(rows->kind(texts.size(), 0), Rows::Kind::Null);
+        rows->removeRow(0);
+        QCOMPARE(rows->rowCount(), texts.size());
+        QCOMPARE(rows->text(0, 0), u"a"_s);
     }
-    for (int i = 0; i < 5000; ++i) {
-        QCOMPARE(first->utf8(i + 1, 0), "first" + std::to_string(i));
-        QCOMPARE(second->utf8(i + 1, 0), "second" + std::to_string(i));
-    }
-    QCOMPARE(first->text(0, 0), u"shared"_s);
-}
 
-void tst_Recordset::toLong()
-{
-    const auto as = [](const char *text) { return Value(QString::fromLatin1(text)).toLong(); };
-    QCOMPARE(as(" +7 "), 7);
-    QCOMPARE(as("1e3"), 1000);
-    QCOMPARE(as("1.5"), 2);
-    QCOMPARE(as("2.5"), 2); // to the even one
-    QCOMPARE(as("9223372036854775807"), std::numeric_limits<qint64>::max());
-    QCOMPARE(numberOf([&] { as("9223372036854775808"); }), int(errOverflow));
-    for (const char *no : {"", "12a", "0x10"})
-        QCOMPARE(numberOf([&] { as(no); }), int(errTypeMismatch));
-    QCOMPARE(numberOf([] { Value().toLong(); }), int(errTypeMismatch));
-    QCOMPARE(Value(1985.0).toText(), u"1985"_s);
-}
+    void clonesBothWrite()
+    {
+        const auto first = oneColumn();
+        first->setUtf8(first->addRow(), 0, "shared");
+        const auto second = first->clone();
+        for (int i = 0; i < 5000; ++i) {
+            first->setUtf8(first->addRow(), 0, "first" + std::to_string(i));
+            second->setUtf8(second->addRow(), 0, "second" + std::to_string(i));
+        }
+        for (int i = 0; i < 5000; ++i) {
+            QCOMPARE(first->utf8(i + 1, 0), "first" + std::to_string(i));
+            QCOMPARE(second->utf8(i + 1, 0), "second" + std::to_string(i));
+        }
+        QCOMPARE(first->text(0, 0), u"shared"_s);
+    }
+
+    void toLong()
+    {
+        const auto as = [](const char *text) { return Value(QString::fromLatin1(text)).toLong(); };
+        QCOMPARE(as(" +7 "), 7);
+        QCOMPARE(as("1e3"), 1000);
+        QCOMPARE(as("1.5"), 2);
+        QCOMPARE(as("2.5"), 2); // to the even one
+        QCOMPARE(as("9223372036854775807"), std::numeric_limits<qint64>::max());
+        QCOMPARE(numberOf([&] { as("9223372036854775808"); }), int(errOverflow));
+        for (const char *no : {"", "12a", "0x10"})
+            QCOMPARE(numberOf([&] { as(no); }), int(errTypeMismatch));
+        QCOMPARE(numberOf([] { Value().toLong(); }), int(errTypeMismatch));
+        QCOMPARE(Value(1985.0).toText(), u"1985"_s);
+    }
+};
 
 QTEST_APPLESS_MAIN(tst_Recordset)
 #include "tst_Recordset.moc"

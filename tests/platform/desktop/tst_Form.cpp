@@ -11,29 +11,6 @@
 #include <QTimer>
 #include <QVBoxLayout>
 
-/// The life of a screen, its two buttons, the freeze of drawing, and the desktop of a real session.
-class tst_Form : public QObject
-{
-    Q_OBJECT
-
-private slots:
-    void init();
-    void cleanup();
-    void loadsOnceAndGoes();
-    void reloadsOnTheSpot();
-    void unloadsWhileLoading();
-    void hostedOnesAreBroughtUp();
-    void buttonsOfEnterAndEsc_data();
-    void buttonsOfEnterAndEsc();
-    void freezeEndsWithTheRoutine();
-    void freezeStaysUnderAModalScreen();
-    void freezesAreNotCounted();
-    void questionOnlyItsButtonsAnswer();
-
-private:
-    std::unique_ptr<ScriptedDesktop> mDesktop;
-};
-
 namespace
 {
 
@@ -92,199 +69,209 @@ template <typename Piece> void inMainLoop(Piece piece)
 
 } // namespace
 
-void tst_Form::init()
+/// The life of a screen, its two buttons, the freeze of drawing, and the desktop of a real session.
+class tst_Form : public QObject
 {
-    mDesktop = std::make_unique<ScriptedDesktop>();
-    TestForm::log.clear();
-}
+    Q_OBJECT
 
-void tst_Form::cleanup()
-{
-    mDesktop->verifyAllCame();
-    const auto forms = Form::openForms();
-    qDeleteAll(forms);
-    QVERIFY(Form::openForms().isEmpty());
-}
+private:
+    std::unique_ptr<ScriptedDesktop> mDesktop;
 
-void tst_Form::loadsOnceAndGoes()
-{
-    QPointer<TestForm> form = new TestForm;
-    QCOMPARE(Form::openForms(), QList<Form *>{form});
-    form->Load();
-    QVERIFY(!form->isVisible());
-    form->Show();
-    form->Show();
-    form->stays = true;
-    QVERIFY(!form->close());
-    QVERIFY(form->isVisible() && !form->isUnloaded());
-    form->stays = false;
-    QVERIFY(form->Unload());
-    QVERIFY(form->Unload()); // gone already, and no second time
-    QVERIFY(Form::openForms().isEmpty());
-    QVERIFY(form && form->isUnloaded() && !form->isVisible());
-    inMainLoop([] {});
-    QTRY_VERIFY(!form);
-    QCOMPARE(TestForm::log.remove(u"activate "_s), u"load query query unload unloaded "_s);
-}
-
-void tst_Form::reloadsOnTheSpot()
-{
-    QPointer<TestForm> form = new TestForm;
-    form->Show();
-    form->activateWindow();
-    QVERIFY(QTest::qWaitForWindowActive(form));
-    form->text.setFocus();
-    TestForm::log.clear();
-    QVERIFY(form->Reload());
-    QCOMPARE(TestForm::log, u"query unload load "_s);
-    QVERIFY(form->isVisible() && !form->isUnloaded() && form->text.hasFocus());
-    form->stays = true;
-    QVERIFY(!form->Reload());
-    QVERIFY(form->text.hasFocus());
-    form->stays = false;
-    form->leavesAtLoad = true;
-    QVERIFY(!form->Reload());
-    QVERIFY(form->isUnloaded());
-}
-
-// A modal one must not wait for an end that has been.
-void tst_Form::unloadsWhileLoading()
-{
-    for (const bool modal : {false, true}) {
-        auto *form = new TestForm;
-        form->leavesAtLoad = true;
-        modal ? form->ShowModal() : form->Show();
-        QVERIFY(form->isUnloaded() && !form->isVisible());
-    }
-}
-
-void tst_Form::hostedOnesAreBroughtUp()
-{
-    struct Host : Form::Host {
-        void adopt(Form *form) override
-        {
-            TestForm::log += u"adopt "_s;
-            form->show();
-        }
-        void bringUp(Form *) override { TestForm::log += u"up "_s; }
-        QPoint origin() const override { return {100, 50}; }
-    } host;
-    Form::setHost(&host);
-    TestForm form;
-    form.Show();
-    form.Show();
-    QCOMPARE(TestForm::log.remove(u"activate "_s), u"load adopt up "_s);
-    auto *modal = new TestForm;
-    modal->setPlace({10, 20});
-    QPoint place;
-    mDesktop->expectModal(u"frmTest"_s, [&](Form &f) {
-        place = f.pos();
-        f.Unload();
-    });
-    modal->ShowModal();
-    Form::setHost(nullptr);
-    QCOMPARE(place, QPoint(110, 70));
-}
-
-void tst_Form::buttonsOfEnterAndEsc_data()
-{
-    const DataRows<QString, int, bool, QString> row("focus", "key", "enabled", "clicked");
-    row("Enter in a field", "text", Qt::Key_Return, true, "ok ");
-    row("the other Enter", "text", Qt::Key_Enter, true, "ok ");
-    row("Esc in a field", "text", Qt::Key_Escape, true, "cancel ");
-    row("Enter on another button", "other", Qt::Key_Return, true, "other ");
-    row("Enter on the default button", "ok", Qt::Key_Return, true, "ok ");
-    row("Enter, disabled", "text", Qt::Key_Return, false, "");
-    row("Esc, disabled", "text", Qt::Key_Escape, false, "");
-}
-
-void tst_Form::buttonsOfEnterAndEsc()
-{
-    QFETCH(QString, focus);
-    QFETCH(int, key);
-    QFETCH(bool, enabled);
-    TestForm form;
-    form.ok.setEnabled(enabled);
-    form.cancel.setEnabled(enabled);
-    form.Show();
-    QWidget *at = &form.text;
-    if (focus != QLatin1String("text"))
-        at = focus == QLatin1String("ok") ? &form.ok : &form.other;
-    at->setFocus();
-    TestForm::log.clear();
-    QTest::keyClick(at, Qt::Key(key));
-    QTEST(TestForm::log.remove(u"activate "_s), "clicked");
-}
-
-void tst_Form::freezeEndsWithTheRoutine()
-{
-    QWidget window;
-    bool afterPump = true;
-    inMainLoop([&] {
-        Desktop::current().freeze(&window); // and an error: nobody releases it
-        for (int i = 0; i < 5; ++i)
-            Desktop::current().pump();
-        afterPump = window.updatesEnabled();
-    });
-    QVERIFY(!afterPump);
-    inMainLoop([] {});
-    QTRY_VERIFY(window.updatesEnabled());
-}
-
-void tst_Form::freezeStaysUnderAModalScreen()
-{
-    QWidget window;
-    bool during = true, after = true;
-    inMainLoop([&] {
-        const Freeze freeze(&window);
-        QEventLoop modal;
-        QTimer::singleShot(60, &modal, &QEventLoop::quit); // longer than the freeze looks away
-        modal.exec();
-        during = window.updatesEnabled();
-    });
-    after = window.updatesEnabled();
-    QVERIFY(!during);
-    QVERIFY(after);
-}
-
-void tst_Form::freezesAreNotCounted()
-{
-    QWidget one, other;
+private slots:
+    void init()
     {
-        const Freeze outer(&one);
-        {
-            const Freeze inner(&other);
-            QVERIFY(one.updatesEnabled() && !other.updatesEnabled());
-        }
-        QVERIFY(one.updatesEnabled() && other.updatesEnabled());
+        mDesktop = std::make_unique<ScriptedDesktop>();
+        TestForm::log.clear();
     }
-    auto gone = std::make_unique<QWidget>();
-    Desktop::current().freeze(gone.get());
-    gone.reset();
-    Desktop::current().freeze(nullptr);
-}
 
-void tst_Form::questionOnlyItsButtonsAnswer()
-{
-    QtDesktop real;
-    QString text;
-    const auto answer = [&](BoxButtons buttons) {
-        QTimer::singleShot(0, this, [&] {
-            auto *box = qobject_cast<QMessageBox *>(QApplication::activeModalWidget());
-            QVERIFY(box);
-            QCOMPARE(box->textFormat(), Qt::PlainText);
-            text = box->text();
-            QTest::keyClick(box, Qt::Key_Escape);
-            box->close();
-            if (box->isVisible())
-                QTest::keyClick(box, Qt::Key_Return); // Yes is the default
+    void cleanup()
+    {
+        mDesktop->verifyAllCame();
+        const auto forms = Form::openForms();
+        qDeleteAll(forms);
+        QVERIFY(Form::openForms().isEmpty());
+    }
+
+    void loadsOnceAndGoes()
+    {
+        QPointer<TestForm> form = new TestForm;
+        QCOMPARE(Form::openForms(), QList<Form *>{form});
+        form->Load();
+        QVERIFY(!form->isVisible());
+        form->Show();
+        form->Show();
+        form->stays = true;
+        QVERIFY(!form->close());
+        QVERIFY(form->isVisible() && !form->isUnloaded());
+        form->stays = false;
+        QVERIFY(form->Unload());
+        QVERIFY(form->Unload()); // gone already, and no second time
+        QVERIFY(Form::openForms().isEmpty());
+        QVERIFY(form && form->isUnloaded() && !form->isVisible());
+        inMainLoop([] {});
+        QTRY_VERIFY(!form);
+        QCOMPARE(TestForm::log.remove(u"activate "_s), u"load query query unload unloaded "_s);
+    }
+
+    void reloadsOnTheSpot()
+    {
+        QPointer<TestForm> form = new TestForm;
+        form->Show();
+        form->activateWindow();
+        QVERIFY(QTest::qWaitForWindowActive(form));
+        form->text.setFocus();
+        TestForm::log.clear();
+        QVERIFY(form->Reload());
+        QCOMPARE(TestForm::log, u"query unload load "_s);
+        QVERIFY(form->isVisible() && !form->isUnloaded() && form->text.hasFocus());
+        form->stays = true;
+        QVERIFY(!form->Reload());
+        QVERIFY(form->text.hasFocus());
+        form->stays = false;
+        form->leavesAtLoad = true;
+        QVERIFY(!form->Reload());
+        QVERIFY(form->isUnloaded());
+    }
+
+    // A modal one must not wait for an end that has been.
+    void unloadsWhileLoading()
+    {
+        for (const bool modal : {false, true}) {
+            auto *form = new TestForm;
+            form->leavesAtLoad = true;
+            modal ? form->ShowModal() : form->Show();
+            QVERIFY(form->isUnloaded() && !form->isVisible());
+        }
+    }
+
+    void hostedOnesAreBroughtUp()
+    {
+        struct Host : Form::Host {
+            void adopt(Form *form) override
+            {
+                TestForm::log += u"adopt "_s;
+                form->show();
+            }
+            void bringUp(Form *) override { TestForm::log += u"up "_s; }
+            QPoint origin() const override { return {100, 50}; }
+        } host;
+        Form::setHost(&host);
+        TestForm form;
+        form.Show();
+        form.Show();
+        QCOMPARE(TestForm::log.remove(u"activate "_s), u"load adopt up "_s);
+        auto *modal = new TestForm;
+        modal->setPlace({10, 20});
+        QPoint place;
+        mDesktop->expectModal(u"frmTest"_s, [&](Form &f) {
+            place = f.pos();
+            f.Unload();
         });
-        return real.messageBox(BoxKind::Question, buttons, u"<b>\rnext"_s, u"t"_s);
-    };
-    QCOMPARE(answer(BoxButtons::YesNo), vbYes);
-    QCOMPARE(answer(BoxButtons::YesNoCancel), vbCancel);
-    QCOMPARE(text, u"<b>\nnext"_s);
-}
+        modal->ShowModal();
+        Form::setHost(nullptr);
+        QCOMPARE(place, QPoint(110, 70));
+    }
+
+    void buttonsOfEnterAndEsc_data()
+    {
+        const DataRows<QString, int, bool, QString> row("focus", "key", "enabled", "clicked");
+        row("Enter in a field", "text", Qt::Key_Return, true, "ok ");
+        row("the other Enter", "text", Qt::Key_Enter, true, "ok ");
+        row("Esc in a field", "text", Qt::Key_Escape, true, "cancel ");
+        row("Enter on another button", "other", Qt::Key_Return, true, "other ");
+        row("Enter on the default button", "ok", Qt::Key_Return, true, "ok ");
+        row("Enter, disabled", "text", Qt::Key_Return, false, "");
+        row("Esc, disabled", "text", Qt::Key_Escape, false, "");
+    }
+
+    void buttonsOfEnterAndEsc()
+    {
+        QFETCH(QString, focus);
+        QFETCH(int, key);
+        QFETCH(bool, enabled);
+        TestForm form;
+        form.ok.setEnabled(enabled);
+        form.cancel.setEnabled(enabled);
+        form.Show();
+        QWidget *at = &form.text;
+        if (focus != QLatin1String("text"))
+            at = focus == QLatin1String("ok") ? &form.ok : &form.other;
+        at->setFocus();
+        TestForm::log.clear();
+        QTest::keyClick(at, Qt::Key(key));
+        QTEST(TestForm::log.remove(u"activate "_s), "clicked");
+    }
+
+    void freezeEndsWithTheRoutine()
+    {
+        QWidget window;
+        bool afterPump = true;
+        inMainLoop([&] {
+            Desktop::current().freeze(&window); // and an error: nobody releases it
+            for (int i = 0; i < 5; ++i)
+                Desktop::current().pump();
+            afterPump = window.updatesEnabled();
+        });
+        QVERIFY(!afterPump);
+        inMainLoop([] {});
+        QTRY_VERIFY(window.updatesEnabled());
+    }
+
+    void freezeStaysUnderAModalScreen()
+    {
+        QWidget window;
+        bool during = true, after = true;
+        inMainLoop([&] {
+            const Freeze freeze(&window);
+            QEventLoop modal;
+            QTimer::singleShot(60, &modal, &QEventLoop::quit); // longer than the freeze looks away
+            modal.exec();
+            during = window.updatesEnabled();
+        });
+        after = window.updatesEnabled();
+        QVERIFY(!during);
+        QVERIFY(after);
+    }
+
+    void freezesAreNotCounted()
+    {
+        QWidget one, other;
+        {
+            const Freeze outer(&one);
+            {
+                const Freeze inner(&other);
+                QVERIFY(one.updatesEnabled() && !other.updatesEnabled());
+            }
+            QVERIFY(one.updatesEnabled() && other.updatesEnabled());
+        }
+        auto gone = std::make_unique<QWidget>();
+        Desktop::current().freeze(gone.get());
+        gone.reset();
+        Desktop::current().freeze(nullptr);
+    }
+
+    void questionOnlyItsButtonsAnswer()
+    {
+        QtDesktop real;
+        QString text;
+        const auto answer = [&](BoxButtons buttons) {
+            QTimer::singleShot(0, this, [&] {
+                auto *box = qobject_cast<QMessageBox *>(QApplication::activeModalWidget());
+                QVERIFY(box);
+                QCOMPARE(box->textFormat(), Qt::PlainText);
+                text = box->text();
+                QTest::keyClick(box, Qt::Key_Escape);
+                box->close();
+                if (box->isVisible())
+                    QTest::keyClick(box, Qt::Key_Return); // Yes is the default
+            });
+            return real.messageBox(BoxKind::Question, buttons, u"<b>\rnext"_s, u"t"_s);
+        };
+        QCOMPARE(answer(BoxButtons::YesNo), vbYes);
+        QCOMPARE(answer(BoxButtons::YesNoCancel), vbCancel);
+        QCOMPARE(text, u"<b>\nnext"_s);
+    }
+};
 
 QTEST_MAIN(tst_Form)
 #include "tst_Form.moc"
