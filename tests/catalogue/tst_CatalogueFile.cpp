@@ -38,7 +38,7 @@ class tst_CatalogueFile : public QObject
 
 private:
     using Snapshot = QMap<QString, QByteArray>;
-    // of all files in the folder
+    // Of all files in the folder.
     Snapshot snapshot() const
     {
         Snapshot all;

@@ -14,7 +14,7 @@ class tst_CleanOrphans : public QObject
     Q_OBJECT
 
 private:
-    // ids of artists, tracks, titles
+    // Ids of artists, tracks, titles.
     QString left() const
     {
         return mCatalogue

@@ -40,7 +40,8 @@ private:
     }
 
     QStringList three() { return mE->catalogue.rows(titleRow.arg(3)) + mE->tracks(3); }
-    // a statement to fail until allow()
+
+    // A statement to fail until allow().
     void refuse(const char *when)
     {
         mE->catalogue.exec(u"create trigger refuse before "_s + QLatin1String(when) +

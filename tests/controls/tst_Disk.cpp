@@ -50,7 +50,7 @@ private:
             transaction.CommitTrans();
     }
 
-    // plain text; "{Key}" and "{Mod+Key}" are typed keys
+    // Plain text; "{Key}" and "{Mod+Key}" are typed keys.
     void type(const char *keys)
     {
         static const QRegularExpression parts(u"\\{([^}]+)\\}|([^{]+)"_s);

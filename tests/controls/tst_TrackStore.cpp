@@ -181,7 +181,10 @@ private slots:
         save([](TrackModel &m) { m.setText(4, GenreField, {}); });
         QCOMPARE(mCatalogue->rows("select genre from tracks where id>3"), texts("NULL"));
         // Shared with another disc by now: a new title makes a new row, the old one stays.
-        mCatalogue->exec("insert into compactdiscs values (99,2,1,2,4,NULL)");
+        mCatalogue->exec("insert into compactdiscs values (99,1,2,2,4,NULL)");
+        QVERIFY(
+            !save([](TrackModel &m) { m.setText(4, GenreField, u"Rock"_s); }).keptValues.isEmpty());
+        QCOMPARE(mCatalogue->rows("select genre from tracks where id>3"), texts("NULL"));
         save([](TrackModel &m) { m.setText(4, TitleField, u"Believer"_s); });
         QCOMPARE(mCatalogue->rows("select id, titel from tracks where id>3"),
                  texts("4|Believe", "5|Believer"));

@@ -42,7 +42,8 @@ private:
     }
 
     QTabBar *tabs() const { return active()->findChild<QTabBar *>(u"DiscsTab"_s); }
-    // all that the catalogue has
+
+    // All that the catalogue has.
     QStringList stored()
     {
         const QString all = gConnection->housekeeping(

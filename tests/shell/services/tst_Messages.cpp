@@ -14,6 +14,7 @@ class tst_Messages : public QObject
 
 private slots:
     void cleanup() { gLanguage = languageEnglish; }
+
     // The fixed texts must not change, not by a blank. Their line breaks are CR alone.
     void table()
     {
