@@ -1,63 +1,19 @@
 // Label: unit
 #include "catalogue/cataloguefile.h"
 #include "platform/ado/recordset.h"
-#include "platform/ado/sqlfunctions.h"
 #include "shell/services/globals.h"
+#include "support/datarows.h"
 #include "support/ordinaryuser.h"
 #include "support/testcatalogue.h"
 
-#include <QCryptographicHash>
 #include <QDir>
 #include <QFile>
-#include <QTest>
 #include <csignal>
 #include <sqlite3.h>
 #include <sys/wait.h>
 
-/// The file itself: a new one, wrong ones of every kind, one left behind by a crash.
-class tst_CatalogueFile : public QObject
-{
-    Q_OBJECT
-
-private slots:
-    void init();
-    void cleanup() { gConnection.reset(); }
-    void newOne();
-    void makesNoneOverAnother();
-    void wrongOnes_data();
-    void wrongOnes();
-    void lockedOne();
-    void survivesACrash();
-    void sortOrderOfAnotherVersion();
-    void leavesNoFilesBeside();
-
-private:
-    using Snapshot = QMap<QString, QByteArray>;
-    Snapshot snapshot() const;
-    void exec(const QByteArray &sql);
-    QString opening(bool thorough = true);
-    QString folder() const { return mTemporary->filePath(QStringLiteral("data")); }
-    QString file() const { return folder() + QStringLiteral("/Compact4.orv"); }
-
-    std::unique_ptr<QTemporaryDir> mTemporary;
-};
-
 namespace
 {
-
-struct Raw {
-    explicit Raw(const QString &file)
-    {
-        sqlite3_open(file.toUtf8().constData(), &db);
-        ADODB::registerFunctions(db);
-    }
-    ~Raw() { sqlite3_close(db); }
-    int run(const QByteArray &sql) const
-    {
-        return sqlite3_exec(db, sql.constData(), nullptr, nullptr, nullptr);
-    }
-    sqlite3 *db = nullptr;
-};
 
 // Enough rows that every table and index has pages of its own.
 constexpr char someRows[] =
@@ -75,248 +31,208 @@ template <typename Change> void edit(const QString &name, Change change)
 
 } // namespace
 
-void tst_CatalogueFile::init()
+/// The file itself: a new one, wrong ones of every kind, one left behind by a crash.
+class tst_CatalogueFile : public QObject
 {
-    mTemporary = std::make_unique<QTemporaryDir>();
-    QFile::setPermissions(mTemporary->path(), QFile::Permissions(0x7777));
-    QDir().mkpath(folder());
-    cataloguefile::create(file());
-    exec(someRows);
-}
+    Q_OBJECT
 
-tst_CatalogueFile::Snapshot tst_CatalogueFile::snapshot() const
-{
-    Snapshot all;
-    for (const QString &name : QDir(folder()).entryList(QDir::Files | QDir::Hidden)) {
-        QFile f(folder() + QLatin1Char('/') + name);
-        QCryptographicHash hash(QCryptographicHash::Sha1);
-        if (f.open(QIODevice::ReadOnly))
-            hash.addData(&f);
-        all[name] = hash.result();
-    }
-    return all;
-}
-
-void tst_CatalogueFile::exec(const QByteArray &sql)
-{
-    const Raw raw(file());
-    QVERIFY2(raw.run(sql) == SQLITE_OK, sqlite3_errmsg(raw.db));
-}
-
-// Opens it as the program does; gives what is told to the user, nothing if it went well.
-QString tst_CatalogueFile::opening(bool thorough)
-{
-    try {
-        cataloguefile::inspect(file());
-        openConnection(file());
-        cataloguefile::verify(*gConnection, thorough);
-        return {};
-    } catch (const ADODB::Error &error) {
-        return error.Description;
-    }
-}
-
-void tst_CatalogueFile::newOne()
-{
-    QFile::remove(file());
-    cataloguefile::create(file());
-    QCOMPARE(QDir(folder()).entryList(QDir::Files).size(), 1);
-    QCOMPARE(opening(), QString());
-    QCOMPARE(gConnection->housekeeping("PRAGMA application_id"), QStringLiteral("1399811687"));
-    QCOMPARE(gConnection->housekeeping("PRAGMA user_version").toInt() >> 24, 4);
-    QCOMPARE(gConnection->housekeeping("PRAGMA encoding"), QStringLiteral("UTF-8"));
-    const char *columns[] = {"Artiesten(ID,Naam)",
-                             "Tracks(ID,Artiest_ID,Titel,Genre,Hitjaar)",
-                             "CDTitels(ID,Titel,Artiest_ID,CD_Type,Genre,Hitjaar)",
-                             "CompactDiscs(ID,CDTitels_ID,DiskNo,TrackNo,Track_ID,Opmerking)",
-                             "MP3Collections(ID,Map,Album)",
-                             "MP3Files(ID,Volgnummer,FileName,CollectionId)"};
-    for (const char *c : columns) {
-        QString row = QString::fromLatin1(c);
-        ADODB::Recordset rs;
-        rs.Open(QStringLiteral("select * from ") + row.section(u'(', 0, 0).toLower(), *gConnection);
-        QStringList names;
-        for (int i = 0; i < rs.fieldCount(); ++i)
-            names.append(rs.Fields(i).Name());
-        QCOMPARE(names.join(u','), row.section(u'(', 1).chopped(1));
-        QCOMPARE(rs.RecordCount(), 0);
-    }
-}
-
-void tst_CatalogueFile::makesNoneOverAnother()
-{
-    const auto before = snapshot();
-    QVERIFY_EXCEPTION_THROWN(cataloguefile::create(file()), ADODB::Error);
-    QCOMPARE(snapshot(), before);
-    const QString nowhere = folder() + QStringLiteral("/none/Compact4.orv");
-    QVERIFY_EXCEPTION_THROWN(cataloguefile::create(nowhere), ADODB::Error);
-    QVERIFY(!QFile::exists(nowhere));
-}
-
-void tst_CatalogueFile::wrongOnes_data()
-{
-    QTest::addColumn<QString>("kind");
-    QTest::addColumn<QString>("told");
-    const auto row = [](const char *kind, const char *told) {
-        QTest::newRow(kind) << QString::fromLatin1(kind) << QString::fromLatin1(told);
-    };
-    row("empty", "not a catalogue");
-    row("text", "not a catalogue");
-    row("first bytes only", "not a catalogue");
-    row("folder", "not a catalogue");
-    row("database of another program", "not a catalogue");
-    row("not there", "cannot be opened");
-    row("no rights", "cannot be opened");
-    row("newer", "newer version");
-    row("table missing", "table is missing");
-    row("half", "damaged");
-    row("one page", "damaged");
-    row("garbage page", "damaged");
-    row("garbage schema", "damaged");
-    row("overwritten middle", "damaged");
-    row("read-only", "read-only");
-    row("read-only folder", "read-only");
-}
-
-void tst_CatalogueFile::wrongOnes()
-{
-    QFETCH(QString, kind);
-    const QString f = file();
-    const qint64 size = QFileInfo(f).size();
-    const auto is = [&](const char *k) { return kind == QLatin1String(k); };
-    if (is("empty")) {
-        QFile::resize(f, 0);
-    } else if (is("text")) {
-        writeFile(f, QByteArray(5000, 'x'));
-    } else if (is("first bytes only")) {
-        QFile::resize(f, 50);
-    } else if (is("folder")) {
-        QFile::remove(f);
-        QDir().mkpath(f);
-    } else if (is("database of another program")) {
-        QFile::remove(f);
-        exec("create table artiesten(id)");
-    } else if (is("not there")) {
-        QFile::remove(f);
-    } else if (is("no rights")) {
-        QFile::setPermissions(f, {});
-    } else if (is("newer")) {
-        exec("pragma user_version=83886080"); // 5 << 24
-    } else if (is("table missing")) {
-        exec("drop table MP3Files");
-    } else if (is("half")) {
-        QFile::resize(f, size / 2 / 4096 * 4096);
-    } else if (is("one page")) {
-        QFile::resize(f, 4096);
-    } else if (is("garbage page")) {
-        edit(f, [&](QFile &o) { o.seek(4096) && o.write(QByteArray(4096, '\xA5')); });
-    } else if (is("garbage schema")) {
-        edit(f, [&](QFile &o) { o.seek(100) && o.write(QByteArray(3996, '\x5A')); });
-    } else if (is("overwritten middle")) {
-        edit(f, [&](QFile &o) { o.seek(size / 2) && o.write(QByteArray(9000, 'x')); });
-    } else if (is("read-only")) {
-        QFile::setPermissions(f, QFile::Permissions(0x4444));
-    } else {
-        QFile::setPermissions(folder(), QFile::Permissions(0x5555));
-    }
-    const auto before = snapshot();
-    QString said;
+private:
+    using Snapshot = QMap<QString, QByteArray>;
+    // Of all files in the folder.
+    Snapshot snapshot() const
     {
-        const auto user = is("no rights") ? std::make_unique<OrdinaryUser>() : nullptr;
-        said = opening();
-        gConnection.reset();
+        Snapshot all;
+        for (const QString &name : QDir(folder()).entryList(QDir::Files | QDir::Hidden))
+            all[name] = readFile(folder() + u'/' + name);
+        return all;
     }
-    const auto after = snapshot();
-    QFile::setPermissions(folder(), QFile::Permissions(0x7700));
-    QFETCH(QString, told);
-    QVERIFY2(said.contains(told), qPrintable(said));
-    QCOMPARE(after, before);
-}
 
-void tst_CatalogueFile::lockedOne()
-{
-    const Raw other(file());
-    const auto before = snapshot();
-    for (const char *lock : {"begin immediate", "begin exclusive"}) {
-        QCOMPARE(other.run(lock), SQLITE_OK);
-        const QString told = opening();
-        QVERIFY2(told.contains(QLatin1String("in use")), qPrintable(told));
-        QCOMPARE(other.run("rollback"), SQLITE_OK);
-    }
-    QCOMPARE(snapshot(), before);
-    QCOMPARE(opening(), QString());
-}
-
-// The program is killed in the middle of a large change that has reached the file in part.
-void tst_CatalogueFile::survivesACrash()
-{
-    const auto before = snapshot();
-    const pid_t child = fork();
-    QVERIFY(child >= 0);
-    if (child == 0) {
-        const Raw raw(file());
-        raw.run(
-            "pragma cache_size=5; begin; update tracks set titel='changed'; delete from artiesten");
-        kill(getpid(), SIGKILL);
-    }
-    int status = 0;
-    QCOMPARE(waitpid(child, &status, 0), child);
-    QVERIFY(WIFSIGNALED(status));
-    const auto crashed = snapshot();
-    QVERIFY(crashed.size() == 2 && crashed[QStringLiteral("Compact4.orv")] != before.first());
-    QCOMPARE(opening(), QString());
-    gConnection.reset();
-    QCOMPARE(snapshot(), before); // every byte is back, and no journal beside it
-}
-
-void tst_CatalogueFile::sortOrderOfAnotherVersion()
-{
+    void exec(const QByteArray &sql)
     {
-        sqlite3 *db = nullptr; // an order in which capitals count
-        QCOMPARE(sqlite3_open(file().toUtf8().constData(), &db), SQLITE_OK);
-        const auto bytewise = [](void *, int n, const void *a, int m, const void *b) {
-            const int c = memcmp(a, b, std::size_t(std::min(n, m)));
-            return c ? c : n - m;
-        };
-        sqlite3_create_collation(db, "SONGCASE", SQLITE_UTF8, nullptr, bytewise);
-        QCOMPARE(sqlite3_exec(db,
-                              "insert into artiesten values (2001,'Zappa'),(2002,'abba'),"
-                              "(2003,'Abc'),(2004,'zz'); pragma user_version=67108865",
-                              nullptr, nullptr, nullptr),
-                 SQLITE_OK);
-        sqlite3_close(db);
+        const OtherProgram raw(file());
+        QVERIFY2(raw.run(sql) == SQLITE_OK, sqlite3_errmsg(raw.db));
     }
-    const auto found = [] {
-        int n = 0;
-        for (const char *name : {"ZAPPA", "abba", "ABC", "Zz", "Artist 7"}) {
-            ADODB::Recordset rs;
-            rs.Open(QStringLiteral("Select ID From Artiesten where Naam = '") +
-                        QLatin1String(name) + QLatin1Char('\''),
-                    *gConnection);
-            n += int(rs.RecordCount());
+
+    // Opens it as the program does; gives what is told to the user, nothing if it went well.
+    QString opening(bool thorough = true)
+    {
+        try {
+            cataloguefile::inspect(file());
+            openConnection(file());
+            cataloguefile::verify(*gConnection, thorough);
+            return {};
+        } catch (const ADODB::Error &error) {
+            return error.Description;
         }
-        return n;
-    };
-    openConnection(file());
-    QVERIFY(found() < 5);
-    QCOMPARE(opening(), QString());
-    QCOMPARE(found(), 5);
-    gConnection.reset();
-    const auto mended = snapshot();
-    QCOMPARE(opening(), QString()); // once, not at every start
-    gConnection.reset();
-    QCOMPARE(snapshot(), mended);
-}
+    }
 
-void tst_CatalogueFile::leavesNoFilesBeside()
-{
-    exec("pragma journal_mode=wal");
-    QCOMPARE(opening(), QString());
-    gConnection->Execute(QStringLiteral("delete from artiesten where id=1"));
-    QCOMPARE(gConnection->housekeeping("PRAGMA journal_mode"), QStringLiteral("delete"));
-    gConnection.reset();
-    QCOMPARE(snapshot().size(), 1);
-}
+    QString folder() const { return mTemporary->filePath(u"data"_s); }
+    QString file() const { return folder() + u"/Compact4.orv"_s; }
+
+    std::unique_ptr<QTemporaryDir> mTemporary;
+
+private slots:
+    void init()
+    {
+        mTemporary = std::make_unique<QTemporaryDir>();
+        QFile::setPermissions(mTemporary->path(), QFile::Permissions(0x7777));
+        QDir().mkpath(folder());
+        cataloguefile::create(file());
+        exec(someRows);
+    }
+
+    void cleanup() { gConnection.reset(); }
+
+    void newOne()
+    {
+        QFile::remove(file());
+        cataloguefile::create(file());
+        QCOMPARE(QDir(folder()).entryList(QDir::Files).size(), 1);
+        QCOMPARE(opening(), QString());
+        QCOMPARE(gConnection->housekeeping("PRAGMA application_id"), u"1399811687"_s);
+        QCOMPARE(gConnection->housekeeping("PRAGMA user_version").toInt() >> 24, 4);
+        QCOMPARE(gConnection->housekeeping("PRAGMA encoding"), u"UTF-8"_s);
+        const char *tables[][2] = {
+            {"Artiesten", "ID,Naam"},
+            {"Tracks", "ID,Artiest_ID,Titel,Genre,Hitjaar"},
+            {"CDTitels", "ID,Titel,Artiest_ID,CD_Type,Genre,Hitjaar"},
+            {"CompactDiscs", "ID,CDTitels_ID,DiskNo,TrackNo,Track_ID,Opmerking"},
+            {"MP3Collections", "ID,Map,Album"},
+            {"MP3Files", "ID,Volgnummer,FileName,CollectionId"}};
+        for (const auto &[table, columns] : tables) {
+            const QByteArray names =
+                QByteArray("select group_concat(name) from pragma_table_info('") + table + "')";
+            QCOMPARE(gConnection->housekeeping(names), QLatin1String(columns));
+        }
+    }
+
+    void makesNoneOverAnother()
+    {
+        const auto before = snapshot();
+        QVERIFY_EXCEPTION_THROWN(cataloguefile::create(file()), ADODB::Error);
+        QCOMPARE(snapshot(), before);
+        const QString nowhere = folder() + u"/none/Compact4.orv"_s;
+        QVERIFY_EXCEPTION_THROWN(cataloguefile::create(nowhere), ADODB::Error);
+        QVERIFY(!QFile::exists(nowhere));
+    }
+
+    void wrongOnes_data()
+    {
+        const DataRows<QString, QString> row("kind", "told");
+        row("empty", "not a catalogue");
+        row("folder", "not a catalogue");
+        row("database of another program", "not a catalogue");
+        row("not there", "cannot be opened");
+        row("no rights", "cannot be opened");
+        row("newer", "newer version");
+        row("table missing", "table is missing");
+        row("half", "damaged");
+        row("garbage schema", "damaged");
+        row("overwritten middle", "damaged");
+        row("read-only", "read-only");
+        row("read-only folder", "read-only");
+    }
+
+    void wrongOnes()
+    {
+        QFETCH(QString, kind);
+        const QString f = file();
+        const qint64 size = QFileInfo(f).size();
+        const auto is = [&](const char *k) { return kind == QLatin1String(k); };
+        if (is("empty")) {
+            QFile::resize(f, 0);
+        } else if (is("folder")) {
+            QFile::remove(f);
+            QDir().mkpath(f);
+        } else if (is("database of another program")) {
+            QFile::remove(f);
+            exec("create table artiesten(id)");
+        } else if (is("not there")) {
+            QFile::remove(f);
+        } else if (is("no rights")) {
+            QFile::setPermissions(f, {});
+        } else if (is("newer")) {
+            exec("pragma user_version=83886080"); // 5 << 24
+        } else if (is("table missing")) {
+            exec("drop table MP3Files");
+        } else if (is("half")) {
+            QFile::resize(f, size / 2 / 4096 * 4096);
+        } else if (is("garbage schema")) {
+            edit(f, [&](QFile &o) { o.seek(100) && o.write(QByteArray(3996, '\x5A')); });
+        } else if (is("overwritten middle")) {
+            edit(f, [&](QFile &o) { o.seek(size / 2) && o.write(QByteArray(9000, 'x')); });
+        } else if (is("read-only")) {
+            QFile::setPermissions(f, QFile::Permissions(0x4444));
+        } else {
+            QFile::setPermissions(folder(), QFile::Permissions(0x5555));
+        }
+        const auto before = snapshot();
+        QString said;
+        {
+            const auto user = is("no rights") ? std::make_unique<OrdinaryUser>() : nullptr;
+            said = opening();
+            gConnection.reset();
+        }
+        const auto after = snapshot();
+        QFile::setPermissions(folder(), QFile::Permissions(0x7700));
+        QFETCH(QString, told);
+        QVERIFY2(said.contains(told), qPrintable(said));
+        QCOMPARE(after, before);
+    }
+
+    // The program is killed in the middle of a large change that has reached the file in part.
+    void survivesACrash()
+    {
+        const auto before = snapshot();
+        const pid_t child = fork();
+        QVERIFY(child >= 0);
+        if (child == 0) {
+            const OtherProgram raw(file());
+            raw.run("pragma cache_size=5; begin; update tracks set titel='changed'; delete from "
+                    "artiesten");
+            kill(getpid(), SIGKILL);
+        }
+        int status = 0;
+        QCOMPARE(waitpid(child, &status, 0), child);
+        QVERIFY(WIFSIGNALED(status));
+        const auto crashed = snapshot();
+        QVERIFY(crashed.size() == 2 && crashed[u"Compact4.orv"_s] != before.first());
+        QCOMPARE(opening(), QString());
+        gConnection.reset();
+        QCOMPARE(snapshot(), before); // every byte is back, and no journal beside it
+    }
+
+    void sortOrderOfAnotherVersion()
+    {
+        {
+            const OtherProgram other(file());
+            const auto bytewise = [](void *, int n, const void *a, int m, const void *b) {
+                const int c = memcmp(a, b, std::size_t(std::min(n, m)));
+                return c ? c : n - m;
+            };
+            sqlite3_create_collation(other.db, "SONGCASE", SQLITE_UTF8, nullptr, bytewise);
+            QCOMPARE(other.run("insert into artiesten values (2001,'Zappa'),(2002,'abba'),"
+                               "(2003,'Abc'),(2004,'zz'); pragma user_version=67108865"),
+                     SQLITE_OK);
+        }
+        const auto found = [] {
+            ADODB::Recordset rs;
+            rs.Open(
+                u"Select ID From Artiesten where Naam in ('ZAPPA','abba','ABC','Zz','Artist 7')"_s,
+                *gConnection);
+            return int(rs.RecordCount());
+        };
+        openConnection(file());
+        QVERIFY(found() < 5);
+        QCOMPARE(opening(), QString());
+        QCOMPARE(found(), 5);
+        gConnection.reset();
+        const auto mended = snapshot();
+        QCOMPARE(opening(), QString()); // once, not at every start
+        gConnection.reset();
+        QCOMPARE(snapshot(), mended);
+    }
+};
 
 QTEST_GUILESS_MAIN(tst_CatalogueFile)
 #include "tst_CatalogueFile.moc"

@@ -1,28 +1,21 @@
 // Label: screen
-#include "collection/cdeditor.h"
 #include "collection/frmCDList.h"
 #include "collection/recordtree.h"
 #include "controls/DBListViewCTL.h"
 #include "platform/ado/connection.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
-#include "support/scripteddesktop.h"
-#include "support/testcatalogue.h"
+#include "support/editing.h"
+#include "support/screentest.h"
 
 #include <QPushButton>
 #include <QStatusBar>
 #include <QTabWidget>
-#include <QTest>
 
 /// The browser on a real catalogue file.
-class tst_frmCDList : public QObject
+class tst_frmCDList : public ScreenTest
 {
     Q_OBJECT
 
 private slots:
-    void init();
-    void cleanup();
-    void anEmptyCatalogue_data();
     void anEmptyCatalogue();
     void listsAreSortedOnTheirFirstColumn();
     void pagesShowTheirCommandsAndCounts();
@@ -32,14 +25,10 @@ private slots:
     void deleteOfAnMP3Collection();
     void aFailedDeleteTakesAllBack();
     void theRememberedRowIsSelectedAgain();
-    void widthsOutliveAReload();
     void columnClicksSort();
     void keysInAList();
-    void adding_data();
     void adding();
-    void editing_data();
     void editing();
-    void oneEditorPerRecord();
     void mp3CollectionsAreNotEditedYet();
     void aFailureOfTheLoadIsTold();
 
@@ -51,33 +40,12 @@ private:
         return mScreen->findChild<Control *>(QLatin1String(name));
     }
     DBListViewCTL *list(const char *name) const { return control<DBListViewCTL>(name); }
-    static QStringList editors(); // "name mode id" of those that are open
     void page(int index) { control<QTabWidget>("CDTab")->setCurrentIndex(index); }
     QString status() const { return control<QStatusBar>("TheStatusBar")->currentMessage(); }
     static QStringList column(DBListViewCTL *list, int n);
 
-    std::unique_ptr<ScriptedDesktop> mDesktop;
-    std::unique_ptr<TestCatalogue> mCatalogue;
     QPointer<frmCDList> mScreen;
 };
-
-void tst_frmCDList::init()
-{
-    gLanguage = languageEnglish;
-    mDesktop = std::make_unique<ScriptedDesktop>();
-    mCatalogue = std::make_unique<TestCatalogue>();
-}
-
-void tst_frmCDList::cleanup()
-{
-    const auto forms = Form::openForms();
-    for (Form *form : forms)
-        form->Unload();
-    QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
-    mCatalogue.reset();
-    mDesktop->verifyAllCame();
-    mDesktop.reset();
-}
 
 // Two compilations, three albums, two collections. Track 2 stands on compilation 2 and album 3;
 // artist 3 has album 5 alone.
@@ -111,33 +79,14 @@ QStringList tst_frmCDList::column(DBListViewCTL *list, int n)
     return found;
 }
 
-void tst_frmCDList::anEmptyCatalogue_data()
-{
-    QTest::addColumn<int>("language");
-    QTest::addColumn<QString>("count");
-    QTest::addColumn<QString>("lastRoot");
-    QTest::newRow("English") << 1 << QStringLiteral("Number of compilations in your collection: 0")
-                             << QStringLiteral("Other");
-    QTest::newRow("Dutch") << 19 << QStringLiteral("Aantal verzamel-CD's in collectie: 0")
-                           << QStringLiteral("Overige");
-}
-
 void tst_frmCDList::anEmptyCatalogue()
 {
-    QFETCH(int, language);
-    gLanguage = language;
     show();
-    for (const char *name : {"ColList", "SngList", "MP3List"}) {
-        QVERIFY(!list(name)->isEnabled());
-        QCOMPARE(list(name)->ListItems().Count(), 0);
-    }
+    for (const char *name : {"ColList", "SngList", "MP3List"})
+        QVERIFY(!list(name)->isEnabled() && list(name)->ListItems().Count() == 0);
     QVERIFY(!control<QPushButton>("cmdUpdate")->isEnabled());
     QVERIFY(!control<QPushButton>("cmdDelete")->isEnabled());
-    QTEST(status(), "count");
-    auto *tree = control<RecordTree>("Platenbak");
-    QCOMPARE(tree->topLevelItemCount(), 27);
-    QCOMPARE(RecordTree::keyOf(tree->topLevelItem(0)), QStringLiteral("A"));
-    QTEST(tree->topLevelItem(26)->text(0), "lastRoot");
+    QCOMPARE(status(), QStringLiteral("Number of compilations in your collection: 0"));
 }
 
 void tst_frmCDList::listsAreSortedOnTheirFirstColumn()
@@ -271,17 +220,6 @@ void tst_frmCDList::theRememberedRowIsSelectedAgain()
     QCOMPARE(col->SelectedItem().Index(), 5);
 }
 
-void tst_frmCDList::widthsOutliveAReload()
-{
-    fill();
-    show();
-    auto headers = list("SngList")->ColumnHeaders();
-    headers.Item(2).setWidth(77);
-    mScreen->RefreshLists();
-    QCOMPARE(headers.Item(2).Width(), 77);
-    QCOMPARE(headers.Item(1).Width(), 0);
-}
-
 void tst_frmCDList::columnClicksSort()
 {
     fill();
@@ -304,91 +242,34 @@ void tst_frmCDList::keysInAList()
     QVERIFY(mScreen->isUnloaded());
 }
 
-QStringList tst_frmCDList::editors()
-{
-    QStringList found;
-    for (Form *form : Form::openForms()) {
-        if (const auto *editor = qobject_cast<CdEditor *>(form))
-            found.append(editor->Name() + QLatin1Char(' ') + editor->Mode + QLatin1Char(' ') +
-                         QString::number(editor->CdId));
-    }
-    return found;
-}
-
-void tst_frmCDList::adding_data()
-{
-    QTest::addColumn<int>("tab");
-    QTest::addColumn<bool>("byKey");
-    QTest::addColumn<QString>("editor");
-    QTest::newRow("compilation, button") << 0 << false << QStringLiteral("frmCDRoot I 0");
-    QTest::newRow("compilation, key") << 0 << true << QStringLiteral("frmCDRoot I 0");
-    QTest::newRow("album, button") << 1 << false << QStringLiteral("frmCDRootE I 0");
-    QTest::newRow("album, key") << 1 << true << QStringLiteral("frmCDRootE I 0");
-}
-
 void tst_frmCDList::adding()
 {
-    QFETCH(int, tab);
-    QFETCH(bool, byKey);
-    QFETCH(QString, editor);
     fill();
     show();
-    page(tab);
-    DBListViewCTL *rows = list(tab == 0 ? "ColList" : "SngList");
-    for (int n = 1; n <= 2; ++n) {
-        if (byKey)
-            QTest::keyClick(rows, Qt::Key_Insert);
-        else
-            control<QPushButton>("cmdInsert")->click();
-        QCOMPARE(editors(), QStringList(n, editor));
-    }
-    QTest::keyClick(rows, Qt::Key_Insert, Qt::ControlModifier);
-    QCOMPARE(editors().size(), 2);
-}
-
-void tst_frmCDList::editing_data()
-{
-    QTest::addColumn<int>("tab");
-    QTest::addColumn<QString>("how");
-    QTest::addColumn<QString>("editor");
-    for (const char *how : {"button", "Enter", "double click"}) {
-        QTest::newRow(QByteArray("compilation, ").append(how))
-            << 0 << QString::fromLatin1(how) << QStringLiteral("frmCDRoot U 1");
-        QTest::newRow(QByteArray("album, ").append(how))
-            << 1 << QString::fromLatin1(how) << QStringLiteral("frmCDRootE U 4");
-    }
+    control<QPushButton>("cmdInsert")->click();
+    QTest::keyClick(list("ColList"), Qt::Key_Insert, Qt::ControlModifier);
+    QCOMPARE(openEditors(), texts("frmCDRoot I 0"));
+    page(1);
+    QTest::keyClick(list("SngList"), Qt::Key_Insert);
+    QTest::keyClick(list("SngList"), Qt::Key_Insert);
+    QCOMPARE(openEditors(), texts("frmCDRoot I 0", "frmCDRootE I 0", "frmCDRootE I 0"));
 }
 
 void tst_frmCDList::editing()
 {
-    QFETCH(int, tab);
-    QFETCH(QString, how);
-    QFETCH(QString, editor);
     fill();
     show();
-    page(tab);
-    DBListViewCTL *rows = list(tab == 0 ? "ColList" : "SngList");
-    rows->setSelectedItem(rows->ListItems().Item(2));
+    DBListViewCTL *rows = list("ColList");
+    control<QPushButton>("cmdUpdate")->click();
+    QTest::keyClick(rows, Qt::Key_Return); // one editor per record
+    QCOMPARE(openEditors(), texts("frmCDRoot U 2"));
     const QPoint second = rows->visualRect(rows->model()->index(1, 1)).center();
-    if (how == QLatin1String("button"))
-        control<QPushButton>("cmdUpdate")->click();
-    else if (how == QLatin1String("Enter"))
-        QTest::keyClick(rows, Qt::Key_Return);
-    else
-        QTest::mouseDClick(rows->viewport(), Qt::LeftButton, {}, second);
-    QCOMPARE(editors(), QStringList(editor));
-}
-
-void tst_frmCDList::oneEditorPerRecord()
-{
-    fill();
-    show();
-    QTest::keyClick(list("ColList"), Qt::Key_Return);
-    QTest::keyClick(list("ColList"), Qt::Key_Return);
-    QCOMPARE(editors(), texts("frmCDRoot U 2"));
-    QTest::keyClick(list("ColList"), Qt::Key_Down);
-    QTest::keyClick(list("ColList"), Qt::Key_Return);
-    QCOMPARE(editors(), texts("frmCDRoot U 2", "frmCDRoot U 1"));
+    QTest::mouseDClick(rows->viewport(), Qt::LeftButton, {}, second);
+    QCOMPARE(openEditors(), texts("frmCDRoot U 2", "frmCDRoot U 1"));
+    page(1);
+    list("SngList")->setSelectedItem(list("SngList")->ListItems().Item(2));
+    QTest::keyClick(list("SngList"), Qt::Key_Return);
+    QCOMPARE(openEditors().last(), QStringLiteral("frmCDRootE U 4"));
 }
 
 void tst_frmCDList::mp3CollectionsAreNotEditedYet()
@@ -400,7 +281,7 @@ void tst_frmCDList::mp3CollectionsAreNotEditedYet()
     QVERIFY(!control<QPushButton>("cmdUpdate")->isEnabled());
     QTest::keyClick(list("MP3List"), Qt::Key_Return);
     QTest::keyClick(list("MP3List"), Qt::Key_Insert);
-    QVERIFY(editors().isEmpty());
+    QVERIFY(openEditors().isEmpty());
 }
 
 void tst_frmCDList::aFailureOfTheLoadIsTold()

@@ -1,28 +1,8 @@
 // Label: unit
 #include "controls/trackmodel.h"
+#include "support/datarows.h"
 
 #include <QRandomGenerator>
-#include <QTest>
-
-/// The rows of a track grid without a screen.
-class tst_TrackModel : public QObject
-{
-    Q_OBJECT
-
-private slots:
-    void fits_data();
-    void fits();
-    void parts_data();
-    void parts();
-    void pastes_data();
-    void pastes();
-    void emptyRowsAreNoTracks();
-    void knowsWhatChanged_data();
-    void knowsWhatChanged();
-    void aSaveThatDidNotHappen();
-    void undoBringsNoLinkBack();
-    void randomEditsComeBack();
-};
 
 namespace
 {
@@ -63,249 +43,164 @@ QString numbersOf(const TrackModel &model)
 
 } // namespace
 
-void tst_TrackModel::fits_data()
+/// The rows of a track grid without a screen.
+class tst_TrackModel : public QObject
 {
-    QTest::addColumn<QString>("typed");
-    QTest::addColumn<QString>("kept");
-    const QString pair = QString::fromUtf8("\U0001F3B5");
-    QTest::newRow("as it is") << QStringLiteral("d'Arc \"50%1\" <b>")
-                              << QStringLiteral("d'Arc \"50%1\" <b>");
-    QTest::newRow("only blanks") << QStringLiteral(" \t ") << QString();
-    QTest::newRow("blanks around") << QStringLiteral("  a  b ") << QStringLiteral("a  b");
-    QTest::newRow("line breaks") << QStringLiteral("a\r\nb\nc\u2028d\te\r")
-                                 << QStringLiteral("a b c d e");
-    QTest::newRow("composed") << QStringLiteral("E\u0301dith") << QStringLiteral("\u00C9dith");
-    QTest::newRow("255") << longText(255) << longText(255);
-    QTest::newRow("256") << longText(256) << longText(255);
-    QTest::newRow("cut before a pair") << longText(254) + pair << longText(254);
-    QTest::newRow("half a pair") << longText(254) + pair.first(1) << longText(254);
-    QTest::newRow("a pair at the end") << longText(253) + pair << longText(253) + pair;
-}
+    Q_OBJECT
 
-void tst_TrackModel::fits()
-{
-    QFETCH(QString, typed);
-    QTEST(TrackModel::fit(typed), "kept");
-}
-
-void tst_TrackModel::parts_data()
-{
-    QTest::addColumn<QString>("clipboard");
-    QTest::addColumn<QString>("cells"); // "|" between cells, "/" between lines
-    const auto row = [](const char *clipboard, const char *cells) {
-        QTest::newRow(QByteArray(clipboard).toPercentEncoding(" \"").constData())
-            << QString::fromUtf8(clipboard) << QString::fromUtf8(cells);
-    };
-    row("a", "a");
-    row("a\tb\nc\td\n", "a|b/c|d");
-    row("a\r\nb\rc", "a/b/c");
-    row("a\n\nb", "a//b");
-    row("\t\t", "||");
-    row("\"Heroes\"\tx", "\"Heroes\"|x");
-    row("\"two\nlines\"\tx", "two\nlines|x");
-    row("\"tab\tin\"\n\"a \"\"b\"\"\"", "tab\tin/a \"b\"");
-    row("\"open\tx", "\"open|x");
-    row("7\" single\tx", "7\" single|x");
-}
-
-void tst_TrackModel::parts()
-{
-    QFETCH(QString, clipboard);
-    QStringList lines;
-    for (const QStringList &line : TrackModel::parted(clipboard))
-        lines.append(line.join(u'|'));
-    QTEST(lines.join(u'/'), "cells");
-}
-
-void tst_TrackModel::pastes_data()
-{
-    QTest::addColumn<bool>("withArtist");
-    QTest::addColumn<QPoint>("at"); // column, row
-    QTest::addColumn<QString>("clipboard");
-    QTest::addColumn<QString>("becomes");
-    const auto row = [](const char *name, bool withArtist, QPoint at, const char *clipboard,
-                        const char *becomes) {
-        QTest::newRow(name) << withArtist << at << QString::fromUtf8(clipboard)
-                            << QString::fromUtf8(becomes);
-    };
-    row("into a cell", true, {2, 0}, "z", "A,z,,/B,b,Pop,1985/");
-    row("a block", true, {2, 1}, "x\ty\nz", "A,a,,/B,x,y,1985/,z,,/");
-    row("behind the end", true, {1, 2}, "C\tc\nD\td", "A,a,,/B,b,Pop,1985/C,c,,/D,d,,/");
-    row("too wide", true, {3, 0}, "G\t1990\tmore\tand more", "A,a,G,1990/B,b,Pop,1985/");
-    row("numbers in the number's column", true, {0, 0}, "1\tX\tx\n2\tY\ty", "X,x,,/Y,y,Pop,1985/");
-    row("texts in the number's column", true, {0, 1}, "X\tx", "A,a,,/X,x,Pop,1985/");
-    row("titles that are numbers", false, {0, 0}, "1999\n2000", "1999,,/2000,Pop,1985/");
-    row("an empty line empties", false, {1, 0}, "\nz", ",,/z,Pop,1985/");
-    row("breaks inside", false, {1, 0}, "\"a\nb\"", "a b,,/b,Pop,1985/");
-}
-
-void tst_TrackModel::pastes()
-{
-    QFETCH(bool, withArtist);
-    QFETCH(QPoint, at);
-    QFETCH(QString, clipboard);
-    TrackModel model(withArtist);
-    model.load({stored(1, "A", "a"), stored(2, "B", "b", "Pop", "1985")});
-    const QString before = textOf(model);
-    model.paste(at.y(), at.x(), TrackModel::parted(clipboard));
-    QTEST(textOf(model), "becomes");
-    model.undo();
-    QCOMPARE(textOf(model), before);
-    model.redo();
-    QTEST(textOf(model), "becomes");
-}
-
-void tst_TrackModel::emptyRowsAreNoTracks()
-{
-    TrackModel model(true);
-    model.load({stored(1, "A", "a"), stored(2, "B", "b")});
-    QCOMPARE(numbersOf(model), QStringLiteral("1,2,*"));
-    model.insertTrack(1);
-    QCOMPARE(numbersOf(model), QStringLiteral("1,,2,*"));
-    model.insertTrack(model.waitingRow());
-    QCOMPARE(model.rowCount(), 4); // one is waiting there already
-    model.setText(5, TitleField, QStringLiteral("f"));
-    QCOMPARE(numbersOf(model), QStringLiteral("1,,2,,,3,*"));
-    QCOMPARE(model.rowOfTrack(2), 5);
-    QCOMPARE(model.toSave().size(), 3);
-    model.setText(0, ArtistField, {});
-    model.setText(0, TitleField, {});
-    QCOMPARE(numbersOf(model), QStringLiteral(",,1,,,2,*"));
-    model.removeTrack(5);
-    model.removeTrack(model.waitingRow());
-    QCOMPARE(numbersOf(model), QStringLiteral(",,1,,,*"));
-}
-
-void tst_TrackModel::knowsWhatChanged_data()
-{
-    using Edit = std::function<void(TrackModel &)>;
-    QTest::addColumn<Edit>("edit");
-    QTest::addColumn<bool>("changed");
-    QTest::addColumn<QString>("links"); // of what is to be saved; "!" marks the changed ones
-    const auto row = [](const char *name, const Edit &edit, bool changed, const char *links) {
-        QTest::newRow(name) << edit << changed << QString::fromLatin1(links);
-    };
-    const auto type = [](int at, const char *title) {
-        return [=](TrackModel &m) { m.setText(at, TitleField, QString::fromUtf8(title)); };
-    };
-    row(
-        "nothing", [](TrackModel &) {}, false, "7 9 8");
-    row("the same", type(0, " a "), false, "7 9 8");
-    row("the case of a letter", type(0, "A"), true, "7! 9 8");
-    row("a new row", type(3, "d"), true, "7 9 8 0!");
-    row(
-        "an empty row", [](TrackModel &m) { m.insertTrack(0); }, false, "7 9 8");
-    row(
-        "a deleted row", [](TrackModel &m) { m.removeTrack(1); }, true, "7 8");
-    row(
-        "the last one deleted", [](TrackModel &m) { m.removeTrack(2); }, true, "7 9");
-    row(
-        "a row emptied",
-        [](TrackModel &m) {
-            m.clear({m.index(1, 0), m.index(1, 1), m.index(1, 2)});
-        },
-        true, "7 8");
-    row(
-        "an empty row becomes one",
-        [&](TrackModel &m) {
-            m.insertTrack(1);
-            type(1, "n")(m);
-        },
-        true, "7 0! 9 8");
-    row(
-        "changed and undone",
-        [&](TrackModel &m) {
-            type(0, "x")(m);
-            m.removeTrack(2);
-            m.undo();
-            m.undo();
-        },
-        false, "7 9 8");
-}
-
-void tst_TrackModel::knowsWhatChanged()
-{
-    QFETCH(std::function<void(TrackModel &)>, edit);
-    TrackModel model(true);
-    model.load({stored(7, "A", "a"), stored(9, "B", "b"), stored(8, "C", "c")});
-    edit(model);
-    QTEST(model.isChanged(), "changed");
-    QStringList links;
-    for (const TrackToSave &track : model.toSave())
-        links.append(QString::number(track.linkId) +
-                     (track.changed ? QStringLiteral("!") : QString()));
-    QTEST(links.join(u' '), "links");
-}
-
-void tst_TrackModel::aSaveThatDidNotHappen()
-{
-    TrackModel model(true);
-    model.load({stored(7, "A", "a")});
-    model.setText(0, TitleField, QStringLiteral("b"));
-    model.markSaved({7});
-    QVERIFY(!model.isChanged());
-    model.unmarkSaved();
-    QVERIFY(model.isChanged());
-    QCOMPARE(model.toSave().constFirst().was[TitleField], QStringLiteral("a"));
-}
-
-// The id of a deleted link is given again, here to the row typed in its place.
-void tst_TrackModel::undoBringsNoLinkBack()
-{
-    TrackModel model(true);
-    model.load({stored(7, "A", "a")});
-    model.removeTrack(0);
-    model.markSaved({});
-    model.setText(0, TitleField, QStringLiteral("b"));
-    model.markSaved({7});
-    model.undo();
-    model.undo();
-    QCOMPARE(textOf(model), QStringLiteral("A,a,,/"));
-    QCOMPARE(model.toSave().constFirst().linkId, 0);
-    QCOMPARE(model.savedLinks(), QList<qint64>{7});
-    model.redo();
-    model.redo();
-    QVERIFY(!model.isChanged());
-}
-
-void tst_TrackModel::randomEditsComeBack()
-{
-    QRandomGenerator random(20);
-    const auto below = [&](int n) { return int(random.bounded(n)); };
-    for (int round = 0; round < 200; ++round) {
-        TrackModel model(round % 2);
-        model.load({stored(1, "", "a"), stored(2, "", "b"), stored(3, "", "c")});
-        QStringList states{textOf(model)};
-        for (int step = 0; step < 12; ++step) {
-            const int row = below(model.rowCount());
-            switch (below(4)) {
-            case 0:
-                model.insertTrack(row);
-                break;
-            case 1:
-                model.removeTrack(row);
-                break;
-            case 2:
-                model.paste(row, below(4), {{QStringLiteral("p"), QStringLiteral("q")}, {}});
-                break;
-            default:
-                model.setText(row, TrackField(1 + below(3)), QString::number(below(3)));
-            }
-            if (textOf(model) != states.last())
-                states.append(textOf(model));
-        }
-        QStringList back{textOf(model)}, again;
-        while (model.undo().isValid())
-            if (textOf(model) != back.last())
-                back.append(textOf(model));
-        QVERIFY(!model.isChanged());
-        std::reverse(back.begin(), back.end());
-        QCOMPARE(back, states);
-        while (model.redo().isValid()) {
-        }
-        QCOMPARE(textOf(model), states.last());
+private slots:
+    void fits_data()
+    {
+        const DataRows<QString, QString> row("typed", "kept");
+        const QString pair = u"\U0001F3B5"_s;
+        row("as it is", "d'Arc \"50%1\" <b>", "d'Arc \"50%1\" <b>");
+        row("only blanks", " \t ", "");
+        row("blanks around", "  a  b ", "a  b");
+        row("line breaks", "a\r\nb\nc\u2028d\te\r", "a b c d e");
+        row("composed", "E\u0301dith", "\u00C9dith");
+        row("255", longText(255), longText(255));
+        row("256", longText(256), longText(255));
+        row("cut before a pair", longText(254) + pair, longText(254));
+        row("a pair at the end", longText(253) + pair, longText(253) + pair);
     }
-}
+
+    void fits()
+    {
+        QFETCH(QString, typed);
+        QTEST(TrackModel::fit(typed), "kept");
+    }
+
+    void parts_data()
+    {
+        // cells: "|" between cells, "/" between lines
+        const DataRows<QString, QString> row("clipboard", "cells");
+        row("a\tb\nc\td\n", "a|b/c|d");
+        row("a\r\nb\rc", "a/b/c");
+        row("a\n\nb", "a//b");
+        row("\"Heroes\"\tx", "\"Heroes\"|x");
+        row("\"two\nlines\"\tx", "two\nlines|x");
+        row("\"tab\tin\"\n\"a \"\"b\"\"\"", "tab\tin/a \"b\"");
+        row("\"open\tx", "\"open|x");
+        row("7\" single\tx", "7\" single|x");
+    }
+
+    void parts()
+    {
+        QFETCH(QString, clipboard);
+        QStringList lines;
+        for (const QStringList &line : TrackModel::parted(clipboard))
+            lines.append(line.join(u'|'));
+        QTEST(lines.join(u'/'), "cells");
+    }
+
+    void pastes_data()
+    {
+        // at: column, row
+        const DataRows<bool, QPoint, QString, QString> row("withArtist", "at", "clipboard",
+                                                           "becomes");
+        row("a block", true, {2, 1}, "x\ty\nz", "A,a,,/B,x,y,1985/,z,,/");
+        row("numbers in the number's column", true, {0, 0}, "1\tX\tx\n2\tY\ty",
+            "X,x,,/Y,y,Pop,1985/");
+        row("texts in the number's column", true, {0, 1}, "X\tx", "A,a,,/X,x,Pop,1985/");
+        row("titles that are numbers", false, {0, 0}, "1999\n2000", "1999,,/2000,Pop,1985/");
+        row("an empty line empties", false, {1, 0}, "\nz", ",,/z,Pop,1985/");
+        row("breaks inside", false, {1, 0}, "\"a\nb\"", "a b,,/b,Pop,1985/");
+    }
+
+    void pastes()
+    {
+        QFETCH(bool, withArtist);
+        QFETCH(QPoint, at);
+        QFETCH(QString, clipboard);
+        TrackModel model(withArtist);
+        model.load({stored(1, "A", "a"), stored(2, "B", "b", "Pop", "1985")});
+        const QString before = textOf(model);
+        model.paste(at.y(), at.x(), TrackModel::parted(clipboard));
+        QTEST(textOf(model), "becomes");
+        model.undo();
+        QCOMPARE(textOf(model), before);
+        model.redo();
+        QTEST(textOf(model), "becomes");
+    }
+
+    void emptyRowsAreNoTracks()
+    {
+        TrackModel model(true);
+        model.load({stored(1, "A", "a"), stored(2, "B", "b")});
+        model.insertTrack(1);
+        QVERIFY(!model.isChanged());
+        QCOMPARE(numbersOf(model), u"1,,2,*"_s);
+        model.insertTrack(model.waitingRow());
+        QCOMPARE(model.rowCount(), 4); // one is waiting there already
+        model.setText(5, TitleField, u"f"_s);
+        QCOMPARE(numbersOf(model), u"1,,2,,,3,*"_s);
+        QCOMPARE(model.rowOfTrack(2), 5);
+        model.paste(0, 1, {{QString(), QString()}});
+        QCOMPARE(numbersOf(model), u",,1,,,2,*"_s);
+        QCOMPARE(model.toSave().size(), 2);
+        model.removeTrack(5);
+        model.removeTrack(model.waitingRow());
+        QCOMPARE(numbersOf(model), u",,1,,,*"_s);
+    }
+
+    // The id of a deleted link is given again, here to the row typed in its place.
+    void undoBringsNoLinkBack()
+    {
+        TrackModel model(true);
+        model.load({stored(7, "A", "a")});
+        model.removeTrack(0);
+        model.markSaved({});
+        model.setText(0, TitleField, u"b"_s);
+        model.markSaved({7});
+        model.undo();
+        model.undo();
+        QCOMPARE(textOf(model), u"A,a,,/"_s);
+        QCOMPARE(model.toSave().constFirst().linkId, 0);
+        QCOMPARE(model.savedLinks(), QList<qint64>{7});
+        model.redo();
+        model.redo();
+        QVERIFY(!model.isChanged());
+    }
+
+    void randomEditsComeBack()
+    {
+        QRandomGenerator random(20);
+        const auto below = [&](int n) { return int(random.bounded(n)); };
+        for (int round = 0; round < 200; ++round) {
+            TrackModel model(round % 2);
+            model.load({stored(1, "", "a"), stored(2, "", "b"), stored(3, "", "c")});
+            QStringList states{textOf(model)};
+            for (int step = 0; step < 12; ++step) {
+                const int row = below(model.rowCount());
+                switch (below(4)) {
+                case 0:
+                    model.insertTrack(row);
+                    break;
+                case 1:
+                    model.removeTrack(row);
+                    break;
+                case 2:
+                    model.paste(row, below(4), {{u"p"_s, u"q"_s}, {}});
+                    break;
+                default:
+                    model.setText(row, TrackField(1 + below(3)), QString::number(below(3)));
+                }
+                if (textOf(model) != states.last())
+                    states.append(textOf(model));
+            }
+            QStringList back{textOf(model)}, again;
+            while (model.undo().isValid())
+                if (textOf(model) != back.last())
+                    back.append(textOf(model));
+            QVERIFY(!model.isChanged());
+            std::reverse(back.begin(), back.end());
+            QCOMPARE(back, states);
+            while (model.redo().isValid()) {
+            }
+            QCOMPARE(textOf(model), states.last());
+        }
+    }
+};
 
 QTEST_GUILESS_MAIN(tst_TrackModel)
 #include "tst_TrackModel.moc"

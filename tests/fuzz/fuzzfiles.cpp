@@ -11,47 +11,40 @@
 namespace
 {
 
-QByteArray contentOf(const QString &name)
-{
-    QFile file(name);
-    return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray();
-}
-
 // Whatever stands in the file, settings can be written and read again, and nothing of it is lost.
 void runSettings(const QByteArray &input)
 {
     const QTemporaryDir folder;
-    const QString name = writeFile(folder.filePath(QStringLiteral("settings.json")), input);
+    const QString name = writeFile(folder.filePath(u"settings.json"_s), input);
     SettingsFile settings(name);
-    const QString key = QStringLiteral("80000002\\Software\\Songcase");
+    const QString key = u"80000002\\Software\\Songcase"_s;
     QVariant old, value;
-    settings.value(key, QStringLiteral("old"), old);
+    settings.value(key, u"old"_s, old);
     fuzz::must(settings.createKey(key) == SettingsFile::Success, "no key can be made");
-    fuzz::must(settings.setValue(key, QStringLiteral("New"), 7) == SettingsFile::Success,
+    fuzz::must(settings.setValue(key, u"New"_s, 7) == SettingsFile::Success,
                "nothing can be written");
-    fuzz::must(settings.value(key + u'\\', QStringLiteral("NEW"), value) == SettingsFile::Success &&
+    fuzz::must(settings.value(key + u'\\', u"NEW"_s, value) == SettingsFile::Success &&
                    value == QVariant(7),
                "what was written is not read");
     QVariant still;
-    settings.value(key, QStringLiteral("old"), still);
+    settings.value(key, u"old"_s, still);
     fuzz::must(still == old, "another value has changed");
-    const auto aside = QDir(folder.path()).entryList({QStringLiteral("*damaged*")}, QDir::Files);
+    const auto aside = QDir(folder.path()).entryList({u"*damaged*"_s}, QDir::Files);
     for (const QString &file : aside)
-        fuzz::must(contentOf(folder.filePath(file)) == input, "the damaged file has changed");
+        fuzz::must(readFile(folder.filePath(file)) == input, "the damaged file has changed");
 }
 
 QByteArray smallCatalogue()
 {
     const QTemporaryDir folder;
-    const QString name = folder.filePath(QStringLiteral("Compact4.orv"));
+    const QString name = folder.filePath(u"Compact4.orv"_s);
     cataloguefile::create(name);
     openConnection(name);
     for (int i = 0; i < 200; ++i)
-        gConnection->Execute(QStringLiteral("insert into artiesten values (") + QString::number(i) +
-                             QStringLiteral(",'artist ") + QString::number(i * 7 % 200) + u'\'' +
-                             u')');
+        gConnection->Execute(u"insert into artiesten values ("_s + QString::number(i) +
+                             u",'artist "_s + QString::number(i * 7 % 200) + u'\'' + u')');
     gConnection.reset();
-    return contentOf(name);
+    return readFile(name);
 }
 
 // As at a start. False if the file was refused.
@@ -72,7 +65,7 @@ bool opens(const QString &name)
 void runCatalogue(const QByteArray &input)
 {
     static const QTemporaryDir folder;
-    const QString name = writeFile(folder.filePath(QStringLiteral("Compact4.orv")), input);
+    const QString name = writeFile(folder.filePath(u"Compact4.orv"_s), input);
     if (opens(name)) {
         for (const char *statement :
              {"select * from artiesten order by naam", "select * from tracks",
@@ -86,7 +79,7 @@ void runCatalogue(const QByteArray &input)
         gConnection.reset();
     } else {
         gConnection.reset();
-        fuzz::must(contentOf(name) == input, "a refused file was written");
+        fuzz::must(readFile(name) == input, "a refused file was written");
         fuzz::must(QDir(folder.path()).entryList(QDir::Files).size() == 1, "a file is left beside");
     }
     QFile::remove(name);

@@ -15,9 +15,8 @@ void runReader(const QByteArray &input)
                                   ReadAlbumFlat};
     static const QTemporaryDir folder;
     InputTextFile file;
-    fuzz::must(
-        OpenInputFile(writeFile(folder.filePath(QStringLiteral("in.txt")), input.mid(1)), file),
-        "a text file is refused");
+    fuzz::must(OpenInputFile(writeFile(folder.filePath(u"in.txt"_s), input.mid(1)), file),
+               "a text file is refused");
     const auto records = newImportRecords();
     TrackRows rows(*records, 1, 1);
     int told = 0;

@@ -12,8 +12,8 @@ TestCatalogue &catalogue()
 {
     static TestCatalogue one;
     static const bool filled = [] {
-        one.exec(QStringLiteral("insert into artiesten values (1,'Björk'),(2,'d''Arc');"
-                                "insert into tracks values (1,1,'Jóga','Pop',1997)"));
+        one.exec(u"insert into artiesten values (1,'Björk'),(2,'d''Arc');"
+                 "insert into tracks values (1,1,'Jóga','Pop',1997)"_s);
         return true;
     }();
     Q_UNUSED(filled)
@@ -23,7 +23,7 @@ TestCatalogue &catalogue()
 qint64 count(const char *table)
 {
     ADODB::Recordset rs;
-    rs.Open(QStringLiteral("select count(*) from ") + QLatin1String(table), *gConnection);
+    rs.Open(u"select count(*) from "_s + QLatin1String(table), *gConnection);
     return rs.Fields(0).Value().toLong();
 }
 
@@ -70,18 +70,17 @@ void runValue(const QByteArray &input)
     catalogue();
     const QString typed = QString::fromUtf8(input);
     ADODB::Transaction transaction(*gConnection);
-    gConnection->Execute(QStringLiteral("Insert into Artiesten(ID,Naam) values (3,") +
-                         quoted(typed) + QLatin1Char(')'));
+    gConnection->Execute(u"Insert into Artiesten(ID,Naam) values (3,"_s + quoted(typed) +
+                         QLatin1Char(')'));
     ADODB::Recordset rs;
-    rs.Open(QStringLiteral("Select Naam From Artiesten where ID = 3 and Naam = ") + quoted(typed),
-            *gConnection);
+    rs.Open(u"Select Naam From Artiesten where ID = 3 and Naam = "_s + quoted(typed), *gConnection);
     fuzz::must(rs.RecordCount() == 1, "a name is not found again");
     fuzz::must(rs.Fields(0).Value().toText() == typed.normalized(QString::NormalizationForm_C),
                "a name comes back another");
     try {
         gConnection->Execute(
-            QStringLiteral("Insert into Tracks(ID,Artiest_ID,Titel,Genre,Hitjaar) values (2,1,") +
-            quoted(typed) + QStringLiteral(",'") + typed + QStringLiteral("',1985)"));
+            u"Insert into Tracks(ID,Artiest_ID,Titel,Genre,Hitjaar) values (2,1,"_s +
+            quoted(typed) + u",'"_s + typed + u"',1985)"_s);
     } catch (const ADODB::Error &) {
         fuzz::must(count("tracks") == 1, "a refused statement has written");
     }

@@ -3,10 +3,9 @@
 #include "platform/text/likepattern.h"
 #include "platform/text/textrules.h"
 #include "shell/services/textfiles.h"
+#include "support/icuorder.h"
 #include "support/referencelike.h"
 #include "support/testcatalogue.h"
-
-#include <unicode/ucol.h>
 
 namespace
 {
@@ -22,16 +21,9 @@ void runLike(const QByteArray &input)
 
 void runOrder(const QByteArray &input)
 {
-    static UCollator *const icu = [] {
-        UErrorCode status = U_ZERO_ERROR;
-        UCollator *collator = ucol_open("", &status);
-        ucol_setStrength(collator, UCOL_SECONDARY);
-        return collator;
-    }();
+    static const IcuOrder icu;
     const auto [a, b] = fuzz::halves(input);
-    UErrorCode status = U_ZERO_ERROR;
-    const int right = ucol_strcollUTF8(icu, a.constData(), int32_t(a.size()), b.constData(),
-                                       int32_t(b.size()), &status);
+    const int right = icu.compare(a.toStdString(), b.toStdString());
     const int ours = text::Collation::root().compare(a.toStdString(), b.toStdString());
     fuzz::must((ours > 0) - (ours < 0) == right, "the order differs from the library's");
 }
@@ -40,7 +32,7 @@ void runTextFile(const QByteArray &input)
 {
     static const QTemporaryDir folder;
     InputTextFile file;
-    const QString name = writeFile(folder.filePath(QStringLiteral("in.txt")), input);
+    const QString name = writeFile(folder.filePath(u"in.txt"_s), input);
     fuzz::must(OpenInputFile(name, file), "a text file is refused");
     const int lines = file.countLines();
     int read = 0;
@@ -49,8 +41,7 @@ void runTextFile(const QByteArray &input)
         fuzz::must(!line.contains(u'\n') && !line.contains(u'\r'), "a line holds a line end");
         fuzz::must(text::properCase(line).size() == line.size(), "proper case changes a length");
         fuzz::must(text::cutTo(line, 5).size() <= 5, "cut too long");
-        fuzz::must(!text::isNumeric(line) ||
-                       line.contains(QRegularExpression(QStringLiteral("\\d"))),
+        fuzz::must(!text::isNumeric(line) || line.contains(QRegularExpression(u"\\d"_s)),
                    "a number without a digit");
     }
     fuzz::must(read == lines, "lines counted and lines read differ");

@@ -1,4 +1,5 @@
 #include "fuzz/fuzz.h"
+#include "support/texts.h"
 
 #include <QCommandLineParser>
 #include <QCoreApplication>
@@ -70,11 +71,9 @@ int main(int argc, char **argv)
 {
     const QCoreApplication application(argc, argv);
     QCommandLineParser options;
-    options.addOptions(
-        {{QStringLiteral("seconds"), QStringLiteral("For all targets."), QStringLiteral("N"),
-          QStringLiteral("10")},
-         {QStringLiteral("target"), QStringLiteral("This one alone."), QStringLiteral("NAME")},
-         {QStringLiteral("input"), QStringLiteral("This input alone."), QStringLiteral("NUMBER")}});
+    options.addOptions({{u"seconds"_s, u"For all targets."_s, u"N"_s, u"10"_s},
+                        {u"target"_s, u"This one alone."_s, u"NAME"_s},
+                        {u"input"_s, u"This input alone."_s, u"NUMBER"_s}});
     options.addHelpOption();
     options.process(application);
 #if defined(__SANITIZE_ADDRESS__)
@@ -89,17 +88,17 @@ int main(int argc, char **argv)
         qputenv("TMPDIR", memory);
 
     auto all = fuzz::targets();
-    const QString one = options.value(QStringLiteral("target"));
+    const QString one = options.value(u"target"_s);
     std::erase_if(all, [&](const fuzz::Target *t) {
         return !one.isEmpty() && one != QLatin1String(t->name);
     });
     bool good = !all.empty();
     for (const fuzz::Target *target : all) {
-        if (options.isSet(QStringLiteral("input"))) {
-            good &= passes(*target, options.value(QStringLiteral("input")).toUInt());
+        if (options.isSet(u"input"_s)) {
+            good &= passes(*target, options.value(u"input"_s).toUInt());
             continue;
         }
-        const double seconds = options.value(QStringLiteral("seconds")).toDouble();
+        const double seconds = options.value(u"seconds"_s).toDouble();
         const unsigned count = runFor(*target, qint64(seconds * 1000) / qint64(all.size()));
         std::printf("%-12s %8u inputs\n", target->name, count);
         good &= count > 0;

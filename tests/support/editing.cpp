@@ -1,7 +1,5 @@
 #include "support/editing.h"
 
-#include "shell/services/globals.h"
-
 #include <QApplication>
 #include <QTest>
 
@@ -15,7 +13,7 @@ void press(Qt::Key key, Qt::KeyboardModifiers modifiers)
     QTest::keyClick(to, key, modifiers);
 }
 
-void type(const QString &text)
+void type(const AnyText &text)
 {
     const auto characters = text.toUcs4();
     for (const char32_t c : characters) {
@@ -45,7 +43,7 @@ Editing::Editing(int language)
 Editing::~Editing()
 {
     if (editor) {
-        editor->findChild<QAbstractButton *>(QStringLiteral("cmdCancel"))->click();
+        editor->findChild<QAbstractButton *>(u"cmdCancel"_s)->click();
         QVERIFY(!editor || editor->isUnloaded());
     }
     if (browser)
@@ -74,7 +72,7 @@ void Editing::addTracks(const QStringList &tracks)
     }
 }
 
-void Editing::setCell(int row, int column, const QString &text)
+void Editing::setCell(int row, int column, const AnyText &text)
 {
     disk()->setFocus();
     disk()->setCurrentRow(row);
@@ -91,8 +89,19 @@ QString Editing::cell(int row, int column) const
 QStringList Editing::tracks(qint64 id)
 {
     return catalogue.rows(
-        QStringLiteral("select DiskNo || '/' || TrackNo || ' ' || Naam || ' - ' || Titel "
-                       "from CompactDiscs c join Tracks t on t.ID = c.Track_ID join Artiesten a on "
-                       "a.ID = t.Artiest_ID where CDTitels_ID = ") +
-        QString::number(id) + QStringLiteral(" order by DiskNo, TrackNo"));
+        u"select DiskNo || '/' || TrackNo || ' ' || Naam || ' - ' || Titel "
+        "from CompactDiscs c join Tracks t on t.ID = c.Track_ID join Artiesten a on "
+        "a.ID = t.Artiest_ID where CDTitels_ID = "_s +
+        QString::number(id) + u" order by DiskNo, TrackNo"_s);
+}
+
+QStringList openEditors()
+{
+    QStringList found;
+    for (Form *form : Form::openForms()) {
+        if (const auto *editor = qobject_cast<CdEditor *>(form))
+            found.append(editor->Name() + u' ' + editor->Mode + u' ' +
+                         QString::number(editor->CdId));
+    }
+    return found;
 }

@@ -2,7 +2,10 @@
 
 #include "collection/cdeditor.h"
 #include "controls/trackgrid.h"
-#include "shell/services/browser.h"
+#include "shell/services/globals.h"
+#include "shell/services/messages.h"
+#include "support/countingbrowser.h"
+#include "support/datarows.h"
 #include "support/scripteddesktop.h"
 #include "support/testcatalogue.h"
 
@@ -18,21 +21,12 @@ namespace keyboard
 {
 
 void press(Qt::Key key, Qt::KeyboardModifiers modifiers = Qt::NoModifier);
-void type(const QString &text);
+void type(const AnyText &text);
 
 /// Texts with Tab behind each, the empty ones left as they are.
 void fill(const QStringList &fields);
 
 } // namespace keyboard
-
-/// Stands for the open browser and counts how often its lists are read anew.
-class CountingBrowser : public Form, public Browser
-{
-public:
-    CountingBrowser() : Form(QStringLiteral("frmCDList")) {}
-    void RefreshLists() override { ++refreshed; }
-    int refreshed = 0;
-};
 
 /// An editor of either kind on the screen, with a catalogue and a browser beside it.
 class Editing
@@ -42,7 +36,7 @@ public:
     ~Editing();
 
     /// Shows an editor and waits until it is the active window.
-    template <typename Editor> CdEditor *open(const QString &mode, qint64 id = 0)
+    template <typename Editor> CdEditor *open(const AnyText &mode, qint64 id = 0)
     {
         auto *made = new Editor;
         made->Mode = mode;
@@ -69,7 +63,7 @@ public:
 
     /// Puts tracks behind those of the disc that shows: a line each, its fields parted by "|".
     void addTracks(const QStringList &tracks);
-    void setCell(int row, int column, const QString &text);
+    void setCell(int row, int column, const AnyText &text);
     QString cell(int row, int column) const;
 
     /// "disc/track artist - title" of the links of a title, in their order.
@@ -80,3 +74,6 @@ public:
     QPointer<CountingBrowser> browser;
     QPointer<CdEditor> editor;
 };
+
+/// "name mode id" of the editors that are open.
+QStringList openEditors();

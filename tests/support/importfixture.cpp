@@ -24,3 +24,16 @@ QStringList importRows()
     }
     return all;
 }
+
+void ImportTest::init()
+{
+    ScreenTest::init();
+    gImportFile.clear();
+    mFrame = std::make_unique<TestFrame>();
+}
+
+void ImportTest::cleanup()
+{
+    ScreenTest::cleanup();
+    mFrame.reset();
+}

@@ -1,8 +1,8 @@
 #pragma once
 
 #include "shell/services/frame.h"
+#include "support/screentest.h"
 
-#include <QStringList>
 #include <QWidget>
 
 /// What the wizard leaves behind: the file and one of the four formats. A and B have one field per
@@ -28,4 +28,23 @@ public:
 
 private:
     QWidget mWindow;
+};
+
+/// A test of a screen of the text import, with a frame around it.
+class ImportTest : public ScreenTest
+{
+    Q_OBJECT
+
+protected slots:
+    void init();
+    void cleanup();
+
+protected:
+    /// Chooses a file with this content.
+    void chooseContent(char format, const QByteArray &content)
+    {
+        chooseImport(format, writeFile(mCatalogue->path("in.txt"), content));
+    }
+
+    std::unique_ptr<TestFrame> mFrame;
 };

@@ -26,7 +26,7 @@ bool Program::start()
 {
     if (!mFrame->Load())
         return false;
-    auto *timer = mFrame->findChild<QTimer *>(QStringLiteral("Timer1"));
+    auto *timer = mFrame->findChild<QTimer *>(u"Timer1"_s);
     timer->setInterval(0);
     return QTest::qWaitFor([this] { return mFrame->isVisible(); });
 }
@@ -50,8 +50,7 @@ void Program::choose(const char *name)
 {
     QAction *action = entry(name);
     if (!action || !action->isEnabled())
-        QTest::qFail(qPrintable(QStringLiteral("Not to be chosen: ") + QLatin1String(name)),
-                     __FILE__, __LINE__);
+        QTest::qFail(qPrintable(u"Not to be chosen: "_s + QLatin1String(name)), __FILE__, __LINE__);
     else
         action->trigger();
 }
@@ -67,14 +66,14 @@ Form *Program::screen(const char *name) const
 
 void Program::missing(const char *screenName, const char *name) const
 {
-    QTest::qFail(qPrintable(QStringLiteral("Not there: %1 on %2")
-                                .arg(QLatin1String(name), QLatin1String(screenName))),
-                 __FILE__, __LINE__);
+    QTest::qFail(
+        qPrintable(u"Not there: %1 on %2"_s.arg(QLatin1String(name), QLatin1String(screenName))),
+        __FILE__, __LINE__);
 }
 
 void storeLanguage(int language)
 {
     clsRegistry settings;
     settings.CreateKey(settingsKey);
-    settings.SetValue(settingsKey, QStringLiteral("Language"), language);
+    settings.SetValue(settingsKey, u"Language"_s, language);
 }

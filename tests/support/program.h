@@ -2,6 +2,7 @@
 
 #include "shell/MainScreen.h"
 #include "support/scripteddesktop.h"
+#include "support/texts.h"
 
 #include <memory>
 

@@ -27,9 +27,9 @@ const QByteArray &emptyCatalogue()
 {
     static const QByteArray bytes = [] {
         const QTemporaryDir folder;
-        QFile file(folder.filePath(QStringLiteral("empty")));
-        cataloguefile::create(file.fileName());
-        return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray();
+        const QString file = folder.filePath(u"empty"_s);
+        cataloguefile::create(file);
+        return readFile(file);
     }();
     return bytes;
 }
@@ -47,40 +47,50 @@ TestCatalogue::~TestCatalogue()
     gConnection.reset();
 }
 
+OtherProgram::OtherProgram(const QString &file)
+{
+    sqlite3_open(file.toUtf8().constData(), &db);
+    ADODB::registerFunctions(db);
+}
+
+OtherProgram::~OtherProgram()
+{
+    sqlite3_close(db);
+}
+
+int OtherProgram::run(const QByteArray &sql) const
+{
+    return sqlite3_exec(db, sql.constData(), nullptr, nullptr, nullptr);
+}
+
 namespace
 {
 
-class SecondConnection
+void makeQuick(const OtherProgram &other)
 {
-public:
-    explicit SecondConnection(const QString &file)
-    {
-        sqlite3_open(file.toUtf8().constData(), &db);
-        ADODB::registerFunctions(db);
-        sqlite3_busy_timeout(db, 2000);
-        sqlite3_exec(db, "PRAGMA synchronous=OFF", nullptr, nullptr, nullptr);
-    }
-    ~SecondConnection() { sqlite3_close(db); }
-    sqlite3 *db = nullptr;
-};
+    sqlite3_busy_timeout(other.db, 2000);
+    other.run("PRAGMA synchronous=OFF");
+}
 
 } // namespace
 
-void TestCatalogue::exec(const QString &sql)
+void TestCatalogue::exec(const AnyText &sql)
 {
-    SecondConnection c(file());
-    if (sqlite3_exec(c.db, sql.toUtf8().constData(), nullptr, nullptr, nullptr) != SQLITE_OK)
+    const OtherProgram c(file());
+    makeQuick(c);
+    if (c.run(sql.toUtf8()) != SQLITE_OK)
         QTest::qFail(sqlite3_errmsg(c.db), __FILE__, __LINE__);
 }
 
-QStringList TestCatalogue::rows(const QString &sql)
+QStringList TestCatalogue::rows(const AnyText &sql)
 {
-    SecondConnection c(file());
+    const OtherProgram c(file());
+    makeQuick(c);
     QStringList found;
     const auto take = [](void *to, int columns, char **values, char **) {
         QStringList row;
         for (int i = 0; i < columns; ++i)
-            row.append(values[i] ? QString::fromUtf8(values[i]) : QStringLiteral("NULL"));
+            row.append(values[i] ? QString::fromUtf8(values[i]) : u"NULL"_s);
         static_cast<QStringList *>(to)->append(row.join(QLatin1Char('|')));
         return 0;
     };
@@ -89,7 +99,7 @@ QStringList TestCatalogue::rows(const QString &sql)
     return found;
 }
 
-int TestCatalogue::count(const QString &sql)
+int TestCatalogue::count(const AnyText &sql)
 {
     return rows(sql).value(0).section(QLatin1Char('|'), 0, 0).toInt();
 }
@@ -100,4 +110,20 @@ QString writeFile(const QString &name, const QByteArray &content)
     if (!file.open(QIODevice::WriteOnly) || file.write(content) != content.size())
         QTest::qFail(qPrintable(file.errorString()), __FILE__, __LINE__);
     return name;
+}
+
+QByteArray readFile(const QString &name)
+{
+    QFile file(name);
+    return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray("none");
+}
+
+int numberOf(const std::function<void()> &fails)
+{
+    try {
+        fails();
+    } catch (const ADODB::Error &error) {
+        return error.Number;
+    }
+    return 0;
 }

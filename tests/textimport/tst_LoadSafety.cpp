@@ -1,34 +1,18 @@
 // Label: screen
 #include "catalogue/cataloguefile.h"
 #include "platform/ado/recordset.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
 #include "support/importfixture.h"
-#include "support/scripteddesktop.h"
-#include "support/testcatalogue.h"
 #include "textimport/catalogueload.h"
 #include "textimport/filereading.h"
 #include "textimport/frmImportDBBusy.h"
 
 #include <QApplication>
 #include <QProcess>
-#include <QTest>
 #include <csignal>
 #include <cstdio>
 #include <sys/mount.h>
 #include <sys/resource.h>
 #include <unistd.h>
-
-/// What happens to the catalogue when a load is killed or the disk fills up: nothing.
-class tst_LoadSafety : public QObject
-{
-    Q_OBJECT
-
-private slots:
-    void aKilledLoadLeavesNoTrace_data();
-    void aKilledLoadLeavesNoTrace();
-    void aFullDiskLeavesNoTrace();
-};
 
 namespace
 {
@@ -70,17 +54,15 @@ int loadAndStop(const QString &catalogue, const QString &file, int track)
 
 QStringList everything(TestCatalogue &catalogue)
 {
-    return catalogue.rows(QStringLiteral("select * from Artiesten")) +
-           catalogue.rows(QStringLiteral("select * from Tracks")) +
-           catalogue.rows(QStringLiteral("select * from CDTitels")) +
-           catalogue.rows(QStringLiteral("select * from CompactDiscs"));
+    return catalogue.rows("select * from Artiesten") + catalogue.rows("select * from Tracks") +
+           catalogue.rows("select * from CDTitels") + catalogue.rows("select * from CompactDiscs");
 }
 
 void load(ScriptedDesktop &desktop, const QStringList &boxes)
 {
     for (const QString &box : boxes)
         desktop.expectBox(box);
-    desktop.expectModal(QStringLiteral("frmImportDBBusy"));
+    desktop.expectModal(u"frmImportDBBusy"_s);
     defaultInstance<frmImportDBBusy>().ShowModal();
     desktop.verifyAllCame();
 }
@@ -114,13 +96,10 @@ public:
         else
             limitFiles(RLIM_INFINITY);
     }
-    QString message() const
-    {
-        return mReal ? QStringLiteral("The disk is full") : QStringLiteral("The disk");
-    }
+    QString message() const { return mReal ? u"The disk is full"_s : u"The disk"_s; }
 
 private:
-    QString filler() const { return QString::fromLocal8Bit(mFolder) + QStringLiteral("/filler"); }
+    QString filler() const { return QString::fromLocal8Bit(mFolder) + u"/filler"_s; }
     static void limitFiles(rlim_t size)
     {
         std::signal(SIGXFSZ, SIG_IGN);
@@ -136,72 +115,75 @@ private:
 
 } // namespace
 
-void tst_LoadSafety::aKilledLoadLeavesNoTrace_data()
+/// What happens to the catalogue when a load is killed or the disk fills up: nothing.
+class tst_LoadSafety : public QObject
 {
-    QTest::addColumn<int>("track");
-    QTest::addColumn<bool>("loaded");
-    QTest::newRow("before the first track") << 1 << false;
-    QTest::newRow("early") << 30 << false;
-    QTest::newRow("half way") << trackCount / 2 << false;
-    QTest::newRow("before the last track") << trackCount << false;
-    QTest::newRow("behind the commit") << trackCount + 1 << true;
-}
+    Q_OBJECT
 
-void tst_LoadSafety::aKilledLoadLeavesNoTrace()
-{
-    QFETCH(int, track);
-    QFETCH(bool, loaded);
-    TestCatalogue catalogue;
-    catalogue.exec(QStringLiteral("insert into Artiesten values (1,'Artist 1'); "
-                                  "insert into Tracks values (1,1,'X',NULL,NULL)"));
-    gConnection->Close();
-    const QStringList before = everything(catalogue);
-    const QString file = writeFile(catalogue.path(QStringLiteral("in.txt")), manyTracks());
+private slots:
+    void aKilledLoadLeavesNoTrace_data()
+    {
+        const DataRows<int, bool> row("track", "loaded");
+        row("early", 30, false);
+        row("before the last track", trackCount, false);
+        row("behind the commit", trackCount + 1, true);
+    }
 
-    QProcess other;
-    other.start(QCoreApplication::applicationFilePath(),
-                {QStringLiteral("--load"), catalogue.file(), file, QString::number(track)});
-    QVERIFY(other.waitForReadyRead(20000));
-    QCOMPARE(other.readAllStandardOutput().trimmed(), QByteArray("here"));
-    const bool halfWritten = track > 1 && !loaded;
-    QCOMPARE(QFileInfo(catalogue.file() + QStringLiteral("-journal")).size() > 0, halfWritten);
-    other.kill();
-    QVERIFY(other.waitForFinished());
+    void aKilledLoadLeavesNoTrace()
+    {
+        QFETCH(int, track);
+        QFETCH(bool, loaded);
+        TestCatalogue catalogue;
+        catalogue.exec("insert into Artiesten values (1,'Artist 1'); "
+                       "insert into Tracks values (1,1,'X',NULL,NULL)");
+        gConnection->Close();
+        const QStringList before = everything(catalogue);
+        const QString file = writeFile(catalogue.path("in.txt"), manyTracks());
 
-    openConnection(catalogue.file());
-    cataloguefile::verify(*gConnection, true);
-    if (loaded)
-        QCOMPARE(catalogue.count(QStringLiteral("select count(*) from CompactDiscs")), trackCount);
-    else
-        QCOMPARE(everything(catalogue), before);
-}
+        QProcess other;
+        other.start(QCoreApplication::applicationFilePath(),
+                    {u"--load"_s, catalogue.file(), file, QString::number(track)});
+        QVERIFY(other.waitForReadyRead(20000));
+        QCOMPARE(other.readAllStandardOutput().trimmed(), QByteArray("here"));
+        const bool halfWritten = track > 1 && !loaded;
+        QCOMPARE(QFileInfo(catalogue.file() + u"-journal"_s).size() > 0, halfWritten);
+        other.kill();
+        QVERIFY(other.waitForFinished());
 
-void tst_LoadSafety::aFullDiskLeavesNoTrace()
-{
-    ScriptedDesktop desktop;
-    QTemporaryDir folder;
-    SmallDisk disk(folder.path());
-    const QString file = folder.filePath(QStringLiteral("Compact4.orv"));
-    cataloguefile::create(file);
-    openConnection(file);
-    gConnection->Execute(QStringLiteral("insert into Artiesten(ID,Naam) values (1,'Artist 1')"));
-    QTemporaryDir elsewhere;
-    chooseImport('C', writeFile(elsewhere.filePath(QStringLiteral("in.txt")), manyTracks()));
-    FileReading().run();
+        openConnection(catalogue.file());
+        cataloguefile::verify(*gConnection, true);
+        if (loaded)
+            QCOMPARE(catalogue.count("select count(*) from CompactDiscs"), trackCount);
+        else
+            QCOMPARE(everything(catalogue), before);
+    }
 
-    disk.fill();
-    load(desktop, {disk.message(), disk.message()});
-    QCOMPARE(gConnection->housekeeping("select group_concat(ID) from Artiesten"),
-             QStringLiteral("1"));
-    QCOMPARE(gConnection->housekeeping("select count(*) from Tracks"), QStringLiteral("0"));
-    QCOMPARE(gConnection->housekeeping("PRAGMA integrity_check"), QStringLiteral("ok"));
+    void aFullDiskLeavesNoTrace()
+    {
+        ScriptedDesktop desktop;
+        QTemporaryDir folder;
+        SmallDisk disk(folder.path());
+        const QString file = folder.filePath(u"Compact4.orv"_s);
+        cataloguefile::create(file);
+        openConnection(file);
+        gConnection->Execute(u"insert into Artiesten(ID,Naam) values (1,'Artist 1')"_s);
+        QTemporaryDir elsewhere;
+        chooseImport('C', writeFile(elsewhere.filePath(u"in.txt"_s), manyTracks()));
+        FileReading().run();
 
-    disk.makeRoom();
-    load(desktop, {QStringLiteral("Number of imported tracks: %1").arg(trackCount)});
-    QCOMPARE(gConnection->housekeeping("select count(*) from CompactDiscs"),
-             QString::number(trackCount));
-    gConnection.reset();
-}
+        disk.fill();
+        load(desktop, {disk.message(), disk.message()});
+        QCOMPARE(gConnection->housekeeping("select group_concat(ID) from Artiesten"), u"1"_s);
+        QCOMPARE(gConnection->housekeeping("select count(*) from Tracks"), u"0"_s);
+        QCOMPARE(gConnection->housekeeping("PRAGMA integrity_check"), u"ok"_s);
+
+        disk.makeRoom();
+        load(desktop, {u"Number of imported tracks: %1"_s.arg(trackCount)});
+        QCOMPARE(gConnection->housekeeping("select count(*) from CompactDiscs"),
+                 QString::number(trackCount));
+        gConnection.reset();
+    }
+};
 
 int main(int argc, char **argv)
 {

@@ -2,27 +2,12 @@
 #include "platform/ado/recordset.h"
 #include "platform/text/collation.h"
 #include "shell/services/globals.h"
+#include "support/datarows.h"
 #include "support/testcatalogue.h"
 
-#include <QTest>
 #include <sqlite3.h>
 
 using namespace ADODB;
-
-/// What the statements find in the engine besides its own: like, left, isnumeric, iif and the order
-/// of texts; also as the extension that other programs load.
-class tst_SqlFunctions : public QObject
-{
-    Q_OBJECT
-
-private slots:
-    void expressions_data();
-    void expressions();
-    void patternFromAColumn();
-    void sortsTheNames();
-    void collationIsUsedByIndexes();
-    void extensionForOtherPrograms();
-};
 
 namespace
 {
@@ -34,127 +19,87 @@ QStringList column(const QString &statement)
     QStringList all;
     for (; !rs.isEOF(); rs.MoveNext()) {
         const Value v = rs.Fields(0).Value();
-        all.append(v.isNull() ? QStringLiteral("NULL") : v.toText());
+        all.append(v.isNull() ? u"NULL"_s : v.toText());
     }
     return all;
 }
 
 } // namespace
 
-void tst_SqlFunctions::expressions_data()
+/// What the statements find in the engine besides its own: like, left, isnumeric, iif and the order
+/// of texts; also as the extension that other programs load.
+class tst_SqlFunctions : public QObject
 {
-    QTest::addColumn<QString>("expression");
-    QTest::addColumn<QString>("value");
-    const auto row = [](const char *expression, const char *value) {
-        QTest::newRow(expression) << QString::fromUtf8(expression) << QString::fromUtf8(value);
-    };
-    row("left('Björk',3)", "Bjö");
-    row("left('\U0001F3B5\U0001F3B5x',1)", "\U0001F3B5");
-    row("left('ab',5)", "ab");
-    row("left('ab',0)", "");
-    row("left('ab',-1)", "");
-    row("left(1985,2)", "19");
-    row("left(null,1)", "NULL");
-    row("isnumeric(left('2 Unlimited',1))", "1");
-    row("isnumeric('1e10')", "1");
-    row("isnumeric(' -1.5 ')", "1");
-    row("isnumeric('1a')", "0");
-    row("isnumeric('')", "0");
-    row("isnumeric(null)", "0");
-    row("isnumeric(12)", "1");
-    row("iif(isnumeric(left('10cc',1)),1,0)", "1");
-    row("iif('v'='V','Compilation','Album')", "Album"); // a literal has no collation
-    row("'ÉDITH' like 'éd%'", "1");
-    row("'Edith' like 'éd%'", "0");
-    row("null like '%'", "NULL");
-    row("'a' like null", "NULL");
-    row("1985 like '19__'", "1");
-    row("trim('  x ') like 'x'", "1");
-    row("'x' not like '%y%'", "1");
-    row("'a' between 'A' and 'b'", "1");
-}
+    Q_OBJECT
 
-void tst_SqlFunctions::expressions()
-{
-    QFETCH(QString, expression);
-    TestCatalogue catalogue;
-    QTEST(column(QStringLiteral("select ") + expression).value(0), "value");
-}
+private slots:
+    void expressions_data()
+    {
+        const DataRows<QString, QString> row("expression", "value");
+        row("left('\U0001F3B5\U0001F3B5x',1)", "\U0001F3B5");
+        row("left('ab',-1)", "");
+        row("left(1985,2)", "19");
+        row("left(null,1)", "NULL");
+        row("isnumeric(' -1.5 ')", "1");
+        row("isnumeric(null)", "0");
+        row("iif(isnumeric(left('10cc',1)),1,0)", "1");
+        row("iif('v'='V','Compilation','Album')", "Album"); // a literal has no collation
+        row("'ÉDITH' like 'éd%'", "1");
+        row("null like '%'", "NULL");
+        row("'a' between 'A' and 'b'", "1");
+    }
 
-// The compiled pattern must not outlive a pattern that changes from row to row.
-void tst_SqlFunctions::patternFromAColumn()
-{
-    TestCatalogue catalogue;
-    catalogue.exec(QStringLiteral("create table p(a,b); insert into p values ('abc','a%'),"
-                                  "('abc','b%'),('xyz','%Z'),('xyz','a%')"));
-    QCOMPARE(column(QStringLiteral("select a like b from p")).join(QString()),
-             QStringLiteral("1010"));
-}
+    void expressions()
+    {
+        QFETCH(QString, expression);
+        TestCatalogue catalogue;
+        QTEST(column(u"select "_s + expression).value(0), "value");
+    }
 
-void tst_SqlFunctions::sortsTheNames()
-{
-    TestCatalogue catalogue;
-    const QStringList sorted{
-        QStringLiteral("10cc"),  QStringLiteral("Abba"),  QStringLiteral("édith"),
-        QStringLiteral("Edson"), QStringLiteral("Zappa"), QStringLiteral("Ωmega"),
-    };
-    const int shuffled[] = {4, 2, 0, 5, 3, 1};
-    for (const int i : shuffled)
-        gConnection->Execute(QStringLiteral("insert into artiesten values (") + QString::number(i) +
-                             QStringLiteral(",'") + sorted[i] + QStringLiteral("')"));
-    QCOMPARE(column(QStringLiteral("select naam from artiesten order by 1")), sorted);
-    QCOMPARE(column(QStringLiteral("select naam from artiesten order by naam desc")).first(),
-             sorted.last());
-    QCOMPARE(column(QStringLiteral("select max(naam) from artiesten")).first(), sorted.last());
-    gConnection->Execute(QStringLiteral("insert into artiesten values (9,'ÉDITH')"));
-    QCOMPARE(column(QStringLiteral("select distinct naam from artiesten")).size(), 6);
-    QCOMPARE(column(QStringLiteral("select count(*) from artiesten group by naam "
-                                   "having count(*)= 2"))
-                 .size(),
-             1);
-}
+    void collationIsUsedByIndexes()
+    {
+        TestCatalogue catalogue;
+        const auto plan = [&](const char *statement) {
+            return catalogue.rows(QLatin1String("explain query plan ") + QLatin1String(statement))
+                .join(QLatin1Char('\n'));
+        };
+        // The look-ups that run once per row of an import, and the three of the clean-up.
+        for (const char *statement :
+             {"select ID, Naam from Artiesten where Naam = 'x'",
+              "select 1 from Tracks tr, Artiesten ar where ar.id = "
+              "tr.artiest_id and tr.Titel = 'x' and "
+              "tr.artiest_id = 1",
+              "select '1' from CDTitels where Titel = 'x' and Artiest_ID = 1",
+              "select '1' from CompactDiscs where Track_ID=1",
+              "select '1' from CompactDiscs where CDtitels_ID=1",
+              "select '1' from Tracks where Artiest_ID = 1",
+              "select '1' from CDtitels where Artiest_ID = 1",
+              "delete from mp3files where collectionid = 1"})
+            QVERIFY2(!plan(statement).contains(QLatin1String("SCAN")), qPrintable(plan(statement)));
+    }
 
-void tst_SqlFunctions::collationIsUsedByIndexes()
-{
-    TestCatalogue catalogue;
-    const auto plan = [&](const char *statement) {
-        return catalogue.rows(QLatin1String("explain query plan ") + QLatin1String(statement))
-            .join(QLatin1Char('\n'));
-    };
-    // The look-ups that run once per row of an import, and the three of the clean-up.
-    for (const char *statement : {"select ID, Naam from Artiesten where Naam = 'x'",
-                                  "select 1 from Tracks tr, Artiesten ar where ar.id = "
-                                  "tr.artiest_id and tr.Titel = 'x' and "
-                                  "tr.artiest_id = 1",
-                                  "select '1' from CDTitels where Titel = 'x' and Artiest_ID = 1",
-                                  "select '1' from CompactDiscs where Track_ID=1",
-                                  "select '1' from CompactDiscs where CDtitels_ID=1",
-                                  "select '1' from Tracks where Artiest_ID = 1",
-                                  "select '1' from CDtitels where Artiest_ID = 1",
-                                  "delete from mp3files where collectionid = 1"})
-        QVERIFY2(!plan(statement).contains(QLatin1String("SCAN")), qPrintable(plan(statement)));
-}
-
-void tst_SqlFunctions::extensionForOtherPrograms()
-{
-    TestCatalogue catalogue;
-    gConnection->Execute(QStringLiteral("insert into artiesten values (1,'Édith')"));
-    sqlite3 *db = nullptr;
-    QCOMPARE(sqlite3_open(catalogue.file().toUtf8().constData(), &db), SQLITE_OK);
-    const auto run = [&](const char *sql) {
-        return sqlite3_exec(db, sql, nullptr, nullptr, nullptr);
-    };
-    const char *query =
-        "select \"left\"(naam,1) from artiesten where naam='ÉDITH' and naam like 'é%'";
-    sqlite3_db_config(db, SQLITE_DBCONFIG_ENABLE_LOAD_EXTENSION, 1, nullptr);
-    const QByteArray file = qgetenv("SONGCASE_BIN") + "/lib/songcase.so";
-    char *message = nullptr;
-    QVERIFY2(sqlite3_load_extension(db, file.constData(), nullptr, &message) == SQLITE_OK, message);
-    QCOMPARE(run(query), SQLITE_OK);
-    QCOMPARE(run("update artiesten set naam='Edith'"), SQLITE_OK);
-    sqlite3_close(db);
-    QCOMPARE(column(QStringLiteral("select id from artiesten where naam='edith'")).size(), 1);
-}
+    void extensionForOtherPrograms()
+    {
+        TestCatalogue catalogue;
+        gConnection->Execute(u"insert into artiesten values (1,'Édith')"_s);
+        sqlite3 *db = nullptr;
+        QCOMPARE(sqlite3_open(catalogue.file().toUtf8().constData(), &db), SQLITE_OK);
+        const auto run = [&](const char *sql) {
+            return sqlite3_exec(db, sql, nullptr, nullptr, nullptr);
+        };
+        const char *query =
+            "select \"left\"(naam,1) from artiesten where naam='ÉDITH' and naam like 'é%'";
+        sqlite3_db_config(db, SQLITE_DBCONFIG_ENABLE_LOAD_EXTENSION, 1, nullptr);
+        const QByteArray file = qgetenv("SONGCASE_BIN") + "/lib/songcase.so";
+        char *message = nullptr;
+        QVERIFY2(sqlite3_load_extension(db, file.constData(), nullptr, &message) == SQLITE_OK,
+                 message);
+        QCOMPARE(run(query), SQLITE_OK);
+        QCOMPARE(run("update artiesten set naam='Edith'"), SQLITE_OK);
+        sqlite3_close(db);
+        QCOMPARE(column(u"select id from artiesten where naam='edith'"_s).size(), 1);
+    }
+};
 
 QTEST_GUILESS_MAIN(tst_SqlFunctions)
 #include "tst_SqlFunctions.moc"

@@ -1,46 +1,13 @@
 // Label: unit
 #include "platform/text/collation.h"
+#include "support/datarows.h"
+#include "support/icuorder.h"
 
 #include <QString>
-#include <QTest>
 #include <random>
-#include <unicode/ucol.h>
-
-/// Holds the short ways of the order of texts against ICU itself.
-class tst_Collation : public QObject
-{
-    Q_OBJECT
-
-private slots:
-    void agreesWithIcu_data();
-    void agreesWithIcu();
-    void order_data();
-    void order();
-};
 
 namespace
 {
-
-class Icu
-{
-public:
-    Icu()
-    {
-        UErrorCode status = U_ZERO_ERROR;
-        mCollator = ucol_open("", &status);
-        ucol_setStrength(mCollator, UCOL_SECONDARY);
-    }
-    ~Icu() { ucol_close(mCollator); }
-    int compare(const std::string &a, const std::string &b) const
-    {
-        UErrorCode status = U_ZERO_ERROR;
-        return ucol_strcollUTF8(mCollator, a.data(), int32_t(a.size()), b.data(), int32_t(b.size()),
-                                &status);
-    }
-
-private:
-    UCollator *mCollator;
-};
 
 int sign(int n)
 {
@@ -108,70 +75,52 @@ Alphabet range(char32_t from, char32_t to)
 
 } // namespace
 
-void tst_Collation::agreesWithIcu_data()
+/// Holds the short ways of the order of texts against ICU itself.
+class tst_Collation : public QObject
 {
-    QTest::addColumn<Alphabet>("alphabet");
-    const Alphabet letters{"a", "A", "b", "e", "E", "i", "o", "s", "S", "z", " ", "-", "'", "1"};
-    QTest::newRow("all of ASCII") << asciiAlphabet();
-    QTest::newRow("Latin") << letters + range(0x80, 0x250);
-    QTest::newRow("combining marks") << letters + range(0x300, 0x330) + Alphabet{"\x01", "l"};
-    QTest::newRow("signs of three bytes")
-        << letters + Alphabet{"l", "L", "n", "–", "—", "…", "’", "“", "€",
-                              "™", "ﬁ", "ß", "ẞ", "æ", "·", "ŀ", "ŉ"};
-    QTest::newRow("other scripts") << letters + range(0x391, 0x3CA) + range(0x410, 0x450) +
-                                          Alphabet{"日", "本", "ア", "가", "\U0001F3B5"};
-    QTest::newRow("broken UTF-8") << letters + Alphabet{"\x80",     "\xC2", "\xC3", "\xC9", "\xE2",
-                                                        "\xE2\x80", "\xF0", "\xFF", "é"};
-}
+    Q_OBJECT
 
-void tst_Collation::agreesWithIcu()
-{
-    QFETCH(Alphabet, alphabet);
-    const auto &ours = text::Collation::root();
-    const Icu icu;
-    std::mt19937 random(1);
-    for (int i = 0; i < 20000; ++i) {
-        std::string a;
-        for (auto n = random() % 24; n > 0; --n)
-            a = changed(a, alphabet, random);
-        const std::string b = changed(a, alphabet, random);
-        const int right = sign(icu.compare(a, b));
-        const QByteArray what =
-            QByteArray::fromStdString(a).toHex() + " / " + QByteArray::fromStdString(b).toHex();
-        QVERIFY2(sign(ours.compare(a, b)) == right, what.constData());
-        if (const int told = byPrefixes(a, b))
-            QVERIFY2(told == right, what.constData());
-        std::string keyA, keyB;
-        ours.appendSortKey(a, keyA);
-        ours.appendSortKey(b, keyB);
-        QVERIFY2(sign(keyA.compare(keyB)) == right, what.constData());
+private slots:
+    void agreesWithIcu_data()
+    {
+        const DataRows<Alphabet> row("alphabet");
+        const Alphabet letters{"a", "A", "b", "e", "E", "i", "o",
+                               "s", "S", "z", " ", "-", "'", "1"};
+        row("all of ASCII", asciiAlphabet());
+        row("Latin", letters + range(0x80, 0x250));
+        row("combining marks", letters + range(0x300, 0x330) + Alphabet{"\x01", "l"});
+        row("signs of three bytes", letters + Alphabet{"l", "L", "n", "–", "—", "…", "’", "“", "€",
+                                                       "™", "ﬁ", "ß", "ẞ", "æ", "·", "ŀ", "ŉ"});
+        row("other scripts", letters + range(0x391, 0x3CA) + range(0x410, 0x450) +
+                                 Alphabet{"日", "本", "ア", "가", "\U0001F3B5"});
+        row("broken UTF-8", letters + Alphabet{"\x80", "\xC2", "\xC3", "\xC9", "\xE2", "\xE2\x80",
+                                               "\xF0", "\xFF", "é"});
     }
-}
 
-void tst_Collation::order_data()
-{
-    QTest::addColumn<QString>("a");
-    QTest::addColumn<QString>("b");
-    QTest::addColumn<int>("order");
-    QTest::newRow("case") << QStringLiteral("ABBA") << QStringLiteral("abba") << 0;
-    QTest::newRow("accent counts") << QStringLiteral("Edith") << QStringLiteral("Édith") << -1;
-    QTest::newRow("but stands beside") << QStringLiteral("Édith") << QStringLiteral("Edna") << -1;
-    QTest::newRow("digits first") << QStringLiteral("10cc") << QStringLiteral("a") << -1;
-    QTest::newRow("shorter first") << QStringLiteral("Bob") << QStringLiteral("Bobby") << -1;
-    QTest::newRow("composed") << QStringLiteral("\u00e9") << QStringLiteral("e\u0301") << 0;
-    QTest::newRow("empty") << QString() << QStringLiteral(" ") << -1;
-}
-
-void tst_Collation::order()
-{
-    QFETCH(QString, a);
-    QFETCH(QString, b);
-    QFETCH(int, order);
-    const auto &root = text::Collation::root();
-    QCOMPARE(sign(root.compare(a.toStdString(), b.toStdString())), order);
-    QCOMPARE(sign(root.compare(b.toStdString(), a.toStdString())), -order);
-    QVERIFY(root.version() > 0 && root.version() < 1u << 24);
-}
+    void agreesWithIcu()
+    {
+        QFETCH(Alphabet, alphabet);
+        const auto &ours = text::Collation::root();
+        const IcuOrder icu;
+        std::mt19937 random(1);
+        for (int i = 0; i < 20000; ++i) {
+            std::string a;
+            for (auto n = random() % 24; n > 0; --n)
+                a = changed(a, alphabet, random);
+            const std::string b = changed(a, alphabet, random);
+            const int right = icu.compare(a, b);
+            const QByteArray what =
+                QByteArray::fromStdString(a).toHex() + " / " + QByteArray::fromStdString(b).toHex();
+            QVERIFY2(sign(ours.compare(a, b)) == right, what.constData());
+            if (const int told = byPrefixes(a, b))
+                QVERIFY2(told == right, what.constData());
+            std::string keyA, keyB;
+            ours.appendSortKey(a, keyA);
+            ours.appendSortKey(b, keyB);
+            QVERIFY2(sign(keyA.compare(keyB)) == right, what.constData());
+        }
+    }
+};
 
 QTEST_APPLESS_MAIN(tst_Collation)
 #include "tst_Collation.moc"

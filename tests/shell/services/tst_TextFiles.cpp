@@ -1,11 +1,11 @@
 // Label: unit
 #include "shell/services/textfiles.h"
+#include "support/datarows.h"
 #include "support/testcatalogue.h"
 
 #include <QDir>
 #include <QFile>
 #include <QSaveFile>
-#include <QTest>
 #include <csignal>
 #include <sys/resource.h>
 
@@ -14,134 +14,105 @@ class tst_TextFiles : public QObject
 {
     Q_OBJECT
 
-private slots:
-    void init() { mFolder = std::make_unique<QTemporaryDir>(); }
-    void reads_data();
-    void reads();
-    void opensNot();
-    void writes();
-    void leavesTheOldFile_data();
-    void leavesTheOldFile();
-
 private:
     QString at(const char *name) const { return mFolder->filePath(QString::fromUtf8(name)); }
-    QByteArray content(const QString &name) const
-    {
-        QFile file(name);
-        return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray("none");
-    }
     std::unique_ptr<QTemporaryDir> mFolder;
-};
 
-void tst_TextFiles::reads_data()
-{
-    QTest::addColumn<QByteArray>("bytes");
-    QTest::addColumn<QString>("lines"); // joined by "|", one behind each
-    const auto row = [](const char *name, const QByteArray &bytes, const char *lines) {
-        QTest::newRow(name) << bytes << QString::fromUtf8(lines);
-    };
-    row("empty", "", "");
-    row("one line without end", "a", "a|");
-    row("LF", "a\nb\n", "a|b|");
-    row("CRLF", "a\r\nb\r\n", "a|b|");
-    row("CR", "a\rb\r", "a|b|");
-    row("mixed", "a\r\nb\rc\n\r\rd", "a|b|c|||d|");
-    row("empty lines", "\n\r\n\n", "|||");
-    row("only a line feed", "\n", "|");
-    row("BOM",
-        "\xEF\xBB\xBF"
-        "caf\xC3\xA9\n",
-        "café|");
-    row("nothing but a BOM", "\xEF\xBB\xBF", "");
-    row("UTF-8", "\xF0\x9F\x8E\xB5\n", "\U0001F3B5|");
-    row("Windows-1252", "caf\xE9 \x80\x93\n", "café €“|");
-    row("one bad byte decides for all", "caf\xC3\xA9\n\xE9", "cafÃ©|é|");
-    row("blanks stay", " a \t\n", " a \t|");
-    row("half a pair of bytes at the end", "a\xC3", "aÃ|");
-}
+private slots:
+    void init() { mFolder = std::make_unique<QTemporaryDir>(); }
 
-void tst_TextFiles::reads()
-{
-    QFETCH(QByteArray, bytes);
-    QFETCH(QString, lines);
-    InputTextFile file;
-    QVERIFY(OpenInputFile(writeFile(at("in.txt"), bytes), file));
-    QCOMPARE(file.countLines(), int(lines.count(QLatin1Char('|'))));
-    writeFile(at("in.txt"), "changed meanwhile");
-    QString all;
-    while (!file.atEnd())
-        all += ReadTextLine(file) + QLatin1Char('|');
-    QCOMPARE(all, lines);
-    QCOMPARE(ReadTextLine(file), QString()); // behind the end: nothing, and no box
-    QVERIFY(CloseTextFile(file));
-    QVERIFY(file.atEnd());
-}
-
-void tst_TextFiles::opensNot()
-{
-    InputTextFile in;
-    QVERIFY(!OpenInputFile(at("none"), in));
-    QVERIFY(!OpenInputFile(QString(), in));
-    QVERIFY(!OpenInputFile(mFolder->path(), in));
-    QVERIFY(in.atEnd());
-    OutputTextFile out;
-    for (const QString &name : {at("none/x"), mFolder->path(), QString()}) {
-        QVERIFY(!OpenOutputFile(name, out));
-        QVERIFY(!WriteTextLine(out, QStringLiteral("x")));
-        QVERIFY(!CloseTextFile(out));
-    }
-    QVERIFY(QDir(mFolder->path()).isEmpty());
-}
-
-void tst_TextFiles::writes()
-{
-    // A name just chosen: the backslash is part of it.
-    for (const char *name : {"out.txt", "AC\\DC \U0001F3B5.txt"}) {
-        writeFile(at(name), "an older and longer one\n");
-        OutputTextFile file;
-        QVERIFY(OpenOutputFile(at(name), file));
-        QVERIFY(WriteTextLine(file, QStringLiteral("\"café\";\"\U0001F3B5\"")));
-        QVERIFY(WriteTextLine(file, QString()));
-        QCOMPARE(content(at(name)), QByteArray("an older and longer one\n"));
-        QVERIFY(CloseTextFile(file));
-        QCOMPARE(content(at(name)), QByteArray("\"caf\xC3\xA9\";\"\xF0\x9F\x8E\xB5\"\n\n"));
-        QVERIFY(!CloseTextFile(file));
-        QVERIFY(!WriteTextLine(file, QStringLiteral("x")));
-    }
-    QCOMPARE(QDir(mFolder->path()).entryList(QDir::Files).size(), 2);
-}
-
-void tst_TextFiles::leavesTheOldFile_data()
-{
-    QTest::addColumn<bool>("diskFull");
-    QTest::newRow("never closed") << false;
-    QTest::newRow("disk full") << true;
-}
-
-void tst_TextFiles::leavesTheOldFile()
-{
-    QFETCH(bool, diskFull);
-    writeFile(at("out.txt"), "old");
-    rlimit before;
-    getrlimit(RLIMIT_FSIZE, &before);
-    if (diskFull) { // a limit to the size of files is a disk that is full
-        signal(SIGXFSZ, SIG_IGN);
-        const rlimit little{4000, before.rlim_max};
-        setrlimit(RLIMIT_FSIZE, &little);
-    }
-    bool closed = false;
+    void reads_data()
     {
-        OutputTextFile file;
-        QVERIFY(OpenOutputFile(at("out.txt"), file));
-        for (int i = 0; i < 5; ++i)
-            WriteTextLine(file, QString(1000, u'x'));
-        closed = diskFull && CloseTextFile(file);
+        // lines: joined by "|", one behind each
+        const DataRows<QByteArray, QString> row("bytes", "lines");
+        row("empty", "", "");
+        row("one line without end", "a", "a|");
+        row("every end", "a\r\nb\rc\n\r\rd\r", "a|b|c|||d|");
+        row("a mark", "\xEF\xBB\xBFx\n", "x|");
+        row("nothing but a mark", "\xEF\xBB\xBF", "");
+        row("UTF-8", "\xF0\x9F\x8E\xB5\n", "\U0001F3B5|");
+        row("Windows-1252", "caf\xE9 \x80\x93\n", "café €“|");
+        row("one bad byte decides for all", "caf\xC3\xA9\n\xE9", "cafÃ©|é|");
+        row("blanks stay", " a \t\n", " a \t|");
     }
-    setrlimit(RLIMIT_FSIZE, &before);
-    QVERIFY(!closed);
-    QCOMPARE(content(at("out.txt")), QByteArray("old"));
-    QCOMPARE(QDir(mFolder->path()).entryList(QDir::Files).size(), 1);
-}
+
+    void reads()
+    {
+        QFETCH(QByteArray, bytes);
+        QFETCH(QString, lines);
+        InputTextFile file;
+        QVERIFY(OpenInputFile(writeFile(at("in.txt"), bytes), file));
+        QCOMPARE(file.countLines(), int(lines.count(QLatin1Char('|'))));
+        writeFile(at("in.txt"), "changed meanwhile");
+        QString all;
+        while (!file.atEnd())
+            all += ReadTextLine(file) + QLatin1Char('|');
+        QCOMPARE(all, lines);
+        QCOMPARE(ReadTextLine(file), QString()); // behind the end: nothing, and no box
+        QVERIFY(CloseTextFile(file));
+        QVERIFY(file.atEnd());
+    }
+
+    void opensNot()
+    {
+        InputTextFile in;
+        QVERIFY(!OpenInputFile(at("none"), in));
+        QVERIFY(!OpenInputFile(QString(), in));
+        QVERIFY(!OpenInputFile(mFolder->path(), in));
+        QVERIFY(in.atEnd());
+        OutputTextFile out;
+        for (const QString &name : {at("none/x"), mFolder->path(), QString()}) {
+            QVERIFY(!OpenOutputFile(name, out));
+            QVERIFY(!WriteTextLine(out, u"x"_s));
+            QVERIFY(!CloseTextFile(out));
+        }
+        QVERIFY(QDir(mFolder->path()).isEmpty());
+    }
+
+    void writes()
+    {
+        // A name just chosen: the backslash is part of it.
+        for (const char *name : {"out.txt", "AC\\DC \U0001F3B5.txt"}) {
+            writeFile(at(name), "an older and longer one\n");
+            OutputTextFile file;
+            QVERIFY(OpenOutputFile(at(name), file));
+            QVERIFY(WriteTextLine(file, u"\"café\";\"\U0001F3B5\""_s));
+            QVERIFY(WriteTextLine(file, QString()));
+            QCOMPARE(readFile(at(name)), QByteArray("an older and longer one\n"));
+            QVERIFY(CloseTextFile(file));
+            QCOMPARE(readFile(at(name)), QByteArray("\"caf\xC3\xA9\";\"\xF0\x9F\x8E\xB5\"\n\n"));
+            QVERIFY(!CloseTextFile(file));
+            QVERIFY(!WriteTextLine(file, u"x"_s));
+        }
+        QCOMPARE(QDir(mFolder->path()).entryList(QDir::Files).size(), 2);
+    }
+
+    void leavesTheOldFile()
+    {
+        for (const bool diskFull : {false, true}) { // else it is never closed
+            writeFile(at("out.txt"), "old");
+            rlimit before;
+            getrlimit(RLIMIT_FSIZE, &before);
+            if (diskFull) { // a limit to the size of files is a disk that is full
+                signal(SIGXFSZ, SIG_IGN);
+                const rlimit little{4000, before.rlim_max};
+                setrlimit(RLIMIT_FSIZE, &little);
+            }
+            bool closed = false;
+            {
+                OutputTextFile file;
+                QVERIFY(OpenOutputFile(at("out.txt"), file));
+                for (int i = 0; i < 5; ++i)
+                    WriteTextLine(file, QString(1000, u'x'));
+                closed = diskFull && CloseTextFile(file);
+            }
+            setrlimit(RLIMIT_FSIZE, &before);
+            QVERIFY(!closed);
+            QCOMPARE(readFile(at("out.txt")), QByteArray("old"));
+            QCOMPARE(QDir(mFolder->path()).entryList(QDir::Files).size(), 1);
+        }
+    }
+};
 
 QTEST_APPLESS_MAIN(tst_TextFiles)
 #include "tst_TextFiles.moc"
