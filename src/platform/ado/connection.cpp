@@ -63,22 +63,24 @@ int bind(sqlite3_stmt *s, const Dialect &dialect)
     return code;
 }
 
+// A cell is asked for once, not once for each thing about it: a connection without locks permits it.
 void readRow(sqlite3_stmt *s, Rows &rows)
 {
     const auto row = rows.addRow();
     for (int i = 0; i < rows.columnCount(); ++i) {
-        switch (sqlite3_column_type(s, i)) {
+        sqlite3_value *cell = sqlite3_column_value(s, i);
+        switch (sqlite3_value_type(cell)) {
         case SQLITE_INTEGER:
-            rows.setInteger(row, i, sqlite3_column_int64(s, i));
+            rows.setInteger(row, i, sqlite3_value_int64(cell));
             break;
         case SQLITE_FLOAT:
-            rows.setReal(row, i, sqlite3_column_double(s, i));
+            rows.setReal(row, i, sqlite3_value_double(cell));
             break;
         case SQLITE_NULL:
             break;
         default: {
-            const auto *bytes = reinterpret_cast<const char *>(sqlite3_column_text(s, i));
-            rows.setUtf8(row, i, {bytes ? bytes : "", std::size_t(sqlite3_column_bytes(s, i))});
+            const auto *bytes = reinterpret_cast<const char *>(sqlite3_value_text(cell));
+            rows.setUtf8(row, i, {bytes ? bytes : "", std::size_t(sqlite3_value_bytes(cell))});
         }
         }
     }
