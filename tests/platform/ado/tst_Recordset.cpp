@@ -98,22 +98,6 @@ private slots:
         }
     }
 
-    void handedOutRowsNeverChange()
-    {
-        Recordset rs = letters("abc");
-        const auto before = rs.rows();
-        rs.MoveFirst();
-        rs.Fields(1).setValue(u"changed"_s);
-        rs.MoveNext();
-        rs.Delete();
-        rs.AddNew();
-        QCOMPARE(before->rowCount(), 3);
-        QCOMPARE(before->text(0, 1), u"a"_s);
-        QCOMPARE(before->text(1, 1), u"b"_s);
-        rs.Close();
-        QCOMPARE(before->text(2, 1), u"c"_s);
-    }
-
     void keepsNumbers()
     {
         const auto rows = oneColumn();
