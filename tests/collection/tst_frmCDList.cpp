@@ -16,25 +16,250 @@ class tst_frmCDList : public ScreenTest
     Q_OBJECT
 
 private slots:
-    void anEmptyCatalogue();
-    void listsAreSortedOnTheirFirstColumn();
-    void pagesShowTheirCommandsAndCounts();
-    void deleteRemovesWhatTheDiscAloneHeld();
-    void noStillCleansUp();
-    void deleteOfTheLastRowDisablesTheList();
-    void deleteOfAnMP3Collection();
-    void aFailedDeleteTakesAllBack();
-    void theRememberedRowIsSelectedAgain();
-    void columnClicksSort();
-    void keysInAList();
-    void adding();
-    void editing();
-    void mp3CollectionsAreNotEditedYet();
-    void aFailureOfTheLoadIsTold();
+    void anEmptyCatalogue()
+    {
+        show();
+        for (const char *name : {"ColList", "SngList", "MP3List"})
+            QVERIFY(!list(name)->isEnabled() && list(name)->ListItems().Count() == 0);
+        QVERIFY(!control<QPushButton>("cmdUpdate")->isEnabled());
+        QVERIFY(!control<QPushButton>("cmdDelete")->isEnabled());
+        QCOMPARE(status(), QStringLiteral("Number of compilations in your collection: 0"));
+    }
+
+    void listsAreSortedOnTheirFirstColumn()
+    {
+        fill();
+        show();
+        QCOMPARE(column(list("ColList"), 1), texts("Best, the", "Übel"));
+        QCOMPARE(column(list("SngList"), 1), texts("alone", "Eddy", "Édith"));
+        QCOMPARE(column(list("MP3List"), 1), texts("/a", "/b"));
+        for (const char *name : {"ColList", "SngList", "MP3List"})
+            QVERIFY(list(name)->isColumnHidden(0));
+        QCOMPARE(list("SngList")->ColumnHeaders().Item(2).Text(), QStringLiteral("Artist"));
+        QCOMPARE(list("MP3List")->ColumnHeaders().Item(3).Text(), QStringLiteral("Title"));
+    }
+
+    void pagesShowTheirCommandsAndCounts()
+    {
+        fill();
+        show();
+        const struct {
+            bool commands;
+            QString count;
+        } expected[] = {{true, QStringLiteral("Number of compilations in your collection: 2")},
+                        {true, QStringLiteral("Number of albums in your collection: 3")},
+                        {false, QStringLiteral("Number of different tracks in your collection: 4")},
+                        {true, QStringLiteral("Number of MP3 collections in your collection: 2")}};
+        for (int i : {1, 2, 3, 0}) {
+            page(i);
+            QCOMPARE(control<QPushButton>("cmdInsert")->isVisible(), expected[i].commands);
+            QCOMPARE(control<QPushButton>("cmdDelete")->isVisible(), expected[i].commands);
+            QCOMPARE(control<QPushButton>("cmdDelete")->isEnabled(), expected[i].commands);
+            QVERIFY(control<QPushButton>("cmdStartReport")->isVisible());
+            QCOMPARE(control<QPushButton>("cmdStartReport")->isEnabled(), i != 3);
+            QCOMPARE(status(), expected[i].count);
+            const char *lists[] = {"ColList", "SngList", "Platenbak", "MP3List"};
+            QCOMPARE(mScreen->focusWidget(), control<QWidget>(lists[i]));
+        }
+    }
+
+    void deleteRemovesWhatTheDiscAloneHeld()
+    {
+        fill();
+        show();
+        page(1);
+        list("SngList")->setSelectedItem(list("SngList")->ListItems().Item(1)); // Mid, by alone
+        mDesktop->expectBox(QStringLiteral("yes-no [Delete] Are you sure to delete this CD?"),
+                            vbYes);
+        control<QPushButton>("cmdDelete")->click();
+        QCOMPARE(mCatalogue->rows(QStringLiteral("select Naam from Artiesten order by ID")),
+                 texts("Zed", "Édith", "Eddy"));
+        QCOMPARE(mCatalogue->rows(QStringLiteral("select ID from Tracks")), texts("1", "2", "4"));
+        QCOMPARE(column(list("SngList"), 2), texts("Aap", "Zebra"));
+        // Track 2 stands on a compilation too: it stays with its artist.
+        list("SngList")->setSelectedItem(list("SngList")->ListItems().Item(2));
+        mDesktop->expectBox(QStringLiteral("yes-no"), vbYes);
+        control<QPushButton>("cmdDelete")->click();
+        QCOMPARE(mCatalogue->count(QStringLiteral("select count(*) from Tracks where ID=2")), 1);
+        QCOMPARE(mCatalogue->count(QStringLiteral("select count(*) from Artiesten where ID=2")), 1);
+        QVERIFY(mScreen->updatesEnabled());
+    }
+
+    void noStillCleansUp()
+    {
+        fill();
+        mCatalogue->exec(QStringLiteral("insert into Artiesten values (9,'Nobody')"));
+        show();
+        mDesktop->expectBox(QStringLiteral("yes-no"), vbNo);
+        control<QPushButton>("cmdDelete")->click();
+        QCOMPARE(mCatalogue->count(QStringLiteral("select count(*) from Artiesten where ID=9")), 0);
+        QCOMPARE(mCatalogue->count(QStringLiteral("select count(*) from CDTitels")), 5);
+    }
+
+    void deleteOfTheLastRowDisablesTheList()
+    {
+        mCatalogue->exec(
+            QStringLiteral("insert into CDTitels values (1,'Only',null,'V',null,null)"));
+        show();
+        mDesktop->expectBox(QStringLiteral("yes-no"), vbYes);
+        QTest::keyClick(list("ColList"), Qt::Key_Delete);
+        QVERIFY(!list("ColList")->isEnabled());
+        QVERIFY(!list("ColList")->SelectedItem());
+        QVERIFY(!control<QPushButton>("cmdDelete")->isEnabled());
+    }
+
+    void deleteOfAnMP3Collection()
+    {
+        fill();
+        mCatalogue->exec(QStringLiteral("insert into Artiesten values (9,'Nobody')"));
+        show();
+        page(3);
+        mDesktop->expectBox(
+            QStringLiteral("yes-no [Delete] Are your sure to delete this MP3 collection?"), vbYes);
+        control<QPushButton>("cmdDelete")->click();
+        QCOMPARE(mCatalogue->rows(QStringLiteral("select ID, Map from MP3Collections")),
+                 texts("1|/b"));
+        QCOMPARE(mCatalogue->rows(QStringLiteral("select ID from MP3Files")), texts("1"));
+        QCOMPARE(mCatalogue->count(QStringLiteral("select count(*) from Artiesten where ID=9")), 1);
+    }
+
+    void aFailedDeleteTakesAllBack()
+    {
+        fill();
+        mCatalogue->exec(
+            QStringLiteral("create trigger refuse before delete on CDTitels when old.ID=2 "
+                           "begin select raise(abort, 'not this one'); end"));
+        show();
+        mDesktop->expectBox(QStringLiteral("yes-no"), vbYes);
+        mDesktop->expectBox(QStringLiteral("not this one"));
+        mDesktop->expectBox(QStringLiteral("not this one"));
+        control<QPushButton>("cmdDelete")->click();
+        QCOMPARE(mCatalogue->count(
+                     QStringLiteral("select count(*) from CompactDiscs where CDTitels_ID=2")),
+                 1);
+        QCOMPARE(mCatalogue->count(QStringLiteral("select count(*) from CDTitels")), 5);
+        QVERIFY(mScreen->updatesEnabled());
+    }
+
+    void theRememberedRowIsSelectedAgain()
+    {
+        for (int i = 1; i <= 7; ++i)
+            mCatalogue->exec(
+                QStringLiteral("insert into CDTitels values (%1,'T%1',null,'V',null,null);"
+                               "insert into CompactDiscs values (%1,%1,1,1,1,null)")
+                    .arg(i));
+        show();
+        auto *col = list("ColList");
+        QTest::keyClick(col, Qt::Key_End);
+        QCOMPARE(col->SelectedItem().Index(), 7);
+        mScreen->RefreshLists();
+        QCOMPARE(col->SelectedItem().Index(), 7);
+        mCatalogue->exec(QStringLiteral("delete from CDTitels where ID > 5"));
+        mScreen->RefreshLists();
+        QCOMPARE(col->SelectedItem().Index(), 5);
+        page(1);
+        page(0);
+        QCOMPARE(col->SelectedItem().Index(), 5);
+    }
+
+    void columnClicksSort()
+    {
+        fill();
+        show();
+        page(1);
+        emit list("SngList")->ColumnClick(3);
+        QCOMPARE(column(list("SngList"), 2), texts("Aap", "Mid", "Zebra"));
+        emit list("ColList")->ColumnClick(1);
+        QCOMPARE(list("ColList")->SortKey(), 1);
+    }
+
+    void keysInAList()
+    {
+        fill();
+        show();
+        QTest::keyClicks(list("ColList"), QStringLiteral(".-!\"#")); // signs, no Delete or Insert
+        mDesktop->expectBox(QStringLiteral("yes-no"), vbNo);
+        QTest::keyClick(list("ColList"), Qt::Key_Delete);
+        QTest::keyClick(mScreen, Qt::Key_Escape);
+        QVERIFY(mScreen->isUnloaded());
+    }
+
+    void adding()
+    {
+        fill();
+        show();
+        control<QPushButton>("cmdInsert")->click();
+        QTest::keyClick(list("ColList"), Qt::Key_Insert, Qt::ControlModifier);
+        QCOMPARE(openEditors(), texts("frmCDRoot I 0"));
+        page(1);
+        QTest::keyClick(list("SngList"), Qt::Key_Insert);
+        QTest::keyClick(list("SngList"), Qt::Key_Insert);
+        QCOMPARE(openEditors(), texts("frmCDRoot I 0", "frmCDRootE I 0", "frmCDRootE I 0"));
+    }
+
+    void editing()
+    {
+        fill();
+        show();
+        DBListViewCTL *rows = list("ColList");
+        control<QPushButton>("cmdUpdate")->click();
+        QTest::keyClick(rows, Qt::Key_Return); // one editor per record
+        QCOMPARE(openEditors(), texts("frmCDRoot U 2"));
+        const QPoint second = rows->visualRect(rows->model()->index(1, 1)).center();
+        QTest::mouseDClick(rows->viewport(), Qt::LeftButton, {}, second);
+        QCOMPARE(openEditors(), texts("frmCDRoot U 2", "frmCDRoot U 1"));
+        page(1);
+        list("SngList")->setSelectedItem(list("SngList")->ListItems().Item(2));
+        QTest::keyClick(list("SngList"), Qt::Key_Return);
+        QCOMPARE(openEditors().last(), QStringLiteral("frmCDRootE U 4"));
+    }
+
+    void mp3CollectionsAreNotEditedYet()
+    {
+        fill();
+        show();
+        page(3);
+        QVERIFY(!control<QPushButton>("cmdInsert")->isEnabled());
+        QVERIFY(!control<QPushButton>("cmdUpdate")->isEnabled());
+        QTest::keyClick(list("MP3List"), Qt::Key_Return);
+        QTest::keyClick(list("MP3List"), Qt::Key_Insert);
+        QVERIFY(openEditors().isEmpty());
+    }
+
+    void aFailureOfTheLoadIsTold()
+    {
+        mCatalogue->exec(QStringLiteral("drop table MP3Collections"));
+        mDesktop->expectBox(QStringLiteral("error [Unable to initialise list!]"));
+        mDesktop->expectBox(QStringLiteral("no such table"));
+        show();
+        QVERIFY(mScreen->updatesEnabled());
+    }
 
 private:
-    void fill();
-    void show();
+    // Two compilations, three albums, two collections. Track 2 stands on compilation 2 and album 3;
+    // artist 3 has album 5 alone.
+    void fill()
+    {
+        mCatalogue->exec(QStringLiteral(R"(
+            insert into Artiesten values (1,'Zed'),(2,'Édith'),(3,'alone'),(4,'Eddy');
+            insert into Tracks values (1,1,'One',null,null),(2,2,'Two',null,1985),(3,3,'Three',null,null),
+                (4,4,'Four',null,null);
+            insert into CDTitels values (1,'Übel',null,'V',null,null),(2,'Best, the',null,'v',null,null),
+                (3,'Zebra',2,'E',null,null),(4,'Aap',4,'E',null,null),(5,'Mid',3,'E',null,null);
+            insert into CompactDiscs values (1,1,1,1,1,null),(2,2,1,1,2,null),(3,3,1,1,2,null),(4,4,1,1,4,null),
+                (5,5,1,1,3,null);
+            insert into MP3Collections values (1,'/b','Second'),(2,'/a','First');
+            insert into MP3Files values (1,1,'x.mp3',1),(2,1,'y.mp3',2);)"));
+    }
+
+    void show()
+    {
+        mScreen = new frmCDList;
+        mScreen->Show();
+        mScreen->activateWindow();
+        QVERIFY(QTest::qWaitForWindowActive(mScreen));
+    }
+
     template <typename Control> Control *control(const char *name) const
     {
         return mScreen->findChild<Control *>(QLatin1String(name));
@@ -42,256 +267,16 @@ private:
     DBListViewCTL *list(const char *name) const { return control<DBListViewCTL>(name); }
     void page(int index) { control<QTabWidget>("CDTab")->setCurrentIndex(index); }
     QString status() const { return control<QStatusBar>("TheStatusBar")->currentMessage(); }
-    static QStringList column(DBListViewCTL *list, int n);
+    static QStringList column(DBListViewCTL *list, int n)
+    {
+        QStringList found;
+        for (int i = 1; i <= list->ListItems().Count(); ++i)
+            found.append(list->ListItems().Item(i).SubItems(n));
+        return found;
+    }
 
     QPointer<frmCDList> mScreen;
 };
-
-// Two compilations, three albums, two collections. Track 2 stands on compilation 2 and album 3;
-// artist 3 has album 5 alone.
-void tst_frmCDList::fill()
-{
-    mCatalogue->exec(QStringLiteral(R"(
-        insert into Artiesten values (1,'Zed'),(2,'Édith'),(3,'alone'),(4,'Eddy');
-        insert into Tracks values (1,1,'One',null,null),(2,2,'Two',null,1985),(3,3,'Three',null,null),
-            (4,4,'Four',null,null);
-        insert into CDTitels values (1,'Übel',null,'V',null,null),(2,'Best, the',null,'v',null,null),
-            (3,'Zebra',2,'E',null,null),(4,'Aap',4,'E',null,null),(5,'Mid',3,'E',null,null);
-        insert into CompactDiscs values (1,1,1,1,1,null),(2,2,1,1,2,null),(3,3,1,1,2,null),(4,4,1,1,4,null),
-            (5,5,1,1,3,null);
-        insert into MP3Collections values (1,'/b','Second'),(2,'/a','First');
-        insert into MP3Files values (1,1,'x.mp3',1),(2,1,'y.mp3',2);)"));
-}
-
-void tst_frmCDList::show()
-{
-    mScreen = new frmCDList;
-    mScreen->Show();
-    mScreen->activateWindow();
-    QVERIFY(QTest::qWaitForWindowActive(mScreen));
-}
-
-QStringList tst_frmCDList::column(DBListViewCTL *list, int n)
-{
-    QStringList found;
-    for (int i = 1; i <= list->ListItems().Count(); ++i)
-        found.append(list->ListItems().Item(i).SubItems(n));
-    return found;
-}
-
-void tst_frmCDList::anEmptyCatalogue()
-{
-    show();
-    for (const char *name : {"ColList", "SngList", "MP3List"})
-        QVERIFY(!list(name)->isEnabled() && list(name)->ListItems().Count() == 0);
-    QVERIFY(!control<QPushButton>("cmdUpdate")->isEnabled());
-    QVERIFY(!control<QPushButton>("cmdDelete")->isEnabled());
-    QCOMPARE(status(), QStringLiteral("Number of compilations in your collection: 0"));
-}
-
-void tst_frmCDList::listsAreSortedOnTheirFirstColumn()
-{
-    fill();
-    show();
-    QCOMPARE(column(list("ColList"), 1), texts("Best, the", "Übel"));
-    QCOMPARE(column(list("SngList"), 1), texts("alone", "Eddy", "Édith"));
-    QCOMPARE(column(list("MP3List"), 1), texts("/a", "/b"));
-    for (const char *name : {"ColList", "SngList", "MP3List"})
-        QVERIFY(list(name)->isColumnHidden(0));
-    QCOMPARE(list("SngList")->ColumnHeaders().Item(2).Text(), QStringLiteral("Artist"));
-    QCOMPARE(list("MP3List")->ColumnHeaders().Item(3).Text(), QStringLiteral("Title"));
-}
-
-void tst_frmCDList::pagesShowTheirCommandsAndCounts()
-{
-    fill();
-    show();
-    const struct {
-        bool commands;
-        QString count;
-    } expected[] = {{true, QStringLiteral("Number of compilations in your collection: 2")},
-                    {true, QStringLiteral("Number of albums in your collection: 3")},
-                    {false, QStringLiteral("Number of different tracks in your collection: 4")},
-                    {true, QStringLiteral("Number of MP3 collections in your collection: 2")}};
-    for (int i : {1, 2, 3, 0}) {
-        page(i);
-        QCOMPARE(control<QPushButton>("cmdInsert")->isVisible(), expected[i].commands);
-        QCOMPARE(control<QPushButton>("cmdDelete")->isVisible(), expected[i].commands);
-        QCOMPARE(control<QPushButton>("cmdDelete")->isEnabled(), expected[i].commands);
-        QVERIFY(control<QPushButton>("cmdStartReport")->isVisible());
-        QCOMPARE(control<QPushButton>("cmdStartReport")->isEnabled(), i != 3);
-        QCOMPARE(status(), expected[i].count);
-        const char *lists[] = {"ColList", "SngList", "Platenbak", "MP3List"};
-        QCOMPARE(mScreen->focusWidget(), control<QWidget>(lists[i]));
-    }
-}
-
-void tst_frmCDList::deleteRemovesWhatTheDiscAloneHeld()
-{
-    fill();
-    show();
-    page(1);
-    list("SngList")->setSelectedItem(list("SngList")->ListItems().Item(1)); // Mid, by alone
-    mDesktop->expectBox(QStringLiteral("yes-no [Delete] Are you sure to delete this CD?"), vbYes);
-    control<QPushButton>("cmdDelete")->click();
-    QCOMPARE(mCatalogue->rows(QStringLiteral("select Naam from Artiesten order by ID")),
-             texts("Zed", "Édith", "Eddy"));
-    QCOMPARE(mCatalogue->rows(QStringLiteral("select ID from Tracks")), texts("1", "2", "4"));
-    QCOMPARE(column(list("SngList"), 2), texts("Aap", "Zebra"));
-    // Track 2 stands on a compilation too: it stays with its artist.
-    list("SngList")->setSelectedItem(list("SngList")->ListItems().Item(2));
-    mDesktop->expectBox(QStringLiteral("yes-no"), vbYes);
-    control<QPushButton>("cmdDelete")->click();
-    QCOMPARE(mCatalogue->count(QStringLiteral("select count(*) from Tracks where ID=2")), 1);
-    QCOMPARE(mCatalogue->count(QStringLiteral("select count(*) from Artiesten where ID=2")), 1);
-    QVERIFY(mScreen->updatesEnabled());
-}
-
-void tst_frmCDList::noStillCleansUp()
-{
-    fill();
-    mCatalogue->exec(QStringLiteral("insert into Artiesten values (9,'Nobody')"));
-    show();
-    mDesktop->expectBox(QStringLiteral("yes-no"), vbNo);
-    control<QPushButton>("cmdDelete")->click();
-    QCOMPARE(mCatalogue->count(QStringLiteral("select count(*) from Artiesten where ID=9")), 0);
-    QCOMPARE(mCatalogue->count(QStringLiteral("select count(*) from CDTitels")), 5);
-}
-
-void tst_frmCDList::deleteOfTheLastRowDisablesTheList()
-{
-    mCatalogue->exec(QStringLiteral("insert into CDTitels values (1,'Only',null,'V',null,null)"));
-    show();
-    mDesktop->expectBox(QStringLiteral("yes-no"), vbYes);
-    QTest::keyClick(list("ColList"), Qt::Key_Delete);
-    QVERIFY(!list("ColList")->isEnabled());
-    QVERIFY(!list("ColList")->SelectedItem());
-    QVERIFY(!control<QPushButton>("cmdDelete")->isEnabled());
-}
-
-void tst_frmCDList::deleteOfAnMP3Collection()
-{
-    fill();
-    mCatalogue->exec(QStringLiteral("insert into Artiesten values (9,'Nobody')"));
-    show();
-    page(3);
-    mDesktop->expectBox(
-        QStringLiteral("yes-no [Delete] Are your sure to delete this MP3 collection?"), vbYes);
-    control<QPushButton>("cmdDelete")->click();
-    QCOMPARE(mCatalogue->rows(QStringLiteral("select ID, Map from MP3Collections")), texts("1|/b"));
-    QCOMPARE(mCatalogue->rows(QStringLiteral("select ID from MP3Files")), texts("1"));
-    QCOMPARE(mCatalogue->count(QStringLiteral("select count(*) from Artiesten where ID=9")), 1);
-}
-
-void tst_frmCDList::aFailedDeleteTakesAllBack()
-{
-    fill();
-    mCatalogue->exec(QStringLiteral("create trigger refuse before delete on CDTitels when old.ID=2 "
-                                    "begin select raise(abort, 'not this one'); end"));
-    show();
-    mDesktop->expectBox(QStringLiteral("yes-no"), vbYes);
-    mDesktop->expectBox(QStringLiteral("not this one"));
-    mDesktop->expectBox(QStringLiteral("not this one"));
-    control<QPushButton>("cmdDelete")->click();
-    QCOMPARE(
-        mCatalogue->count(QStringLiteral("select count(*) from CompactDiscs where CDTitels_ID=2")),
-        1);
-    QCOMPARE(mCatalogue->count(QStringLiteral("select count(*) from CDTitels")), 5);
-    QVERIFY(mScreen->updatesEnabled());
-}
-
-void tst_frmCDList::theRememberedRowIsSelectedAgain()
-{
-    for (int i = 1; i <= 7; ++i)
-        mCatalogue->exec(QStringLiteral("insert into CDTitels values (%1,'T%1',null,'V',null,null);"
-                                        "insert into CompactDiscs values (%1,%1,1,1,1,null)")
-                             .arg(i));
-    show();
-    auto *col = list("ColList");
-    QTest::keyClick(col, Qt::Key_End);
-    QCOMPARE(col->SelectedItem().Index(), 7);
-    mScreen->RefreshLists();
-    QCOMPARE(col->SelectedItem().Index(), 7);
-    mCatalogue->exec(QStringLiteral("delete from CDTitels where ID > 5"));
-    mScreen->RefreshLists();
-    QCOMPARE(col->SelectedItem().Index(), 5);
-    page(1);
-    page(0);
-    QCOMPARE(col->SelectedItem().Index(), 5);
-}
-
-void tst_frmCDList::columnClicksSort()
-{
-    fill();
-    show();
-    page(1);
-    emit list("SngList")->ColumnClick(3);
-    QCOMPARE(column(list("SngList"), 2), texts("Aap", "Mid", "Zebra"));
-    emit list("ColList")->ColumnClick(1);
-    QCOMPARE(list("ColList")->SortKey(), 1);
-}
-
-void tst_frmCDList::keysInAList()
-{
-    fill();
-    show();
-    QTest::keyClicks(list("ColList"), QStringLiteral(".-!\"#")); // signs, no Delete or Insert
-    mDesktop->expectBox(QStringLiteral("yes-no"), vbNo);
-    QTest::keyClick(list("ColList"), Qt::Key_Delete);
-    QTest::keyClick(mScreen, Qt::Key_Escape);
-    QVERIFY(mScreen->isUnloaded());
-}
-
-void tst_frmCDList::adding()
-{
-    fill();
-    show();
-    control<QPushButton>("cmdInsert")->click();
-    QTest::keyClick(list("ColList"), Qt::Key_Insert, Qt::ControlModifier);
-    QCOMPARE(openEditors(), texts("frmCDRoot I 0"));
-    page(1);
-    QTest::keyClick(list("SngList"), Qt::Key_Insert);
-    QTest::keyClick(list("SngList"), Qt::Key_Insert);
-    QCOMPARE(openEditors(), texts("frmCDRoot I 0", "frmCDRootE I 0", "frmCDRootE I 0"));
-}
-
-void tst_frmCDList::editing()
-{
-    fill();
-    show();
-    DBListViewCTL *rows = list("ColList");
-    control<QPushButton>("cmdUpdate")->click();
-    QTest::keyClick(rows, Qt::Key_Return); // one editor per record
-    QCOMPARE(openEditors(), texts("frmCDRoot U 2"));
-    const QPoint second = rows->visualRect(rows->model()->index(1, 1)).center();
-    QTest::mouseDClick(rows->viewport(), Qt::LeftButton, {}, second);
-    QCOMPARE(openEditors(), texts("frmCDRoot U 2", "frmCDRoot U 1"));
-    page(1);
-    list("SngList")->setSelectedItem(list("SngList")->ListItems().Item(2));
-    QTest::keyClick(list("SngList"), Qt::Key_Return);
-    QCOMPARE(openEditors().last(), QStringLiteral("frmCDRootE U 4"));
-}
-
-void tst_frmCDList::mp3CollectionsAreNotEditedYet()
-{
-    fill();
-    show();
-    page(3);
-    QVERIFY(!control<QPushButton>("cmdInsert")->isEnabled());
-    QVERIFY(!control<QPushButton>("cmdUpdate")->isEnabled());
-    QTest::keyClick(list("MP3List"), Qt::Key_Return);
-    QTest::keyClick(list("MP3List"), Qt::Key_Insert);
-    QVERIFY(openEditors().isEmpty());
-}
-
-void tst_frmCDList::aFailureOfTheLoadIsTold()
-{
-    mCatalogue->exec(QStringLiteral("drop table MP3Collections"));
-    mDesktop->expectBox(QStringLiteral("error [Unable to initialise list!]"));
-    mDesktop->expectBox(QStringLiteral("no such table"));
-    show();
-    QVERIFY(mScreen->updatesEnabled());
-}
 
 QTEST_MAIN(tst_frmCDList)
 #include "tst_frmCDList.moc"

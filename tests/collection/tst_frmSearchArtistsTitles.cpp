@@ -3,6 +3,7 @@
 #include "collection/frmSearchArtistsTitles.h"
 #include "controls/DBListViewCTL.h"
 #include "controls/trackgrid.h"
+#include "support/fulldisk.h"
 #include "support/ordinaryuser.h"
 #include "support/referencelike.h"
 #include "support/screentest.h"
@@ -12,8 +13,6 @@
 #include <QRadioButton>
 #include <QStatusBar>
 #include <QTabBar>
-#include <csignal>
-#include <sys/resource.h>
 
 /// The search on a real catalogue file, held against a slow matcher of its own.
 class tst_frmSearchArtistsTitles : public ScreenTest
@@ -331,15 +330,10 @@ private slots:
         writeFile(name, "mine");
         search();
         mDesktop->expectBox(u"already exists!"_s, vbYes);
-        if (diskFull) { // a limit to the size of files is a disk that is full
-            rlimit before;
-            getrlimit(RLIMIT_FSIZE, &before);
-            signal(SIGXFSZ, SIG_IGN);
-            const rlimit little{4000, before.rlim_max};
-            setrlimit(RLIMIT_FSIZE, &little);
+        if (diskFull) {
+            const FullDisk full(4000);
             mDesktop->expectBox(u"The file could not be written"_s);
             exportTo(name);
-            setrlimit(RLIMIT_FSIZE, &before);
         } else {
             QFile::setPermissions(folder, QFile::ReadOwner | QFile::ExeOwner | QFile::ReadOther |
                                               QFile::ExeOther);

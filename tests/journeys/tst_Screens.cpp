@@ -27,17 +27,6 @@
 #include <QTimer>
 #include <functional>
 
-/// What holds for every screen in both languages: each text comes from the table, is shown whole,
-/// and each control has a name that a screen reader can say.
-class tst_Screens : public QObject
-{
-    Q_OBJECT
-
-private slots:
-    void everyScreen_data();
-    void everyScreen();
-};
-
 namespace
 {
 
@@ -112,61 +101,69 @@ bool isPartOfAnother(const QWidget *w)
 
 } // namespace
 
-void tst_Screens::everyScreen_data()
+/// What holds for every screen in both languages: each text comes from the table, is shown whole,
+/// and each control has a name that a screen reader can say.
+class tst_Screens : public QObject
 {
-    QTest::addColumn<int>("language");
-    QTest::addColumn<Make>("make");
-    const std::pair<const char *, Make> screens[] = {
-        {"frmSplash", make<frmSplash>()},
-        {"frmHelp", make<frmHelp>()},
-        {"frmCDList", make<frmCDList>()},
-        {"frmCDRoot", makeEditor<frmCDRoot>()},
-        {"frmCDRootE", makeEditor<frmCDRootE>()},
-        {"frmImportWizard", make<frmImportWizard>()},
-        {"frmImportBusy", make<frmImportBusy>()},
-        {"frmImport", make<frmImport>()},
-        {"frmImportDBBusy", make<frmImportDBBusy>()},
-        {"CompilationReport", makeReport<CompilationReport>()},
-        {"AlbumReport", makeReport<AlbumReport>()},
-        {"PlatenbakReport", makeReport<PlatenbakReport>()},
-        {"frmPageSetup", makePageSetup}};
-    for (const auto &[name, make] : screens) {
-        QTest::newRow(QByteArray(name).append(", English")) << languageEnglish << make;
-        QTest::newRow(QByteArray(name).append(", Dutch")) << languageDutch << make;
-    }
-}
+    Q_OBJECT
 
-void tst_Screens::everyScreen()
-{
-    QFETCH(int, language);
-    QFETCH(Make, make);
-    gLanguage = language;
-    ScriptedDesktop desktop;
-    TestCatalogue catalogue;
-    Form *screen = make();
-    QCOMPARE(screen->Name(),
-             QString::fromLatin1(QTest::currentDataTag()).section(QLatin1Char(','), 0, 0));
-    for (QTimer *timer : screen->findChildren<QTimer *>())
-        timer->stop();
-    screen->Show();
-    QVERIFY(QTest::qWaitForWindowExposed(screen));
-    QVERIFY2(!screen->windowTitle().isEmpty(), "a window without a title");
-
-    for (const QWidget *w : screen->findChildren<QWidget *>()) {
-        const QByteArray name = w->objectName().toLatin1();
-        const QString text = textOf(w);
-        QVERIFY2(!text.contains(QLatin1String("Unknown")) &&
-                     !text.contains(QLatin1String("Onbekend")),
-                 name);
-        if (isPartOfAnother(w) || !w->isVisible())
-            continue;
-        QVERIFY2(!needsName(w) || hasName(w, screen),
-                 QByteArray(name).append(": no name for a screen reader"));
-        QVERIFY2(!isCut(w), QByteArray(name).append(": text cut: ").append(text.toUtf8()));
+private slots:
+    void everyScreen_data()
+    {
+        QTest::addColumn<int>("language");
+        QTest::addColumn<Make>("make");
+        const std::pair<const char *, Make> screens[] = {
+            {"frmSplash", make<frmSplash>()},
+            {"frmHelp", make<frmHelp>()},
+            {"frmCDList", make<frmCDList>()},
+            {"frmCDRoot", makeEditor<frmCDRoot>()},
+            {"frmCDRootE", makeEditor<frmCDRootE>()},
+            {"frmImportWizard", make<frmImportWizard>()},
+            {"frmImportBusy", make<frmImportBusy>()},
+            {"frmImport", make<frmImport>()},
+            {"frmImportDBBusy", make<frmImportDBBusy>()},
+            {"CompilationReport", makeReport<CompilationReport>()},
+            {"AlbumReport", makeReport<AlbumReport>()},
+            {"PlatenbakReport", makeReport<PlatenbakReport>()},
+            {"frmPageSetup", makePageSetup}};
+        for (const auto &[name, make] : screens) {
+            QTest::newRow(QByteArray(name).append(", English")) << languageEnglish << make;
+            QTest::newRow(QByteArray(name).append(", Dutch")) << languageDutch << make;
+        }
     }
-    screen->Unload();
-    QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
-}
+
+    void everyScreen()
+    {
+        QFETCH(int, language);
+        QFETCH(Make, make);
+        gLanguage = language;
+        ScriptedDesktop desktop;
+        TestCatalogue catalogue;
+        Form *screen = make();
+        QCOMPARE(screen->Name(),
+                 QString::fromLatin1(QTest::currentDataTag()).section(QLatin1Char(','), 0, 0));
+        for (QTimer *timer : screen->findChildren<QTimer *>())
+            timer->stop();
+        screen->Show();
+        QVERIFY(QTest::qWaitForWindowExposed(screen));
+        QVERIFY2(!screen->windowTitle().isEmpty(), "a window without a title");
+
+        for (const QWidget *w : screen->findChildren<QWidget *>()) {
+            const QByteArray name = w->objectName().toLatin1();
+            const QString text = textOf(w);
+            QVERIFY2(!text.contains(QLatin1String("Unknown")) &&
+                         !text.contains(QLatin1String("Onbekend")),
+                     name);
+            if (isPartOfAnother(w) || !w->isVisible())
+                continue;
+            QVERIFY2(!needsName(w) || hasName(w, screen),
+                     QByteArray(name).append(": no name for a screen reader"));
+            QVERIFY2(!isCut(w), QByteArray(name).append(": text cut: ").append(text.toUtf8()));
+        }
+        screen->Unload();
+        QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+    }
+};
 
 QTEST_MAIN(tst_Screens)
 #include "tst_Screens.moc"

@@ -23,23 +23,227 @@ class tst_Start : public QObject
     Q_OBJECT
 
 private slots:
-    void init();
-    void cleanup();
+    void init() { mDesktop = std::make_unique<ScriptedDesktop>(); }
+
+    void cleanup()
+    {
+        mDesktop->verifyAllCame();
+        mDesktop.reset();
+    }
+
     void firstAndSecondStart_data() { languages(); }
-    void firstAndSecondStart();
+    void firstAndSecondStart()
+    {
+        QFETCH(int, language);
+        QTemporaryDir home;
+        qputenv("XDG_DATA_HOME", home.path().toLocal8Bit());
+        mDesktop->folder = programfolder::userFolder();
+        for (int start = 1; start <= 2; ++start) {
+            if (start == 2)
+                storeLanguage(language);
+            Program program(*mDesktop);
+            QVERIFY(program.start());
+            QVERIFY(program.screen("frmCDList"));
+            QVERIFY(!program.screen("frmSplash"));
+            QCOMPARE(bool(program.screen("frmHelp")), start == 1);
+            const bool dutch = start == 2 && language == languageDutch;
+            QCOMPARE(program.frame().windowTitle(), dutch
+                                                        ? QStringLiteral("Dr. Orvanta's Liedkist")
+                                                        : QStringLiteral("Dr. Orvanta's Songcase"));
+            QCOMPARE(program.frame().QMainWindow::size(), QSize(1000, 667));
+            QCOMPARE(gConnection->State(), ADODB::adStateOpen);
+            QVERIFY(program.end());
+            QVERIFY(!gConnection);
+        }
+        QCOMPARE(QDir(mDesktop->folder).entryList(QDir::Files), texts("Compact4.orv"));
+    }
+
     void aMissingCatalogueEndsTheProgram_data() { languages(); }
-    void aMissingCatalogueEndsTheProgram();
-    void aFileThatCannotBeUsedIsLeftAsItWas_data();
-    void aFileThatCannotBeUsedIsLeftAsItWas();
+    void aMissingCatalogueEndsTheProgram()
+    {
+        QFETCH(int, language);
+        storeLanguage(language);
+        const bool dutch = language == languageDutch;
+        writeFile(mDesktop->folder + QStringLiteral("/Compact3.orv"), "old");
+        const QString file = mDesktop->folder + QStringLiteral("/Compact4.orv");
+        mDesktop->expectBox(
+            (dutch ? QStringLiteral("[Bestand niet gevonden] Er kan geen verbinding met "
+                                    "de database worden gemaakt!\rHet bestand ")
+                   : QStringLiteral("[File not found] Unable to connect with "
+                                    "database!\rFile ")) +
+            file);
+        Program program(*mDesktop);
+        QVERIFY(!program.start());
+        QVERIFY(Form::openForms().isEmpty());
+        QVERIFY(!QFile::exists(file));
+    }
+
+    void aFileThatCannotBeUsedIsLeftAsItWas_data()
+    {
+        QTest::addColumn<QString>("fault");
+        QTest::addColumn<QString>("said");
+        QTest::newRow("text") << QStringLiteral("text") << QStringLiteral("not a catalogue");
+        QTest::newRow("truncated") << QStringLiteral("truncated") << QStringLiteral("damaged");
+        QTest::newRow("read-only") << QStringLiteral("readonly") << QStringLiteral("read-only");
+        QTest::newRow("locked") << QStringLiteral("locked") << QStringLiteral("in use");
+    }
+
+    void aFileThatCannotBeUsedIsLeftAsItWas()
+    {
+        QFETCH(QString, fault);
+        QFETCH(QString, said);
+        makeCatalogue();
+        const QString file = mDesktop->folder + QStringLiteral("/Compact4.orv");
+        sqlite3 *other = nullptr;
+        if (fault == QLatin1String("text"))
+            writeFile(file, QByteArray(5000, 'x'));
+        else if (fault == QLatin1String("truncated"))
+            QVERIFY(QFile::resize(file, 4096 * 3));
+        else if (fault == QLatin1String("readonly"))
+            QVERIFY(QFile::setPermissions(file, QFile::ReadOwner));
+        if (fault == QLatin1String("locked")) {
+            sqlite3_open(file.toUtf8().constData(), &other);
+            QCOMPARE(sqlite3_exec(other, "BEGIN EXCLUSIVE", nullptr, nullptr, nullptr), SQLITE_OK);
+        }
+        const QByteArray before = readFile(file);
+
+        mDesktop->expectBox(QStringLiteral("error [System error] ADO Connect Error: "));
+        mDesktop->expectBox(said);
+        mDesktop->expectBox(QStringLiteral("[Unable to initialise list!]"));
+        mDesktop->expectBox(said);
+        {
+            Program program(*mDesktop);
+            QVERIFY2(program.start(), "the frame stays up");
+            QVERIFY(program.frame().isVisible());
+            mDesktop->verifyAllCame();
+            mDesktop->expectBox(QStringLiteral("[Systeemfout]"));
+            mDesktop->expectBox(QStringLiteral("[System error]"));
+            QVERIFY(program.end());
+        }
+        sqlite3_close(other);
+        QCOMPARE(readFile(file), before);
+        QCOMPARE(QDir(mDesktop->folder).entryList({QStringLiteral("Compact4*")}).size(), 1);
+    }
+
     void changeOfLanguage_data() { languages(); }
-    void changeOfLanguage();
+    void changeOfLanguage()
+    {
+        QFETCH(int, language);
+        makeCatalogue();
+        storeLanguage(language);
+        const bool dutch = language == languageDutch;
+        const char *own = dutch ? "mnuNederlands" : "mnuEngels",
+                   *other = dutch ? "mnuEngels" : "mnuNederlands";
+        const int otherLanguage = dutch ? languageEnglish : languageDutch;
+        {
+            Program program(*mDesktop);
+            QVERIFY(program.start());
+            program.choose(own);
+            QVERIFY2(mDesktop->boxes.isEmpty(), "the current language is no change");
+            mDesktop->expectBox(
+                dutch ? QStringLiteral("information [Preferences] If you close and restart this "
+                                       "program, the preferred language will be English.")
+                      : QStringLiteral("information [Instellingen] De taalinstellingen worden "
+                                       "van toepassing indien u dit programma afsluit"));
+            program.choose(other);
+            QVERIFY(program.entry(other)->isChecked() && !program.entry(own)->isChecked());
+            QCOMPARE(gLanguage, language);
+            program.choose("mnuHelp");
+            QCOMPARE(program.entry("Over")->text(),
+                     dutch ? QStringLiteral("&Over Liedkist") : QStringLiteral("&About Songcase"));
+            QVERIFY(program.end());
+        }
+        Program program(*mDesktop);
+        QVERIFY(program.start());
+        QCOMPARE(gLanguage, otherLanguage);
+        QVERIFY(program.end());
+    }
+
     void aboutAndHelp_data() { languages(); }
-    void aboutAndHelp();
-    void keysOfTheMenu();
-    void whatComesLaterIsDisabled();
+    void aboutAndHelp()
+    {
+        QFETCH(int, language);
+        makeCatalogue();
+        storeLanguage(language);
+        Program program(*mDesktop);
+        QVERIFY(program.start());
+        mDesktop->expectModal(QStringLiteral("frmSplash"), [](Form &splash) {
+            QCOMPARE(splash.findChild<QLabel *>(QStringLiteral("lblVersion"))->text(),
+                     QStringLiteral("Version " SONGCASE_VERSION));
+            QCOMPARE(splash.findChild<QLabel *>(QStringLiteral("lblAuthor"))->text(), QString());
+            QTest::keyClick(&splash, Qt::Key_Space);
+        });
+        program.choose("tbCredits");
+        const QString author = language == languageDutch
+                                   ? QStringLiteral("Door Arend K. Vossel")
+                                   : QStringLiteral("Created by Arend K. Vossel");
+        QCOMPARE(program.control<QLabel>("frmSplash", "lblAuthor")->text(), author);
+        QVERIFY(!program.screen("frmSplash")->isVisible());
+
+        program.choose("mnuHelp");
+        QPointer<Form> help = program.screen("frmHelp");
+        program.choose("tbHelp");
+        QCOMPARE(program.screen("frmHelp"), help.data());
+        auto *link = program.control<QLabel>("frmHelp", "Link");
+        emit link->linkActivated(QStringLiteral("guide"));
+        QCOMPARE(mDesktop->addresses.size(), 1);
+        QVERIFY(mDesktop->addresses.first().endsWith(language == languageDutch
+                                                         ? QLatin1String("guide/nl/index.html")
+                                                         : QLatin1String("guide/en/index.html")));
+        QVERIFY(QFile::exists(QUrl(mDesktop->addresses.first()).toLocalFile()));
+        mDesktop->browserThere = false;
+        mDesktop->expectBox(QStringLiteral("error [] No browser detected!").mid(0, 5));
+        emit link->linkActivated(QStringLiteral("guide"));
+        QVERIFY(mDesktop->boxes.last().endsWith(QLatin1String("No browser detected!")));
+        QVERIFY(program.end());
+    }
+
+    void keysOfTheMenu()
+    {
+        makeCatalogue();
+        storeLanguage(languageEnglish);
+        Program program(*mDesktop);
+        QVERIFY(program.start());
+        for (const QString &line :
+             texts("Import Ctrl+Ins", "mnuSave Ctrl+S", "mnuConvertDatabase Shift+Ins",
+                   "mnuSearchArtistsTitles Ctrl+F1", "mnuCDInsert F2", "mnuInsertEnkelCD F3",
+                   "mnuMP3 F4", "mnuUpdate F5", "mnuCDDB F6", "mnuRegisterCDDB F7", "mnuProxy F8",
+                   "mnuHelp F1", "Over Ctrl+I", "mnuOverCDDB Ctrl+G")) {
+            const QByteArray entry = line.section(QLatin1Char(' '), 0, 0).toLatin1();
+            QCOMPARE(program.entry(entry.constData())->shortcut(),
+                     QKeySequence(line.section(QLatin1Char(' '), 1)));
+        }
+        QVERIFY(program.screen("frmCDList")->Unload());
+        QTest::keyClick(&program.frame(), Qt::Key_F5);
+        QVERIFY(program.screen("frmCDList"));
+        QVERIFY(program.end());
+    }
+
+    void whatComesLaterIsDisabled()
+    {
+        makeCatalogue();
+        storeLanguage(languageEnglish);
+        Program program(*mDesktop);
+        QVERIFY(program.start());
+        for (const char *entry :
+             {"Import", "mnuSave", "mnuCDInsert", "mnuInsertEnkelCD", "mnuUpdate",
+              "mnuSearchArtistsTitles", "mnuHelp", "Over", "mnuEngels", "tbImport", "tbSave",
+              "tbQuicksearch", "tbCollection", "tbCredits", "tbHelp"})
+            QVERIFY2(program.entry(entry)->isEnabled(), entry);
+        for (const char *entry :
+             {"mnuConvertDatabase", "mnuMP3", "mnuCDDB", "mnuProxy", "mnuOverCDDB", "tbCDDB"})
+            QVERIFY2(!program.entry(entry)->isEnabled(), entry);
+        QVERIFY(program.end());
+    }
 
 private:
-    static void languages();
+    static void languages()
+    {
+        QTest::addColumn<int>("language");
+        QTest::newRow("English") << languageEnglish;
+        QTest::newRow("Dutch") << languageDutch;
+    }
+
     void makeCatalogue()
     {
         cataloguefile::create(mDesktop->folder + QStringLiteral("/Compact4.orv"));
@@ -47,222 +251,6 @@ private:
 
     std::unique_ptr<ScriptedDesktop> mDesktop;
 };
-
-void tst_Start::languages()
-{
-    QTest::addColumn<int>("language");
-    QTest::newRow("English") << languageEnglish;
-    QTest::newRow("Dutch") << languageDutch;
-}
-
-void tst_Start::init()
-{
-    mDesktop = std::make_unique<ScriptedDesktop>();
-}
-
-void tst_Start::cleanup()
-{
-    mDesktop->verifyAllCame();
-    mDesktop.reset();
-}
-
-void tst_Start::firstAndSecondStart()
-{
-    QFETCH(int, language);
-    QTemporaryDir home;
-    qputenv("XDG_DATA_HOME", home.path().toLocal8Bit());
-    mDesktop->folder = programfolder::userFolder();
-    for (int start = 1; start <= 2; ++start) {
-        if (start == 2)
-            storeLanguage(language);
-        Program program(*mDesktop);
-        QVERIFY(program.start());
-        QVERIFY(program.screen("frmCDList"));
-        QVERIFY(!program.screen("frmSplash"));
-        QCOMPARE(bool(program.screen("frmHelp")), start == 1);
-        const bool dutch = start == 2 && language == languageDutch;
-        QCOMPARE(program.frame().windowTitle(), dutch ? QStringLiteral("Dr. Orvanta's Liedkist")
-                                                      : QStringLiteral("Dr. Orvanta's Songcase"));
-        QCOMPARE(program.frame().QMainWindow::size(), QSize(1000, 667));
-        QCOMPARE(gConnection->State(), ADODB::adStateOpen);
-        QVERIFY(program.end());
-        QVERIFY(!gConnection);
-    }
-    QCOMPARE(QDir(mDesktop->folder).entryList(QDir::Files), texts("Compact4.orv"));
-}
-
-void tst_Start::aMissingCatalogueEndsTheProgram()
-{
-    QFETCH(int, language);
-    storeLanguage(language);
-    const bool dutch = language == languageDutch;
-    writeFile(mDesktop->folder + QStringLiteral("/Compact3.orv"), "old");
-    const QString file = mDesktop->folder + QStringLiteral("/Compact4.orv");
-    mDesktop->expectBox((dutch
-                             ? QStringLiteral("[Bestand niet gevonden] Er kan geen verbinding met "
-                                              "de database worden gemaakt!\rHet bestand ")
-                             : QStringLiteral("[File not found] Unable to connect with "
-                                              "database!\rFile ")) +
-                        file);
-    Program program(*mDesktop);
-    QVERIFY(!program.start());
-    QVERIFY(Form::openForms().isEmpty());
-    QVERIFY(!QFile::exists(file));
-}
-
-void tst_Start::aFileThatCannotBeUsedIsLeftAsItWas_data()
-{
-    QTest::addColumn<QString>("fault");
-    QTest::addColumn<QString>("said");
-    QTest::newRow("text") << QStringLiteral("text") << QStringLiteral("not a catalogue");
-    QTest::newRow("truncated") << QStringLiteral("truncated") << QStringLiteral("damaged");
-    QTest::newRow("read-only") << QStringLiteral("readonly") << QStringLiteral("read-only");
-    QTest::newRow("locked") << QStringLiteral("locked") << QStringLiteral("in use");
-}
-
-void tst_Start::aFileThatCannotBeUsedIsLeftAsItWas()
-{
-    QFETCH(QString, fault);
-    QFETCH(QString, said);
-    makeCatalogue();
-    const QString file = mDesktop->folder + QStringLiteral("/Compact4.orv");
-    sqlite3 *other = nullptr;
-    if (fault == QLatin1String("text"))
-        writeFile(file, QByteArray(5000, 'x'));
-    else if (fault == QLatin1String("truncated"))
-        QVERIFY(QFile::resize(file, 4096 * 3));
-    else if (fault == QLatin1String("readonly"))
-        QVERIFY(QFile::setPermissions(file, QFile::ReadOwner));
-    if (fault == QLatin1String("locked")) {
-        sqlite3_open(file.toUtf8().constData(), &other);
-        QCOMPARE(sqlite3_exec(other, "BEGIN EXCLUSIVE", nullptr, nullptr, nullptr), SQLITE_OK);
-    }
-    const QByteArray before = readFile(file);
-
-    mDesktop->expectBox(QStringLiteral("error [System error] ADO Connect Error: "));
-    mDesktop->expectBox(said);
-    mDesktop->expectBox(QStringLiteral("[Unable to initialise list!]"));
-    mDesktop->expectBox(said);
-    {
-        Program program(*mDesktop);
-        QVERIFY2(program.start(), "the frame stays up");
-        QVERIFY(program.frame().isVisible());
-        mDesktop->verifyAllCame();
-        mDesktop->expectBox(QStringLiteral("[Systeemfout]"));
-        mDesktop->expectBox(QStringLiteral("[System error]"));
-        QVERIFY(program.end());
-    }
-    sqlite3_close(other);
-    QCOMPARE(readFile(file), before);
-    QCOMPARE(QDir(mDesktop->folder).entryList({QStringLiteral("Compact4*")}).size(), 1);
-}
-
-void tst_Start::changeOfLanguage()
-{
-    QFETCH(int, language);
-    makeCatalogue();
-    storeLanguage(language);
-    const bool dutch = language == languageDutch;
-    const char *own = dutch ? "mnuNederlands" : "mnuEngels",
-               *other = dutch ? "mnuEngels" : "mnuNederlands";
-    const int otherLanguage = dutch ? languageEnglish : languageDutch;
-    {
-        Program program(*mDesktop);
-        QVERIFY(program.start());
-        program.choose(own);
-        QVERIFY2(mDesktop->boxes.isEmpty(), "the current language is no change");
-        mDesktop->expectBox(
-            dutch ? QStringLiteral("information [Preferences] If you close and restart this "
-                                   "program, the preferred language will be English.")
-                  : QStringLiteral("information [Instellingen] De taalinstellingen worden "
-                                   "van toepassing indien u dit programma afsluit"));
-        program.choose(other);
-        QVERIFY(program.entry(other)->isChecked() && !program.entry(own)->isChecked());
-        QCOMPARE(gLanguage, language);
-        program.choose("mnuHelp");
-        QCOMPARE(program.entry("Over")->text(),
-                 dutch ? QStringLiteral("&Over Liedkist") : QStringLiteral("&About Songcase"));
-        QVERIFY(program.end());
-    }
-    Program program(*mDesktop);
-    QVERIFY(program.start());
-    QCOMPARE(gLanguage, otherLanguage);
-    QVERIFY(program.end());
-}
-
-void tst_Start::aboutAndHelp()
-{
-    QFETCH(int, language);
-    makeCatalogue();
-    storeLanguage(language);
-    Program program(*mDesktop);
-    QVERIFY(program.start());
-    mDesktop->expectModal(QStringLiteral("frmSplash"), [](Form &splash) {
-        QCOMPARE(splash.findChild<QLabel *>(QStringLiteral("lblVersion"))->text(),
-                 QStringLiteral("Version " SONGCASE_VERSION));
-        QCOMPARE(splash.findChild<QLabel *>(QStringLiteral("lblAuthor"))->text(), QString());
-        QTest::keyClick(&splash, Qt::Key_Space);
-    });
-    program.choose("tbCredits");
-    const QString author = language == languageDutch ? QStringLiteral("Door Arend K. Vossel")
-                                                     : QStringLiteral("Created by Arend K. Vossel");
-    QCOMPARE(program.control<QLabel>("frmSplash", "lblAuthor")->text(), author);
-    QVERIFY(!program.screen("frmSplash")->isVisible());
-
-    program.choose("mnuHelp");
-    QPointer<Form> help = program.screen("frmHelp");
-    program.choose("tbHelp");
-    QCOMPARE(program.screen("frmHelp"), help.data());
-    auto *link = program.control<QLabel>("frmHelp", "Link");
-    emit link->linkActivated(QStringLiteral("guide"));
-    QCOMPARE(mDesktop->addresses.size(), 1);
-    QVERIFY(mDesktop->addresses.first().endsWith(language == languageDutch
-                                                     ? QLatin1String("guide/nl/index.html")
-                                                     : QLatin1String("guide/en/index.html")));
-    QVERIFY(QFile::exists(QUrl(mDesktop->addresses.first()).toLocalFile()));
-    mDesktop->browserThere = false;
-    mDesktop->expectBox(QStringLiteral("error [] No browser detected!").mid(0, 5));
-    emit link->linkActivated(QStringLiteral("guide"));
-    QVERIFY(mDesktop->boxes.last().endsWith(QLatin1String("No browser detected!")));
-    QVERIFY(program.end());
-}
-
-void tst_Start::keysOfTheMenu()
-{
-    makeCatalogue();
-    storeLanguage(languageEnglish);
-    Program program(*mDesktop);
-    QVERIFY(program.start());
-    for (const QString &line :
-         texts("Import Ctrl+Ins", "mnuSave Ctrl+S", "mnuConvertDatabase Shift+Ins",
-               "mnuSearchArtistsTitles Ctrl+F1", "mnuCDInsert F2", "mnuInsertEnkelCD F3",
-               "mnuMP3 F4", "mnuUpdate F5", "mnuCDDB F6", "mnuRegisterCDDB F7", "mnuProxy F8",
-               "mnuHelp F1", "Over Ctrl+I", "mnuOverCDDB Ctrl+G")) {
-        const QByteArray entry = line.section(QLatin1Char(' '), 0, 0).toLatin1();
-        QCOMPARE(program.entry(entry.constData())->shortcut(),
-                 QKeySequence(line.section(QLatin1Char(' '), 1)));
-    }
-    QVERIFY(program.screen("frmCDList")->Unload());
-    QTest::keyClick(&program.frame(), Qt::Key_F5);
-    QVERIFY(program.screen("frmCDList"));
-    QVERIFY(program.end());
-}
-
-void tst_Start::whatComesLaterIsDisabled()
-{
-    makeCatalogue();
-    storeLanguage(languageEnglish);
-    Program program(*mDesktop);
-    QVERIFY(program.start());
-    for (const char *entry : {"Import", "mnuSave", "mnuCDInsert", "mnuInsertEnkelCD", "mnuUpdate",
-                              "mnuSearchArtistsTitles", "mnuHelp", "Over", "mnuEngels", "tbImport",
-                              "tbSave", "tbQuicksearch", "tbCollection", "tbCredits", "tbHelp"})
-        QVERIFY2(program.entry(entry)->isEnabled(), entry);
-    for (const char *entry :
-         {"mnuConvertDatabase", "mnuMP3", "mnuCDDB", "mnuProxy", "mnuOverCDDB", "tbCDDB"})
-        QVERIFY2(!program.entry(entry)->isEnabled(), entry);
-    QVERIFY(program.end());
-}
 
 QTEST_MAIN(tst_Start)
 #include "tst_Start.moc"

@@ -12,111 +12,101 @@ class tst_RowOrder : public QObject
     Q_OBJECT
 
 private slots:
-    void theEndOfAStatement_data();
-    void theEndOfAStatement();
-    void rowsComeAsTheEngineSortsThem_data();
-    void rowsComeAsTheEngineSortsThem();
-    void theFirstRowsAreTheFirstOfTheOrder();
+    void theEndOfAStatement_data()
+    {
+        QTest::addColumn<QByteArray>("sql");
+        QTest::addColumn<QString>("columns"); // empty: the engine sorts
+        QTest::newRow("several") << QByteArray("select a from t order by 1,2,5,3,4 ")
+                                 << u"0 1 4 2 3"_s;
+        QTest::newRow("capitals, blanks")
+            << QByteArray("select a from t ORDER  BY 2 , 1") << u"1 0"_s;
+        for (const char *other :
+             {"select a from t order by 1 desc", "select a from t order by a, 1", "select a from t",
+              "select a from t group by 1", "select a from t where reorder by 1",
+              "update t set a = 1", "select a from t order by 0", "select a from t order by 1,,2",
+              "select a from t limit 2", "select a from t where x between 1 and 2",
+              "select a from (select b order by 1)", "select a from t order by 1,",
+              "select a from t order by 99999999999"})
+            QTest::newRow(other) << QByteArray(other) << QString();
+    }
+
+    void theEndOfAStatement()
+    {
+        QFETCH(QByteArray, sql);
+        const auto tail = ADODB::orderTail({sql.data(), std::size_t(sql.size())});
+        QStringList columns;
+        for (const int column : tail.columns)
+            columns.append(QString::number(column));
+        QTEST(columns.join(u' '), "columns");
+        if (!columns.isEmpty())
+            QCOMPARE(sql.left(qsizetype(tail.from)).trimmed(), QByteArray("select a from t"));
+    }
+
+    void rowsComeAsTheEngineSortsThem_data()
+    {
+        QTest::addColumn<QString>("byNumber");
+        QTest::addColumn<QString>("byName");
+        const auto from = u" from Tracks as trk "_s;
+        const auto add = [&](const char *columns, const char *numbers, const char *names) {
+            const QString select = u"select "_s + QLatin1String(columns) + from;
+            QTest::newRow(names) << QString(select + u"order by "_s + QLatin1String(numbers))
+                                 << QString(select + u"order by "_s + QLatin1String(names));
+        };
+        add("titel, genre, id", "1,2,3", "trk.titel, trk.genre, trk.id");
+        add("hitjaar, titel, id", "1,2,3", "trk.hitjaar, trk.titel, trk.id");
+        add("artiest_id, genre, hitjaar, id", "1,3,2,4",
+            "trk.artiest_id, trk.hitjaar, trk.genre, trk.id");
+        add("iif(titel='a','x','y') as t, id", "1,2", "iif(titel='a','x','y'), trk.id");
+    }
+
+    void rowsComeAsTheEngineSortsThem()
+    {
+        QFETCH(QString, byNumber);
+        QFETCH(QString, byName);
+        TestCatalogue catalogue;
+        fill(catalogue);
+        const auto rows = rowsOf(gConnection->Execute(byNumber));
+        QCOMPARE(rows.size(), 18 * 18);
+        QCOMPARE(rows, rowsOf(gConnection->Execute(byName)));
+    }
+
+    void theFirstRowsAreTheFirstOfTheOrder()
+    {
+        TestCatalogue catalogue;
+        fill(catalogue);
+        const auto statement = u"select titel, id from Tracks order by 1,2"_s;
+        QCOMPARE(rowsOf(gConnection->firstRows(statement, 40)),
+                 rowsOf(gConnection->Execute(statement)).mid(0, 40));
+    }
 
 private:
-    static QStringList rowsOf(const ADODB::Recordset &recordset);
-    static void fill(TestCatalogue &catalogue);
-};
-
-void tst_RowOrder::theEndOfAStatement_data()
-{
-    QTest::addColumn<QByteArray>("sql");
-    QTest::addColumn<QString>("columns"); // empty: the engine sorts
-    QTest::newRow("several") << QByteArray("select a from t order by 1,2,5,3,4 ")
-                             << QStringLiteral("0 1 4 2 3");
-    QTest::newRow("capitals, blanks")
-        << QByteArray("select a from t ORDER  BY 2 , 1") << QStringLiteral("1 0");
-    for (const char *other :
-         {"select a from t order by 1 desc", "select a from t order by a, 1", "select a from t",
-          "select a from t group by 1", "select a from t where reorder by 1", "update t set a = 1",
-          "select a from t order by 0", "select a from t order by 1,,2", "select a from t limit 2",
-          "select a from t where x between 1 and 2", "select a from (select b order by 1)",
-          "select a from t order by 1,", "select a from t order by 99999999999"})
-        QTest::newRow(other) << QByteArray(other) << QString();
-}
-
-void tst_RowOrder::theEndOfAStatement()
-{
-    QFETCH(QByteArray, sql);
-    const auto tail = ADODB::orderTail({sql.data(), std::size_t(sql.size())});
-    QStringList columns;
-    for (const int column : tail.columns)
-        columns.append(QString::number(column));
-    QTEST(columns.join(u' '), "columns");
-    if (!columns.isEmpty())
-        QCOMPARE(sql.left(qsizetype(tail.from)).trimmed(), QByteArray("select a from t"));
-}
-
-// All kinds of cells in one column each, many rows alike in the first columns.
-void tst_RowOrder::fill(TestCatalogue &catalogue)
-{
-    catalogue.exec(QString::fromUtf8(R"(
-        create temp table Word(w, n);
-        insert into Word values ('abba',1),('ABBA',2),('Ábba',3),('abbà long enough to go on',4),
-            ('abba long enough to go on',5),(null,6),('',7),('Édith',8),('edith',9),('Жук',10),
-            ('жук',11),('日本',12),('10',13),('9',14),(' a',15),('a',16),('œuvre',17),('zz%',18);
-        insert into Artiesten select n, w from Word;
-        insert into Tracks select a.n * 100 + b.n, a.n % 5, b.w, a.w,
-            case b.n % 4 when 0 then null when 1 then 1985.5 when 2 then 1985 else 2000 - b.n end
-            from Word a, Word b;)"));
-}
-
-QStringList tst_RowOrder::rowsOf(const ADODB::Recordset &recordset)
-{
-    QStringList lines;
-    const auto rows = recordset.rows();
-    for (qsizetype row = 0; row < rows->rowCount(); ++row) {
-        QStringList cells;
-        for (int column = 0; column < rows->columnCount(); ++column)
-            cells.append(rows->text(row, column));
-        lines.append(cells.join(u'|'));
+    static QStringList rowsOf(const ADODB::Recordset &recordset)
+    {
+        QStringList lines;
+        const auto rows = recordset.rows();
+        for (qsizetype row = 0; row < rows->rowCount(); ++row) {
+            QStringList cells;
+            for (int column = 0; column < rows->columnCount(); ++column)
+                cells.append(rows->text(row, column));
+            lines.append(cells.join(u'|'));
+        }
+        return lines;
     }
-    return lines;
-}
 
-void tst_RowOrder::rowsComeAsTheEngineSortsThem_data()
-{
-    QTest::addColumn<QString>("byNumber");
-    QTest::addColumn<QString>("byName");
-    const auto from = QStringLiteral(" from Tracks as trk ");
-    const auto add = [&](const char *columns, const char *numbers, const char *names) {
-        const QString select = QStringLiteral("select ") + QLatin1String(columns) + from;
-        QTest::newRow(names) << QString(select + QStringLiteral("order by ") +
-                                        QLatin1String(numbers))
-                             << QString(select + QStringLiteral("order by ") +
-                                        QLatin1String(names));
-    };
-    add("titel, genre, id", "1,2,3", "trk.titel, trk.genre, trk.id");
-    add("hitjaar, titel, id", "1,2,3", "trk.hitjaar, trk.titel, trk.id");
-    add("artiest_id, genre, hitjaar, id", "1,3,2,4",
-        "trk.artiest_id, trk.hitjaar, trk.genre, trk.id");
-    add("iif(titel='a','x','y') as t, id", "1,2", "iif(titel='a','x','y'), trk.id");
-}
-
-void tst_RowOrder::rowsComeAsTheEngineSortsThem()
-{
-    QFETCH(QString, byNumber);
-    QFETCH(QString, byName);
-    TestCatalogue catalogue;
-    fill(catalogue);
-    const auto rows = rowsOf(gConnection->Execute(byNumber));
-    QCOMPARE(rows.size(), 18 * 18);
-    QCOMPARE(rows, rowsOf(gConnection->Execute(byName)));
-}
-
-void tst_RowOrder::theFirstRowsAreTheFirstOfTheOrder()
-{
-    TestCatalogue catalogue;
-    fill(catalogue);
-    const auto statement = QStringLiteral("select titel, id from Tracks order by 1,2");
-    QCOMPARE(rowsOf(gConnection->firstRows(statement, 40)),
-             rowsOf(gConnection->Execute(statement)).mid(0, 40));
-}
+    // All kinds of cells in one column each, many rows alike in the first columns.
+    static void fill(TestCatalogue &catalogue)
+    {
+        catalogue.exec(QString::fromUtf8(R"(
+            create temp table Word(w, n);
+            insert into Word values ('abba',1),('ABBA',2),('Ábba',3),('abbà long enough to go on',4),
+                ('abba long enough to go on',5),(null,6),('',7),('Édith',8),('edith',9),('Жук',10),
+                ('жук',11),('日本',12),('10',13),('9',14),(' a',15),('a',16),('œuvre',17),('zz%',18);
+            insert into Artiesten select n, w from Word;
+            insert into Tracks select a.n * 100 + b.n, a.n % 5, b.w, a.w,
+                case b.n % 4 when 0 then null when 1 then 1985.5 when 2 then 1985 else 2000 - b.n end
+                from Word a, Word b;)"));
+    }
+};
 
 QTEST_MAIN(tst_RowOrder)
 #include "tst_RowOrder.moc"

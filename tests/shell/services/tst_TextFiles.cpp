@@ -1,13 +1,12 @@
 // Label: unit
 #include "shell/services/textfiles.h"
 #include "support/datarows.h"
+#include "support/fulldisk.h"
 #include "support/testcatalogue.h"
 
 #include <QDir>
 #include <QFile>
 #include <QSaveFile>
-#include <csignal>
-#include <sys/resource.h>
 
 /// Text files, line by line, in and out.
 class tst_TextFiles : public QObject
@@ -91,22 +90,15 @@ private slots:
     {
         for (const bool diskFull : {false, true}) { // else it is never closed
             writeFile(at("out.txt"), "old");
-            rlimit before;
-            getrlimit(RLIMIT_FSIZE, &before);
-            if (diskFull) { // a limit to the size of files is a disk that is full
-                signal(SIGXFSZ, SIG_IGN);
-                const rlimit little{4000, before.rlim_max};
-                setrlimit(RLIMIT_FSIZE, &little);
-            }
             bool closed = false;
             {
+                const FullDisk full(diskFull ? 4000 : RLIM_INFINITY);
                 OutputTextFile file;
                 QVERIFY(OpenOutputFile(at("out.txt"), file));
                 for (int i = 0; i < 5; ++i)
                     WriteTextLine(file, QString(1000, u'x'));
                 closed = diskFull && CloseTextFile(file);
             }
-            setrlimit(RLIMIT_FSIZE, &before);
             QVERIFY(!closed);
             QCOMPARE(readFile(at("out.txt")), QByteArray("old"));
             QCOMPARE(QDir(mFolder->path()).entryList(QDir::Files).size(), 1);
