@@ -63,7 +63,7 @@ int bind(sqlite3_stmt *s, const Dialect &dialect)
     return code;
 }
 
-// A cell is asked for once, not once for each thing about it: a connection without locks permits it.
+// A cell is asked for once, not for each thing about it: a connection without locks permits it.
 void readRow(sqlite3_stmt *s, Rows &rows)
 {
     const auto row = rows.addRow();
@@ -254,7 +254,7 @@ std::shared_ptr<const Rows> Connection::run(const QString &statement, int atMost
     }
     check(code);
     if (!ordered)
-        rows->arrange(firstOf(rowOrder(*rows, prepared->order), atMost));
+        rows->arrange(firstOf(rowOrder(*rows, prepared->order, prepared->repeats), atMost));
     return rows;
 }
 

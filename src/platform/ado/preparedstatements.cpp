@@ -39,6 +39,15 @@ bool hasOurOrder(sqlite3 *db, sqlite3_stmt *s, int column)
            (type && sqlite3_stricmp(type, "INTEGER") == 0);
 }
 
+bool coversAll(const std::vector<int> &columns, int count)
+{
+    for (int column = 0; column < count; ++column) {
+        if (std::find(columns.begin(), columns.end(), column) == columns.end())
+            return false;
+    }
+    return true;
+}
+
 // Prepares the statement without its order, if its rows can be sorted here.
 bool prepareUnordered(sqlite3 *db, std::string_view sql, PreparedStatement &prepared)
 {
@@ -52,6 +61,12 @@ bool prepareUnordered(sqlite3 *db, std::string_view sql, PreparedStatement &prep
     if (!std::all_of(tail.columns.begin(), tail.columns.end(), sortable))
         return false;
     prepared.order = tail.columns;
+    constexpr std::string_view distinct = "select distinct ";
+    if (sql.starts_with(distinct) && coversAll(tail.columns, sqlite3_column_count(s))) {
+        const auto all = sql.substr(distinct.size(), tail.from - distinct.size());
+        prepared.repeats = Repeats::Dropped;
+        return prepareOne(db, "select " + std::string(all), prepared) == SQLITE_OK;
+    }
     return true;
 }
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "platform/ado/rows.h"
+#include "platform/ado/roworder.h"
 
 #include <memory>
 #include <string>
@@ -27,6 +27,10 @@ struct PreparedStatement {
     /// rows are in memory anyway, sorting them there takes half the time, and the engine is free to
     /// join as is fastest.
     std::vector<int> order;
+
+    /// A "select distinct" ordered by all of its columns is run without the "distinct" too: rows
+    /// that are alike are found side by side.
+    Repeats repeats = Repeats::Kept;
 };
 
 /// The statements that a connection has prepared, by their texts.

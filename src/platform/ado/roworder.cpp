@@ -25,7 +25,10 @@ private:
 class RowOrder
 {
 public:
-    RowOrder(const Rows &rows, const std::vector<int> &columns) : mRows(rows), mColumns(columns) {}
+    RowOrder(const Rows &rows, const std::vector<int> &columns, Repeats repeats)
+        : mRows(rows), mColumns(columns), mRepeats(repeats)
+    {
+    }
 
     std::vector<std::uint32_t> sorted() const
     {
@@ -33,22 +36,33 @@ public:
         for (std::size_t row = 0; row < entries.size(); ++row)
             entries[row].row = std::uint32_t(row);
         sort(entries.data(), entries.data() + entries.size(), 0);
-        std::vector<std::uint32_t> order(entries.size());
-        std::transform(entries.begin(), entries.end(), order.begin(),
-                       [](const SortEntry &e) { return e.row; });
+        std::vector<std::uint32_t> order;
+        order.reserve(entries.size());
+        for (const SortEntry &entry : entries) {
+            if (entry.row != dropped)
+                order.push_back(entry.row);
+        }
         return order;
     }
 
 private:
     using Entry = SortEntry;
     using Kind = Rows::Kind;
+    static constexpr std::uint32_t dropped = 0xFFFFFFFF;
+
+    void finish(Entry *from, Entry *to) const
+    {
+        std::sort(from, to, [](const Entry &a, const Entry &b) { return a.row < b.row; });
+        if (mRepeats == Repeats::Dropped)
+            std::for_each(from + 1, to, [](Entry &e) { e.row = dropped; });
+    }
 
     void sort(Entry *from, Entry *to, std::size_t level) const
     {
         if (to - from < 2)
             return;
         if (level == mColumns.size()) {
-            std::sort(from, to, [](const Entry &a, const Entry &b) { return a.row < b.row; });
+            finish(from, to);
             return;
         }
         const int column = mColumns[level];
@@ -105,13 +119,15 @@ private:
 
     const Rows &mRows;
     const std::vector<int> &mColumns;
+    Repeats mRepeats;
 };
 
 } // namespace
 
-std::vector<std::uint32_t> rowOrder(const Rows &rows, const std::vector<int> &columns)
+std::vector<std::uint32_t> rowOrder(const Rows &rows, const std::vector<int> &columns,
+                                    Repeats repeats)
 {
-    return RowOrder(rows, columns).sorted();
+    return RowOrder(rows, columns, repeats).sorted();
 }
 
 } // namespace ADODB

@@ -56,6 +56,8 @@ private slots:
         add("hitjaar, titel, id", "1,2,3", "trk.hitjaar, trk.titel, trk.id");
         add("artiest_id, genre, hitjaar, id", "1,3,2,4",
             "trk.artiest_id, trk.hitjaar, trk.genre, trk.id");
+        add("distinct titel, genre", "1,2", "trk.titel, trk.genre");
+        add("distinct titel, genre, artiest_id", "2,1,3", "trk.genre, trk.titel, trk.artiest_id");
         add("iif(titel='a','x','y') as t, id", "1,2", "iif(titel='a','x','y'), trk.id");
     }
 
@@ -66,8 +68,10 @@ private slots:
         TestCatalogue catalogue;
         fill(catalogue);
         const auto rows = rowsOf(gConnection->Execute(byNumber));
-        QCOMPARE(rows.size(), 18 * 18);
-        QCOMPARE(rows, rowsOf(gConnection->Execute(byName)));
+        QVERIFY(rows.size() > 200);
+        // Of rows that differ in case alone a "distinct" may leave either.
+        QCOMPARE(rows.join(u'\n').toCaseFolded(),
+                 rowsOf(gConnection->Execute(byName)).join(u'\n').toCaseFolded());
     }
 
     void theFirstRowsAreTheFirstOfTheOrder()
