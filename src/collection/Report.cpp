@@ -2,11 +2,11 @@
 
 #include "collection/frmPageSetup.h"
 #include "collection/reportpaper.h"
+#include "platform/desktop/throttledpump.h"
 #include "shell/services/captions.h"
 #include "shell/services/fileutilities.h"
 #include "shell/services/frame.h"
 #include "shell/services/messages.h"
-#include "textimport/throttledpump.h"
 #include "ui_Report.h"
 
 #include <QKeyEvent>
@@ -14,14 +14,11 @@
 #include <QProgressBar>
 #include <QScopedValueRollback>
 #include <QShortcut>
-#include <QStandardPaths>
 
 namespace
 {
 
 constexpr int fitWidth = 0, wholePage = 1, firstStep = 2; // entries of Zoom
-
-QString gPdfFolder; // where the last file was written in this run
 
 QString percent(double factor)
 {
@@ -176,7 +173,8 @@ void Report::layOut()
     mContent =
         std::make_shared<ReportContent>(mSource, windowTitle(), Desktop::current().now().date());
     mUi->Preview->setReport(painter());
-    mUi->TheStatusBar->showMessage(mContent->count());
+    if (!mBusy)
+        mUi->TheStatusBar->showMessage(mContent->count());
     showPage();
 }
 
@@ -227,6 +225,10 @@ void Report::command(void (Report::*routine)())
 {
     if (mBusy || !mContent)
         return;
+    if (Form::busyForm()) {
+        informationBox(GetMessage("xBusy"));
+        return;
+    }
     const QScopedValueRollback<bool> busy(mBusy, true);
     (this->*routine)();
 }
@@ -245,28 +247,27 @@ void Report::print()
     case PrinterChoice::Chosen:
         break;
     }
-    run(GetMessage("xPrintFailed"), [&](const reportoutput::Progress &progress) {
+    run(GetMessage("xPrintFailed"), "xReportStopped", [&](const reportoutput::Progress &progress) {
         return reportoutput::print(printer, mContent, mUi->Preview->currentPage(), progress);
     });
 }
 
 void Report::writePdf()
 {
-    if (gPdfFolder.isEmpty())
-        gPdfFolder = QStandardPaths::writableLocation(QStandardPaths::DocumentsLocation);
     const QString name = Desktop::current().saveFileName(
-        {GetMessage("xReportPdfTip"), gPdfFolder, GetMessage("xPdfFiles"), QStringLiteral("pdf"),
+        {GetMessage("xReportPdfTip"), saveFolder(), GetMessage("xPdfFiles"), QStringLiteral("pdf"),
          windowTitle() + QStringLiteral(".pdf")});
     if (name.isEmpty() || !mayWrite(name))
         return;
-    gPdfFolder = QFileInfo(name).absolutePath();
-    run(GetMessage("xPdfFailed") + name, [&](const reportoutput::Progress &progress) {
-        return reportoutput::writePdf(name, painter(), mPaper, progress);
-    });
+    rememberSaveFolder(name);
+    run(GetMessage("xPdfFailed") + name, "xPdfStopped",
+        [&](const reportoutput::Progress &progress) {
+            return reportoutput::writePdf(name, painter(), mPaper, progress);
+        });
 }
 
 // A failure is told with these words and the reason behind them.
-void Report::run(const QString &failure, const Work &work)
+void Report::run(const QString &failure, const char *stopped, const Work &work)
 {
     mStopped = false;
     showBusy(true);
@@ -280,13 +281,12 @@ void Report::run(const QString &failure, const Work &work)
         return !mStopped;
     });
     showBusy(false);
+    const bool whole = result.outcome == reportoutput::Outcome::Done;
+    mUi->TheStatusBar->showMessage(
+        whole ? GetMessage("xReportDone") + reportLocale().toString(written) : GetMessage(stopped));
     if (result.outcome == reportoutput::Outcome::Failed)
         errorBox(result.reason.isEmpty() ? failure : failure + u'\r' + result.reason,
                  GetMessage("FileError"));
-    const bool whole = result.outcome == reportoutput::Outcome::Done;
-    mUi->TheStatusBar->showMessage(whole ? GetMessage("xReportDone") +
-                                               reportLocale().toString(written)
-                                         : GetMessage("xReportStopped"));
 }
 
 void Report::showBusy(bool busy)

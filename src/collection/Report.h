@@ -29,12 +29,12 @@ public:
     /// ADODB::Error if it is not that of a report.
     void setDataSource(const ADODB::Recordset &source);
     void setCaption(const QString &caption);
+    bool isBusy() const override { return mBusy; }
 
 protected:
     explicit Report(const QString &name);
     void Form_Load() override;
     void Form_Activate() override;
-    bool QueryUnload() override { return !mBusy; }
     bool eventFilter(QObject *watched, QEvent *event) override;
 
 private:
@@ -54,7 +54,7 @@ private:
     void print();
     void writePdf();
     void setUpPage();
-    void run(const QString &failure, const Work &work);
+    void run(const QString &failure, const char *stopped, const Work &work);
     void showBusy(bool busy);
     ReportPainter painter() const;
 

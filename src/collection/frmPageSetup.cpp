@@ -2,6 +2,7 @@
 
 #include "collection/reportpaper.h"
 #include "shell/services/captions.h"
+#include "shell/services/frame.h"
 #include "shell/services/messages.h"
 #include "ui_frmPageSetup.h"
 
@@ -34,6 +35,11 @@ frmPageSetup::frmPageSetup(std::shared_ptr<const ReportContent> content, const Q
 }
 
 frmPageSetup::~frmPageSetup() = default;
+
+void frmPageSetup::Form_Load()
+{
+    placeInFrame(this, 0.2, 0.2);
+}
 
 void frmPageSetup::setCaptions()
 {

@@ -23,6 +23,9 @@ public:
 signals:
     void chosen(const QPageLayout &paper);
 
+protected:
+    void Form_Load() override;
+
 private:
     void setCaptions();
     void connectControls();

@@ -5,21 +5,19 @@
 #include "collection/resultlines.h"
 #include "controls/DBListViewCTL.h"
 #include "platform/desktop/desktop.h"
+#include "platform/desktop/throttledpump.h"
 #include "shell/services/captions.h"
 #include "shell/services/fileutilities.h"
 #include "shell/services/frame.h"
 #include "shell/services/globals.h"
 #include "shell/services/messages.h"
 #include "shell/services/textfiles.h"
-#include "textimport/throttledpump.h"
 #include "ui_frmSearchArtistsTitles.h"
 
 #include <QKeyEvent>
 
 namespace
 {
-
-constexpr int keyEnter = 13;
 
 /// The columns of the result, in the order of the statement's fields.
 enum Column { Artist, Title, DiscNumber, TrackNumber, CdTitle, Genre, HitYear, Type, columnCount };
@@ -30,6 +28,7 @@ struct {
 } const columns[columnCount] = {{"Artiest", 3},  {"Titel", 3}, {"Disc", 1},    {"Track", 1},
                                 {"CD-Titel", 2}, {"Genre", 1}, {"HitYear", 1}, {"Type", 1}};
 constexpr int shares = 13;
+constexpr int largeResult = 200'000; // rows
 
 QStringList textsOf(const ListItem &item)
 {
@@ -83,13 +82,22 @@ void frmSearchArtistsTitles::connectControls()
     connect(mUi->cmdCancel, &QPushButton::clicked, this, &frmSearchArtistsTitles::cmdCancel_Click);
     connect(list, &DBListViewCTL::ColumnClick, this,
             &frmSearchArtistsTitles::ResultList_ColumnClick);
-    connect(list, &DBListViewCTL::KeyDown, this, &frmSearchArtistsTitles::ResultList_KeyDown);
-    connect(list, &DBListViewCTL::DblClick, this, [this, list] { openDisc(list->SelectedItem()); });
+    connect(list, &DBListViewCTL::DblClick, this, &frmSearchArtistsTitles::ResultList_Enter);
+    list->installEventFilter(this);
     list->viewport()->installEventFilter(this);
 }
 
 // The columns are there from the start.
 void frmSearchArtistsTitles::Form_Load()
+{
+    for (QRadioButton *mode : {mUi->optFullWord, mUi->optPartWord}) // the last one is the tab stop
+        mode->setChecked(true);
+    for (QLineEdit *year : {mUi->txtHitjaarvan, mUi->txtHitjaartm})
+        year->setMinimumWidth(year->fontMetrics().horizontalAdvance(u'0') * 7);
+    showNothing();
+}
+
+void frmSearchArtistsTitles::showNothing()
 {
     auto empty = std::make_shared<ADODB::Recordset>();
     for (const auto &column : columns)
@@ -98,6 +106,7 @@ void frmSearchArtistsTitles::Form_Load()
     mUi->ResultList->setRecordset(empty);
     mUi->ResultList->Populate();
     mUi->ResultList->setEnabled(false);
+    mUi->cmdExport->setEnabled(false);
     setColumns();
 }
 
@@ -162,6 +171,8 @@ void frmSearchArtistsTitles::show(const SearchKey &key)
 {
     if (!gConnection)
         throw ADODB::makeError(ADODB::errObjectClosed);
+    if (mUi->ResultList->ListItems().Count() > largeResult)
+        showNothing(); // makes room for as many
     const auto found = std::make_shared<ADODB::Recordset>();
     found->Open(searchStatement(key), *gConnection);
     mUi->ResultList->setRecordset(found);
@@ -193,11 +204,19 @@ void frmSearchArtistsTitles::setColumnWidths()
     }
 }
 
-// With the size of the form, and when a scroll bar comes or goes.
+// Columns go with the size of the form, and with a scroll bar that comes or goes. Enter on a row is
+// the row's: the list passes it on, and the form would search.
 bool frmSearchArtistsTitles::eventFilter(QObject *watched, QEvent *event)
 {
-    if (event->type() == QEvent::Resize)
+    if (watched != mUi->ResultList && event->type() == QEvent::Resize)
         setColumnWidths();
+    if (watched == mUi->ResultList && event->type() == QEvent::KeyPress) {
+        const auto *key = static_cast<QKeyEvent *>(event);
+        if (key->key() == Qt::Key_Return || key->key() == Qt::Key_Enter) {
+            ResultList_Enter();
+            return true;
+        }
+    }
     return Form::eventFilter(watched, event);
 }
 
@@ -219,18 +238,9 @@ void frmSearchArtistsTitles::ResultList_ColumnClick(int column)
     mUi->ResultList->setSortKey(column - 1);
 }
 
-void frmSearchArtistsTitles::ResultList_KeyDown(int keyCode, int shift)
+void frmSearchArtistsTitles::ResultList_Enter()
 {
-    if (keyCode == keyEnter && shift == 0)
-        openDisc(mUi->ResultList->SelectedItem());
-}
-
-// Enter on a row is the row's: it does not search.
-void frmSearchArtistsTitles::keyPressEvent(QKeyEvent *event)
-{
-    const bool enter = event->key() == Qt::Key_Return || event->key() == Qt::Key_Enter;
-    if (!enter || focusWidget() != mUi->ResultList)
-        Form::keyPressEvent(event);
+    openDisc(mUi->ResultList->SelectedItem());
 }
 
 void frmSearchArtistsTitles::openDisc(const ListItem &item)
@@ -253,39 +263,52 @@ void frmSearchArtistsTitles::openDisc(const ListItem &item)
 
 void frmSearchArtistsTitles::cmdExport_Click()
 {
-    const QString name = Desktop::current().saveFileName({GetMessage("xExportTitle"), {}, {}, {}});
+    if (Form::busyForm()) {
+        informationBox(GetMessage("xBusy"));
+        return;
+    }
+    const QString name =
+        Desktop::current().saveFileName({GetMessage("xExportTitle"), saveFolder(), {}, {}});
     if (name.isEmpty() || !mayWrite(name))
         return;
+    rememberSaveFolder(name);
     setExporting(true);
     const bool written = writeResult(name);
     setExporting(false);
     if (mCancelled)
         mUi->StatusBar->showMessage(GetMessage("xExportCancelled"));
-    else
-        mUi->StatusBar->showMessage(GetMessage(written ? "xExported" : "xNotExported") + name);
+    else if (written)
+        mUi->StatusBar->showMessage(GetMessage("xExported") + name);
 }
 
 // A file that cannot be opened says no more than the panel does; what cannot be written to its end
 // does: it would pass for done.
 bool frmSearchArtistsTitles::writeResult(const QString &name)
 {
+    const QString failure = GetMessage("xNotExported") + name;
     OutputTextFile file;
-    if (!OpenOutputFile(name, file))
+    if (!OpenOutputFile(name, file)) {
+        mUi->StatusBar->showMessage(failure);
         return false;
+    }
     auto items = mUi->ResultList->ListItems();
     const int count = items.Count();
     ThrottledPump pump;
+    int percent = 0;
     bool written = true;
     for (int index = 1; index <= count && written && !mCancelled; ++index) {
         written = WriteTextLine(file, resultLine(textsOf(items.Item(index))));
-        showProgress(int(index * 100LL / count));
+        if (const int now = int(index * 100LL / count); now != percent)
+            showProgress(percent = now);
         pump();
     }
     if (mCancelled)
         return false;
     written = written && CloseTextFile(file);
-    if (!written)
-        errorBox(GetMessage("xNotExported") + name);
+    if (!written) {
+        mUi->StatusBar->showMessage(failure);
+        errorBox(failure, GetMessage("FileError"));
+    }
     return written;
 }
 
@@ -293,8 +316,10 @@ bool frmSearchArtistsTitles::writeResult(const QString &name)
 void frmSearchArtistsTitles::setExporting(bool exporting)
 {
     mExporting = exporting;
-    if (exporting)
+    if (exporting) {
         mCancelled = false;
+        mUi->txtArtistKey->setFocus(); // the button's would go to the one that cancels
+    }
     mUi->cmdSearch->setEnabled(!exporting);
     mUi->cmdExport->setEnabled(!exporting);
     mUi->ResultList->setEnabled(!exporting);
@@ -305,9 +330,7 @@ void frmSearchArtistsTitles::setExporting(bool exporting)
 
 void frmSearchArtistsTitles::showProgress(int percent)
 {
-    const QString text = GetMessage("xExporting") + QString::number(percent) + u'%';
-    if (text != mUi->StatusBar->currentMessage())
-        mUi->StatusBar->showMessage(text);
+    mUi->StatusBar->showMessage(GetMessage("xExporting") + QString::number(percent) + u'%');
 }
 
 // An export is ended by it, and the form stays.
@@ -317,9 +340,4 @@ void frmSearchArtistsTitles::cmdCancel_Click()
         mCancelled = true;
     else
         Unload();
-}
-
-bool frmSearchArtistsTitles::QueryUnload()
-{
-    return !mExporting;
 }

@@ -22,10 +22,10 @@ public:
     frmSearchArtistsTitles();
     ~frmSearchArtistsTitles() override;
 
+    bool isBusy() const override { return mExporting; }
+
 protected:
     void Form_Load() override;
-    bool QueryUnload() override;
-    void keyPressEvent(QKeyEvent *event) override;
     bool eventFilter(QObject *watched, QEvent *event) override;
 
 private:
@@ -35,12 +35,13 @@ private:
     void cmdExport_Click();
     void cmdCancel_Click();
     void ResultList_ColumnClick(int column);
-    void ResultList_KeyDown(int keyCode, int shift);
+    void ResultList_Enter();
 
     SearchKey key() const;
     bool checkYears(const SearchKey &key);
     void refuse(const char *message, QLineEdit *field);
     void show(const SearchKey &key);
+    void showNothing();
     void setColumns();
     void setColumnWidths();
     void showFound(qsizetype count);

@@ -82,12 +82,19 @@ Result writePdf(const QString &name, const ReportPainter &report, const QPageLay
     writer.setPageLayout(paper);
     writer.setTitle(report.content().caption());
     writer.setCreator(GetMessage("MainScreen.Caption"));
-    const auto isWell = [&file] { return file.error() == QFileDevice::NoError; };
+    QString reason; // what comes later hides it
+    const auto isWell = [&] {
+        if (file.error() != QFileDevice::NoError && reason.isEmpty())
+            reason = file.errorString();
+        return reason.isEmpty();
+    };
     Result result = paintPages(writer, allPages(report.layout()), report, isWell, progress);
-    if (result.outcome == Outcome::Done && !commitWhole(file))
+    if (result.outcome == Outcome::Done && !(file.flush() && isWell() && commitWhole(file)))
         result.outcome = Outcome::Failed;
-    if (result.outcome == Outcome::Failed)
-        result.reason = file.errorString();
+    if (result.outcome == Outcome::Failed) {
+        isWell();
+        result.reason = reason;
+    }
     if (result.outcome == Outcome::Done)
         syncFolder(QFileInfo(name).absolutePath());
     else

@@ -6,6 +6,7 @@
 #include "collection/frmCDList.h"
 #include "collection/frmSearchArtistsTitles.h"
 #include "platform/ado/connection.h"
+#include "shell/accesskeys.h"
 #include "shell/frmHelp.h"
 #include "shell/frmSplash.h"
 #include "shell/services/captions.h"
@@ -77,6 +78,7 @@ void MainScreen::setUpControls()
     mUi->setupUi(this);
     setCentralWidget(mUi->Children);
     connectActions();
+    new AccessKeys(mUi->MenuBar, this);
     Frame::setCurrent(this);
     Form::setHost(this);
 }
@@ -287,8 +289,14 @@ void MainScreen::closeEvent(QCloseEvent *event)
     event->setAccepted(Unload());
 }
 
+// A screen that is busy keeps all others open: nothing is lost before the user has decided.
 bool MainScreen::unloadChildren()
 {
+    if (Form *busy = Form::busyForm()) {
+        bringUp(busy);
+        informationBox(GetMessage("xBusy"));
+        return false;
+    }
     const auto forms = Form::openForms();
     for (Form *form : forms) {
         if (form->Name() != QLatin1String("frmSplash") && !form->Unload())

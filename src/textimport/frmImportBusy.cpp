@@ -1,12 +1,12 @@
 #include "textimport/frmImportBusy.h"
 
+#include "platform/desktop/throttledpump.h"
 #include "shell/services/captions.h"
 #include "shell/services/frame.h"
 #include "shell/services/globals.h"
 #include "shell/services/messages.h"
 #include "textimport/filereading.h"
 #include "textimport/frmImport.h"
-#include "textimport/throttledpump.h"
 #include "ui_frmImportBusy.h"
 
 #include <QTimer>

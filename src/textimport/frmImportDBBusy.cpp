@@ -2,13 +2,13 @@
 
 #include "catalogue/errorboxes.h"
 #include "platform/ado/connection.h"
+#include "platform/desktop/throttledpump.h"
 #include "shell/services/browser.h"
 #include "shell/services/captions.h"
 #include "shell/services/frame.h"
 #include "shell/services/globals.h"
 #include "shell/services/messages.h"
 #include "textimport/catalogueload.h"
-#include "textimport/throttledpump.h"
 #include "ui_frmImportDBBusy.h"
 
 #include <QTimer>

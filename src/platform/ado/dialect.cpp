@@ -146,6 +146,7 @@ void Dialect::begin(QStringView statement)
     mEnded = false;
     mOrdinals.assign(1, false);
     mValues = Values::None;
+    mBetween = Between::None;
     mDelete = Delete::None;
 }
 
@@ -193,11 +194,22 @@ void Dialect::word(QStringView s)
     if (is(w, QLatin1String("like")) && likeText(s, w))
         return;
     deleteAlias(w);
+    mBetween = behind(mBetween, w);
     const auto last = mSql.find_last_not_of(' ');
     if (last == std::string::npos || mSql[last] != '.')
         mNameAt = mSql.size();
     appendUtf8(mSql, w);
     afterWord(s, w);
+}
+
+// "between a and b": a condition may begin behind the next "and" only.
+Dialect::Between Dialect::behind(Between now, QStringView w)
+{
+    if (is(w, QLatin1String("between")))
+        return Between::Lower;
+    if (!is(w, QLatin1String("and")))
+        return is(w, QLatin1String("or")) ? Between::None : now;
+    return now == Between::Lower ? Between::Upper : Between::None;
 }
 
 void Dialect::afterWord(QStringView s, QStringView w)
@@ -260,7 +272,8 @@ bool Dialect::likeText(QStringView s, QStringView w)
 {
     const auto from = skipBlanks(s, mAt);
     const auto end = charAt(s, from) == u'\'' ? closingQuote(s, from) : -1;
-    if (!mLifts || end < 0 || !isCondition(mSql, mNameAt) || !conditionEnds(s, end + 1))
+    if (!mLifts || mBetween != Between::None || end < 0 || !isCondition(mSql, mNameAt) ||
+        !conditionEnds(s, end + 1))
         return false;
     mSql.insert(mNameAt, "unlikely(");
     appendUtf8(mSql, w);

@@ -40,6 +40,8 @@ private:
     void afterWord(QStringView s, QStringView w);
     bool maxOfSum(QStringView s);
     void deleteAlias(QStringView w);
+    enum class Between { None, Lower, Upper };
+    static Between behind(Between now, QStringView w);
     bool likeText(QStringView s, QStringView w);
     bool liftsHere() const { return mLifts && !mOrdinals.back(); }
     [[noreturn]] void refuse(const QString &why) const;
@@ -52,9 +54,10 @@ private:
 
     // Where in the statement the scan stands.
     qsizetype mAt = 0;
-    bool mLifts = true;          // the statement is one that may hold parameters
-    bool mEnded = false;         // a ";" was seen
-    std::size_t mNameAt = 0;     // in mSql: where the last name of a column begins
+    bool mLifts = true;               // the statement is one that may hold parameters
+    bool mEnded = false;              // a ";" was seen
+    Between mBetween = Between::None; // what of it an "and" would end
+    std::size_t mNameAt = 0;          // in mSql: where the last name of a column begins
     std::vector<bool> mOrdinals; // for each open parenthesis: whether behind ORDER BY or GROUP BY
     enum class Values { None, Expected, Inside, Behind } mValues = Values::None;
     enum class Delete { None, From, Table, Done } mDelete = Delete::None;

@@ -62,6 +62,13 @@ const QList<Form *> &Form::openForms()
     return gOpenForms;
 }
 
+Form *Form::busyForm()
+{
+    const auto busy = std::find_if(gOpenForms.begin(), gOpenForms.end(),
+                                   [](const Form *form) { return form->isBusy(); });
+    return busy == gOpenForms.end() ? nullptr : *busy;
+}
+
 void Form::setHost(Host *host)
 {
     gHost = host;
@@ -103,7 +110,7 @@ bool Form::Unload()
 {
     if (mUnloaded)
         return true;
-    if (!QueryUnload())
+    if (isBusy() || !QueryUnload())
         return false;
     finishUnload();
     return true;

@@ -28,8 +28,12 @@ public:
     void Show(); // modeless; brings it up if it is shown already
     void ShowModal();
 
-    /// False if the form refuses.
+    /// False if the form refuses, as a busy one does.
     bool Unload();
+
+    /// Whether the form is in the middle of something long that lets events through.
+    virtual bool isBusy() const { return false; }
+    static Form *busyForm(); // nullptr if none is
     bool isUnloaded() const { return mUnloaded; }
 
     /// Where the form wants to stand, from the corner of its host; to be set in its load.

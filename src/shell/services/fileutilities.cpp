@@ -6,6 +6,7 @@
 #include <QDir>
 #include <QDirIterator>
 #include <QRegularExpression>
+#include <QStandardPaths>
 #include <cstdio>
 #ifdef Q_OS_UNIX
 #include <fcntl.h>
@@ -17,6 +18,8 @@ QString gBrowseInitialFolder;
 
 namespace
 {
+
+QString gSaveFolder;
 
 // Only * and ? are wild: "Album [Disc 1].mp3" is a plain name.
 bool isPattern(const QString &name)
@@ -69,6 +72,18 @@ bool FileExists(const QString &path)
             return true;
     }
     return false;
+}
+
+QString saveFolder()
+{
+    if (gSaveFolder.isEmpty())
+        gSaveFolder = QStandardPaths::writableLocation(QStandardPaths::DocumentsLocation);
+    return QDir(gSaveFolder).exists() ? gSaveFolder : QDir::homePath();
+}
+
+void rememberSaveFolder(const QString &fileName)
+{
+    gSaveFolder = QFileInfo(fileName).absolutePath();
 }
 
 bool mayWrite(const QString &name)

@@ -12,6 +12,10 @@ extern QString gBrowseInitialFolder; // where the folder dialog starts
 /// Whether a file may be written under this name: nothing has it, or the user lets it be replaced.
 bool mayWrite(const QString &name);
 
+/// Where a dialog for a file to save begins: where the last one was saved in this run.
+QString saveFolder();
+void rememberSaveFolder(const QString &fileName);
+
 /// Whether a file, a folder or anything that a pattern with * and ? fits is there.
 bool FileExists(const QString &path);
 

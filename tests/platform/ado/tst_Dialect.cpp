@@ -59,6 +59,23 @@ private slots:
         row("blanks", " \t select\r\n  1 \n from  t ", "select ? from t", "1");
         row("semicolon at the end", "select 1 ; ", "select ? ", "1");
 
+        row("a condition that seldom holds", "select 1 from t where a.b like '%x' and (c like 'y')",
+            "select ? from t where unlikely(a.b like ?) and (unlikely(c like ?))", "1|t%x|ty");
+        row("the same behind a between",
+            "select a where b between 1 and 2 and c like 'x' order by 1",
+            "select a where b between ? and ? and unlikely(c like ?) order by 1", "1|2|tx");
+        // Left as they stand.
+        for (const char *other :
+             {"b not like 'x'", "not b like 'x'", "b like c and 'x' = c", "b + c like 'x'",
+              "left(b) like 'x'", "b between c and d like 'x'",
+              "case when b like 'x' then c end"}) {
+            const QString statement = u"select a from t where "_s + QLatin1String(other);
+            QString sql = statement;
+            sql.replace(u"'x'"_s, u"?"_s).replace(u"left"_s, u"\"left\""_s);
+            row(other, statement, sql, "tx");
+        }
+        row("with an escape", "select a where b like 'x' escape '!'",
+            "select a where b like ? escape ?", "tx|t!");
         row("order by", "select a, 5 from t order by 1,2 desc",
             "select a, ? from t order by 1,2 desc", "5");
         row("other ordinals", "select a, 5 from t order by 1,22 desc",
