@@ -86,7 +86,7 @@ sql() { "${person[@]}" sqlite3 -cmd ".load /usr/lib/songcase/sqlite3/songcase" "
 maps() { grep -q "$1" "/proc/$running/maps"; }
 has_class() { xdotool search --onlyvisible --class "^$1\$" | grep -qx "$window"; }
 opens_guide() { # USER PAGE: the help screen stands open after a first start, on its link
-    xdotool windowfocus --sync "$window" key Tab Return
+    xdotool windowfocus --sync "$window" key Return
     for _ in $(seq 50); do
         ! grep -qsx "file://$2" "$root/home/$1/opened" || return 0
         sleep 0.1

@@ -45,9 +45,14 @@ void frmHelp::Form_Load()
     mUi->Link->setToolTip(guideAddress());
 }
 
+// The focus alone selects no link of a label: what does is the Tab of a person.
 void frmHelp::Form_Activate()
 {
     mUi->Link->setFocus();
+    if (mUi->Link->hasSelectedText())
+        return;
+    QKeyEvent tab(QEvent::KeyPress, Qt::Key_Tab, Qt::NoModifier);
+    QCoreApplication::sendEvent(mUi->Link, &tab);
 }
 
 void frmHelp::keyPressEvent(QKeyEvent *event)
