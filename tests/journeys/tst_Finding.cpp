@@ -5,6 +5,7 @@
 #include "support/editing.h"
 #include "support/journey.h"
 
+#include <QApplication>
 #include <QPushButton>
 #include <QStatusBar>
 #include <QTabWidget>
