@@ -23,7 +23,7 @@ private slots:
             QVERIFY(!list(name)->isEnabled() && list(name)->ListItems().Count() == 0);
         QVERIFY(!control<QPushButton>("cmdUpdate")->isEnabled());
         QVERIFY(!control<QPushButton>("cmdDelete")->isEnabled());
-        QCOMPARE(status(), QStringLiteral("Number of compilations in your collection: 0"));
+        QCOMPARE(status(), u"Number of compilations in your collection: 0"_s);
     }
 
     void listsAreSortedOnTheirFirstColumn()
@@ -35,8 +35,8 @@ private slots:
         QCOMPARE(column(list("MP3List"), 1), texts("/a", "/b"));
         for (const char *name : {"ColList", "SngList", "MP3List"})
             QVERIFY(list(name)->isColumnHidden(0));
-        QCOMPARE(list("SngList")->ColumnHeaders().Item(2).Text(), QStringLiteral("Artist"));
-        QCOMPARE(list("MP3List")->ColumnHeaders().Item(3).Text(), QStringLiteral("Title"));
+        QCOMPARE(list("SngList")->ColumnHeaders().Item(2).Text(), u"Artist"_s);
+        QCOMPARE(list("MP3List")->ColumnHeaders().Item(3).Text(), u"Title"_s);
     }
 
     void pagesShowTheirCommandsAndCounts()
@@ -46,10 +46,10 @@ private slots:
         const struct {
             bool commands;
             QString count;
-        } expected[] = {{true, QStringLiteral("Number of compilations in your collection: 2")},
-                        {true, QStringLiteral("Number of albums in your collection: 3")},
-                        {false, QStringLiteral("Number of different tracks in your collection: 4")},
-                        {true, QStringLiteral("Number of MP3 collections in your collection: 2")}};
+        } expected[] = {{true, u"Number of compilations in your collection: 2"_s},
+                        {true, u"Number of albums in your collection: 3"_s},
+                        {false, u"Number of different tracks in your collection: 4"_s},
+                        {true, u"Number of MP3 collections in your collection: 2"_s}};
         for (int i : {1, 2, 3, 0}) {
             page(i);
             QCOMPARE(control<QPushButton>("cmdInsert")->isVisible(), expected[i].commands);
@@ -69,39 +69,37 @@ private slots:
         show();
         page(1);
         list("SngList")->setSelectedItem(list("SngList")->ListItems().Item(1)); // Mid, by alone
-        mDesktop->expectBox(QStringLiteral("yes-no [Delete] Are you sure to delete this CD?"),
-                            vbYes);
+        mDesktop->expectBox(u"yes-no [Delete] Are you sure to delete this CD?"_s, vbYes);
         control<QPushButton>("cmdDelete")->click();
-        QCOMPARE(mCatalogue->rows(QStringLiteral("select Naam from Artiesten order by ID")),
+        QCOMPARE(mCatalogue->rows(u"select Naam from Artiesten order by ID"_s),
                  texts("Zed", "Édith", "Eddy"));
-        QCOMPARE(mCatalogue->rows(QStringLiteral("select ID from Tracks")), texts("1", "2", "4"));
+        QCOMPARE(mCatalogue->rows(u"select ID from Tracks"_s), texts("1", "2", "4"));
         QCOMPARE(column(list("SngList"), 2), texts("Aap", "Zebra"));
         // Track 2 stands on a compilation too: it stays with its artist.
         list("SngList")->setSelectedItem(list("SngList")->ListItems().Item(2));
-        mDesktop->expectBox(QStringLiteral("yes-no"), vbYes);
+        mDesktop->expectBox(u"yes-no"_s, vbYes);
         control<QPushButton>("cmdDelete")->click();
-        QCOMPARE(mCatalogue->count(QStringLiteral("select count(*) from Tracks where ID=2")), 1);
-        QCOMPARE(mCatalogue->count(QStringLiteral("select count(*) from Artiesten where ID=2")), 1);
+        QCOMPARE(mCatalogue->count(u"select count(*) from Tracks where ID=2"_s), 1);
+        QCOMPARE(mCatalogue->count(u"select count(*) from Artiesten where ID=2"_s), 1);
         QVERIFY(mScreen->updatesEnabled());
     }
 
     void noStillCleansUp()
     {
         fill();
-        mCatalogue->exec(QStringLiteral("insert into Artiesten values (9,'Nobody')"));
+        mCatalogue->exec(u"insert into Artiesten values (9,'Nobody')"_s);
         show();
-        mDesktop->expectBox(QStringLiteral("yes-no"), vbNo);
+        mDesktop->expectBox(u"yes-no"_s, vbNo);
         control<QPushButton>("cmdDelete")->click();
-        QCOMPARE(mCatalogue->count(QStringLiteral("select count(*) from Artiesten where ID=9")), 0);
-        QCOMPARE(mCatalogue->count(QStringLiteral("select count(*) from CDTitels")), 5);
+        QCOMPARE(mCatalogue->count(u"select count(*) from Artiesten where ID=9"_s), 0);
+        QCOMPARE(mCatalogue->count(u"select count(*) from CDTitels"_s), 5);
     }
 
     void deleteOfTheLastRowDisablesTheList()
     {
-        mCatalogue->exec(
-            QStringLiteral("insert into CDTitels values (1,'Only',null,'V',null,null)"));
+        mCatalogue->exec(u"insert into CDTitels values (1,'Only',null,'V',null,null)"_s);
         show();
-        mDesktop->expectBox(QStringLiteral("yes-no"), vbYes);
+        mDesktop->expectBox(u"yes-no"_s, vbYes);
         QTest::keyClick(list("ColList"), Qt::Key_Delete);
         QVERIFY(!list("ColList")->isEnabled());
         QVERIFY(!list("ColList")->SelectedItem());
@@ -111,16 +109,15 @@ private slots:
     void deleteOfAnMP3Collection()
     {
         fill();
-        mCatalogue->exec(QStringLiteral("insert into Artiesten values (9,'Nobody')"));
+        mCatalogue->exec(u"insert into Artiesten values (9,'Nobody')"_s);
         show();
         page(3);
-        mDesktop->expectBox(
-            QStringLiteral("yes-no [Delete] Are your sure to delete this MP3 collection?"), vbYes);
+        mDesktop->expectBox(u"yes-no [Delete] Are your sure to delete this MP3 collection?"_s,
+                            vbYes);
         control<QPushButton>("cmdDelete")->click();
-        QCOMPARE(mCatalogue->rows(QStringLiteral("select ID, Map from MP3Collections")),
-                 texts("1|/b"));
-        QCOMPARE(mCatalogue->rows(QStringLiteral("select ID from MP3Files")), texts("1"));
-        QCOMPARE(mCatalogue->count(QStringLiteral("select count(*) from Artiesten where ID=9")), 1);
+        QCOMPARE(mCatalogue->rows(u"select ID, Map from MP3Collections"_s), texts("1|/b"));
+        QCOMPARE(mCatalogue->rows(u"select ID from MP3Files"_s), texts("1"));
+        QCOMPARE(mCatalogue->count(u"select count(*) from Artiesten where ID=9"_s), 1);
     }
 
     void aFailedDeleteTakesAllBack()
@@ -130,14 +127,12 @@ private slots:
             QStringLiteral("create trigger refuse before delete on CDTitels when old.ID=2 "
                            "begin select raise(abort, 'not this one'); end"));
         show();
-        mDesktop->expectBox(QStringLiteral("yes-no"), vbYes);
-        mDesktop->expectBox(QStringLiteral("not this one"));
-        mDesktop->expectBox(QStringLiteral("not this one"));
+        mDesktop->expectBox(u"yes-no"_s, vbYes);
+        mDesktop->expectBox(u"not this one"_s);
+        mDesktop->expectBox(u"not this one"_s);
         control<QPushButton>("cmdDelete")->click();
-        QCOMPARE(mCatalogue->count(
-                     QStringLiteral("select count(*) from CompactDiscs where CDTitels_ID=2")),
-                 1);
-        QCOMPARE(mCatalogue->count(QStringLiteral("select count(*) from CDTitels")), 5);
+        QCOMPARE(mCatalogue->count(u"select count(*) from CompactDiscs where CDTitels_ID=2"_s), 1);
+        QCOMPARE(mCatalogue->count(u"select count(*) from CDTitels"_s), 5);
         QVERIFY(mScreen->updatesEnabled());
     }
 
@@ -154,7 +149,7 @@ private slots:
         QCOMPARE(col->SelectedItem().Index(), 7);
         mScreen->RefreshLists();
         QCOMPARE(col->SelectedItem().Index(), 7);
-        mCatalogue->exec(QStringLiteral("delete from CDTitels where ID > 5"));
+        mCatalogue->exec(u"delete from CDTitels where ID > 5"_s);
         mScreen->RefreshLists();
         QCOMPARE(col->SelectedItem().Index(), 5);
         page(1);
@@ -177,8 +172,8 @@ private slots:
     {
         fill();
         show();
-        QTest::keyClicks(list("ColList"), QStringLiteral(".-!\"#")); // signs, no Delete or Insert
-        mDesktop->expectBox(QStringLiteral("yes-no"), vbNo);
+        QTest::keyClicks(list("ColList"), u".-!\"#"_s); // signs, no Delete or Insert
+        mDesktop->expectBox(u"yes-no"_s, vbNo);
         QTest::keyClick(list("ColList"), Qt::Key_Delete);
         QTest::keyClick(mScreen, Qt::Key_Escape);
         QVERIFY(mScreen->isUnloaded());
@@ -211,7 +206,7 @@ private slots:
         page(1);
         list("SngList")->setSelectedItem(list("SngList")->ListItems().Item(2));
         QTest::keyClick(list("SngList"), Qt::Key_Return);
-        QCOMPARE(openEditors().last(), QStringLiteral("frmCDRootE U 4"));
+        QCOMPARE(openEditors().last(), u"frmCDRootE U 4"_s);
     }
 
     void mp3CollectionsAreNotEditedYet()
@@ -228,9 +223,9 @@ private slots:
 
     void aFailureOfTheLoadIsTold()
     {
-        mCatalogue->exec(QStringLiteral("drop table MP3Collections"));
-        mDesktop->expectBox(QStringLiteral("error [Unable to initialise list!]"));
-        mDesktop->expectBox(QStringLiteral("no such table"));
+        mCatalogue->exec(u"drop table MP3Collections"_s);
+        mDesktop->expectBox(u"error [Unable to initialise list!]"_s);
+        mDesktop->expectBox(u"no such table"_s);
         show();
         QVERIFY(mScreen->updatesEnabled());
     }

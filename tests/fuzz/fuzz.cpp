@@ -19,47 +19,17 @@ std::vector<Target *> &registry()
 using Random = std::mt19937;
 
 // Pieces on which readers of text and of numbers stumble.
-const QByteArray pieces[] = {"'",
-                             "''",
-                             "\"",
-                             ";",
-                             "--",
-                             "/*",
-                             "(",
-                             ")",
-                             ",",
-                             "|",
-                             "%",
-                             "_",
-                             "\\",
-                             "*",
-                             "\n",
-                             "\r",
-                             "\r\n",
-                             "\xEF\xBB\xBF",
-                             "\xC3",
-                             "\xA9",
-                             "\xFF",
-                             "\xCC\x81",
-                             "\xF0\x9F",
-                             "0",
-                             "-1",
-                             "1e10",
-                             "99999999999",
-                             "{",
-                             "}",
-                             "[",
-                             "]",
-                             ":",
-                             "?",
-                             " ",
-                             "values",
-                             "order by 1",
-                             QByteArray("\0", 1)};
+const char *const pieces[] = {
+    "'",    "''",   "\"",   ";",        "--",       "/*", "(",  ")",      ",",
+    "|",    "%",    "_",    "\\",       "*",        "\n", "\r", "\r\n",   "\xEF\xBB\xBF",
+    "\xC3", "\xA9", "\xFF", "\xCC\x81", "\xF0\x9F", "0",  "-1", "1e10",   "99999999999",
+    "{",    "}",    "[",    "]",        ":",        "?",  " ",  "values", "order by 1",
+    "\0"};
 
 QByteArray anyPiece(Random &random)
 {
-    return pieces[random() % std::size(pieces)];
+    const char *piece = pieces[random() % std::size(pieces)];
+    return *piece ? QByteArray(piece) : QByteArray(1, 0);
 }
 
 void changeOnce(QByteArray &s, const Target &target, Random &random)

@@ -47,9 +47,8 @@ private slots:
             QVERIFY(!program.screen("frmSplash"));
             QCOMPARE(bool(program.screen("frmHelp")), start == 1);
             const bool dutch = start == 2 && language == languageDutch;
-            QCOMPARE(program.frame().windowTitle(), dutch
-                                                        ? QStringLiteral("Dr. Orvanta's Liedkist")
-                                                        : QStringLiteral("Dr. Orvanta's Songcase"));
+            QCOMPARE(program.frame().windowTitle(),
+                     dutch ? u"Dr. Orvanta's Liedkist"_s : u"Dr. Orvanta's Songcase"_s);
             QCOMPARE(program.frame().QMainWindow::size(), QSize(1000, 667));
             QCOMPARE(gConnection->State(), ADODB::adStateOpen);
             QVERIFY(program.end());
@@ -64,8 +63,8 @@ private slots:
         QFETCH(int, language);
         storeLanguage(language);
         const bool dutch = language == languageDutch;
-        writeFile(mDesktop->folder + QStringLiteral("/Compact3.orv"), "old");
-        const QString file = mDesktop->folder + QStringLiteral("/Compact4.orv");
+        writeFile(mDesktop->folder + u"/Compact3.orv"_s, "old");
+        const QString file = mDesktop->folder + u"/Compact4.orv"_s;
         mDesktop->expectBox(
             (dutch ? QStringLiteral("[Bestand niet gevonden] Er kan geen verbinding met "
                                     "de database worden gemaakt!\rHet bestand ")
@@ -82,10 +81,10 @@ private slots:
     {
         QTest::addColumn<QString>("fault");
         QTest::addColumn<QString>("said");
-        QTest::newRow("text") << QStringLiteral("text") << QStringLiteral("not a catalogue");
-        QTest::newRow("truncated") << QStringLiteral("truncated") << QStringLiteral("damaged");
-        QTest::newRow("read-only") << QStringLiteral("readonly") << QStringLiteral("read-only");
-        QTest::newRow("locked") << QStringLiteral("locked") << QStringLiteral("in use");
+        QTest::newRow("text") << u"text"_s << u"not a catalogue"_s;
+        QTest::newRow("truncated") << u"truncated"_s << u"damaged"_s;
+        QTest::newRow("read-only") << u"readonly"_s << u"read-only"_s;
+        QTest::newRow("locked") << u"locked"_s << u"in use"_s;
     }
 
     void aFileThatCannotBeUsedIsLeftAsItWas()
@@ -93,7 +92,7 @@ private slots:
         QFETCH(QString, fault);
         QFETCH(QString, said);
         makeCatalogue();
-        const QString file = mDesktop->folder + QStringLiteral("/Compact4.orv");
+        const QString file = mDesktop->folder + u"/Compact4.orv"_s;
         sqlite3 *other = nullptr;
         if (fault == QLatin1String("text"))
             writeFile(file, QByteArray(5000, 'x'));
@@ -107,22 +106,22 @@ private slots:
         }
         const QByteArray before = readFile(file);
 
-        mDesktop->expectBox(QStringLiteral("error [System error] ADO Connect Error: "));
+        mDesktop->expectBox(u"error [System error] ADO Connect Error: "_s);
         mDesktop->expectBox(said);
-        mDesktop->expectBox(QStringLiteral("[Unable to initialise list!]"));
+        mDesktop->expectBox(u"[Unable to initialise list!]"_s);
         mDesktop->expectBox(said);
         {
             Program program(*mDesktop);
             QVERIFY2(program.start(), "the frame stays up");
             QVERIFY(program.frame().isVisible());
             mDesktop->verifyAllCame();
-            mDesktop->expectBox(QStringLiteral("[Systeemfout]"));
-            mDesktop->expectBox(QStringLiteral("[System error]"));
+            mDesktop->expectBox(u"[Systeemfout]"_s);
+            mDesktop->expectBox(u"[System error]"_s);
             QVERIFY(program.end());
         }
         sqlite3_close(other);
         QCOMPARE(readFile(file), before);
-        QCOMPARE(QDir(mDesktop->folder).entryList({QStringLiteral("Compact4*")}).size(), 1);
+        QCOMPARE(QDir(mDesktop->folder).entryList({u"Compact4*"_s}).size(), 1);
     }
 
     void changeOfLanguage_data() { languages(); }
@@ -150,7 +149,7 @@ private slots:
             QCOMPARE(gLanguage, language);
             program.choose("mnuHelp");
             QCOMPARE(program.entry("Over")->text(),
-                     dutch ? QStringLiteral("&Over Liedkist") : QStringLiteral("&About Songcase"));
+                     dutch ? u"&Over Liedkist"_s : u"&About Songcase"_s);
             QVERIFY(program.end());
         }
         Program program(*mDesktop);
@@ -167,16 +166,15 @@ private slots:
         storeLanguage(language);
         Program program(*mDesktop);
         QVERIFY(program.start());
-        mDesktop->expectModal(QStringLiteral("frmSplash"), [](Form &splash) {
-            QCOMPARE(splash.findChild<QLabel *>(QStringLiteral("lblVersion"))->text(),
+        mDesktop->expectModal(u"frmSplash"_s, [](Form &splash) {
+            QCOMPARE(splash.findChild<QLabel *>(u"lblVersion"_s)->text(),
                      QStringLiteral("Version " SONGCASE_VERSION));
-            QCOMPARE(splash.findChild<QLabel *>(QStringLiteral("lblAuthor"))->text(), QString());
+            QCOMPARE(splash.findChild<QLabel *>(u"lblAuthor"_s)->text(), QString());
             QTest::keyClick(&splash, Qt::Key_Space);
         });
         program.choose("tbCredits");
-        const QString author = language == languageDutch
-                                   ? QStringLiteral("Door Arend K. Vossel")
-                                   : QStringLiteral("Created by Arend K. Vossel");
+        const QString author =
+            language == languageDutch ? u"Door Arend K. Vossel"_s : u"Created by Arend K. Vossel"_s;
         QCOMPARE(program.control<QLabel>("frmSplash", "lblAuthor")->text(), author);
         QVERIFY(!program.screen("frmSplash")->isVisible());
 
@@ -194,8 +192,8 @@ private slots:
                                                          : QLatin1String("guide/en/index.html")));
         QVERIFY(QFile::exists(QUrl(mDesktop->addresses.first()).toLocalFile()));
         mDesktop->browserThere = false;
-        mDesktop->expectBox(QStringLiteral("error [] No browser detected!").mid(0, 5));
-        emit link->linkActivated(QStringLiteral("guide"));
+        mDesktop->expectBox(u"error [] No browser detected!"_s.mid(0, 5));
+        emit link->linkActivated(u"guide"_s);
         QVERIFY(mDesktop->boxes.last().endsWith(QLatin1String("No browser detected!")));
         QVERIFY(program.end());
     }
@@ -246,10 +244,7 @@ private:
         QTest::newRow("Dutch") << languageDutch;
     }
 
-    void makeCatalogue()
-    {
-        cataloguefile::create(mDesktop->folder + QStringLiteral("/Compact4.orv"));
-    }
+    void makeCatalogue() { cataloguefile::create(mDesktop->folder + u"/Compact4.orv"_s); }
 
     std::unique_ptr<ScriptedDesktop> mDesktop;
 };

@@ -4,6 +4,7 @@
 #include "platform/desktop/form.h"
 #include "platform/desktop/modalloop.h"
 #include "platform/desktop/qtdesktop.h"
+#include "support/texts.h"
 
 #include <QPrinter>
 #include <QTest>
@@ -33,8 +34,7 @@ const char *kindOf(BoxKind kind, BoxButtons buttons)
 } // namespace
 
 ScriptedDesktop::ScriptedDesktop()
-    : folder(mTemporary.path()),
-      settings(mTemporary.filePath(QStringLiteral("config/settings.json")))
+    : folder(mTemporary.path()), settings(mTemporary.filePath(u"config/settings.json"_s))
 {
     setCurrent(this);
 }
@@ -54,13 +54,13 @@ void ScriptedDesktop::expectModal(const QString &name, std::function<void(Form &
 void ScriptedDesktop::verifyAllCame()
 {
     for (const Box &box : mBoxes)
-        failTest(QStringLiteral("This box did not come: ") + box.part);
+        failTest(u"This box did not come: "_s + box.part);
     for (const Modal &modal : mModals)
-        failTest(QStringLiteral("This screen did not come: ") + modal.name);
+        failTest(u"This screen did not come: "_s + modal.name);
     for (const QString &file : mFiles)
-        failTest(QStringLiteral("No dialog asked for: ") + file);
+        failTest(u"No dialog asked for: "_s + file);
     for (const QString &printer : mPrinters)
-        failTest(QStringLiteral("Nothing was printed: ") + printer);
+        failTest(u"Nothing was printed: "_s + printer);
     mBoxes.clear();
     mModals.clear();
     mFiles.clear();
@@ -70,13 +70,11 @@ void ScriptedDesktop::verifyAllCame()
 BoxAnswer ScriptedDesktop::messageBox(BoxKind kind, BoxButtons buttons, const QString &text,
                                       const QString &title)
 {
-    const QString line = QLatin1String(kindOf(kind, buttons)) + QStringLiteral(" [") + title +
-                         QStringLiteral("] ") + text;
+    const QString line = QLatin1String(kindOf(kind, buttons)) + u" ["_s + title + u"] "_s + text;
     boxes.append(line);
     if (mBoxes.empty() || !line.contains(mBoxes.front().part)) {
-        failTest(
-            QStringLiteral("Unexpected box: ") + line +
-            (mBoxes.empty() ? QString() : QStringLiteral("; awaited: ") + mBoxes.front().part));
+        failTest(u"Unexpected box: "_s + line +
+                 (mBoxes.empty() ? QString() : u"; awaited: "_s + mBoxes.front().part));
         return buttons == BoxButtons::YesNoCancel ? vbCancel
                                                   : (buttons == BoxButtons::YesNo ? vbNo : vbOK);
     }
@@ -93,13 +91,13 @@ void ScriptedDesktop::showModal(Form &form)
         script = mModals.front().script;
         mModals.pop_front();
     } else {
-        failTest(QStringLiteral("Unexpected modal screen: ") + form.Name());
+        failTest(u"Unexpected modal screen: "_s + form.Name());
     }
     QPointer<Form> alive = &form;
     QTimer guard;
     guard.setSingleShot(true);
     QObject::connect(&guard, &QTimer::timeout, &form, [alive] {
-        failTest(QStringLiteral("The modal screen did not end: ") + alive->Name());
+        failTest(u"The modal screen did not end: "_s + alive->Name());
         alive->hide();
     });
     guard.start(modalAtMost);
@@ -111,7 +109,7 @@ void ScriptedDesktop::showModal(Form &form)
 QString ScriptedDesktop::nextFile(const char *dialog)
 {
     if (mFiles.empty()) {
-        failTest(QStringLiteral("Unexpected dialog: ") + QLatin1String(dialog));
+        failTest(u"Unexpected dialog: "_s + QLatin1String(dialog));
         return {};
     }
     const QString file = mFiles.front();
@@ -137,7 +135,7 @@ QString ScriptedDesktop::folderName(const FileQuestion &)
 PrinterChoice ScriptedDesktop::choosePrinter(QPrinter &printer, int)
 {
     if (mPrinters.empty()) {
-        failTest(QStringLiteral("Unexpected dialog: printer"));
+        failTest(u"Unexpected dialog: printer"_s);
         return PrinterChoice::Cancelled;
     }
     const QString file = mPrinters.front();
