@@ -2,8 +2,11 @@
 
 #include "shell/services/messages.h"
 
+#include <QGuiApplication>
 #include <QIcon>
 #include <QKeyEvent>
+#include <QPainter>
+#include <QPalette>
 
 namespace
 {
@@ -16,14 +19,32 @@ public:
     const QString key;
 };
 
-QIcon icon(const char *name)
+enum class OnSelection { Same, Silhouette };
+
+// Of pictures in several sizes: what was drawn from a file of shapes would be tinted by the style
+// on a selected node, and a blue note on blue is none.
+QIcon icon(const char *name, OnSelection onSelection)
 {
-    return QIcon(QStringLiteral(":/icons/") + QLatin1String(name) + QStringLiteral(".svg"));
+    const QIcon drawn(QStringLiteral(":/icons/") + QLatin1String(name) + QStringLiteral(".svg"));
+    QIcon icon;
+    for (const int size : {16, 24, 32, 48, 64}) {
+        QPixmap picture = drawn.pixmap(QSize(size, size), 1.0);
+        icon.addPixmap(picture);
+        if (onSelection == OnSelection::Silhouette) {
+            QPainter painter(&picture);
+            painter.setCompositionMode(QPainter::CompositionMode_SourceIn);
+            painter.fillRect(picture.rect(), QGuiApplication::palette().highlightedText());
+        }
+        icon.addPixmap(picture, QIcon::Selected);
+    }
+    return icon;
 }
 
 const QIcon &iconOf(RecordTree::Level level)
 {
-    static const QIcon icons[] = {icon("letter"), icon("artist"), icon("track"), icon("disc")};
+    static const QIcon icons[] = {
+        icon("letter", OnSelection::Same), icon("artist", OnSelection::Silhouette),
+        icon("track", OnSelection::Silhouette), icon("disc", OnSelection::Same)};
     return icons[level];
 }
 
