@@ -6,6 +6,8 @@
 #include "shell/services/messages.h"
 #include "ui_frmPageSetup.h"
 
+#include <QScopedValueRollback>
+
 namespace
 {
 
@@ -63,7 +65,12 @@ void frmPageSetup::connectControls()
     connect(mUi->Paper, &QComboBox::currentIndexChanged, this, &frmPageSetup::paper_Change);
     connect(mUi->Landscape, &QRadioButton::toggled, this, &frmPageSetup::paper_Change);
     for (QSpinBox *margin : findChildren<QSpinBox *>())
-        connect(margin, &QSpinBox::valueChanged, this, &frmPageSetup::paper_Change);
+        connect(margin, &QSpinBox::valueChanged, this, [this, margin](int value) {
+            if (mFitting)
+                return;
+            mWanted[margin] = value;
+            paper_Change();
+        });
     connect(mUi->cmdOK, &QPushButton::clicked, this, &frmPageSetup::cmdOK_Click);
     connect(mUi->cmdCancel, &QPushButton::clicked, this, &Form::Unload);
 }
@@ -77,6 +84,8 @@ void frmPageSetup::showPaper(const QPageLayout &paper)
     mUi->MarginTop->setValue(margins.top());
     mUi->MarginRight->setValue(margins.right());
     mUi->MarginBottom->setValue(margins.bottom());
+    for (QSpinBox *margin : findChildren<QSpinBox *>())
+        mWanted[margin] = margin->value();
 }
 
 QPageLayout frmPageSetup::paper() const
@@ -92,13 +101,18 @@ QPageLayout frmPageSetup::paper() const
 void frmPageSetup::paper_Change()
 {
     const QSizeF sheet = paper().fullRect(QPageLayout::Millimeter).size();
-    const int across = reportpaper::largestMargin(sheet.width());
-    const int down = reportpaper::largestMargin(sheet.height());
-    mUi->MarginLeft->setRange(reportpaper::smallestMargin, across);
-    mUi->MarginRight->setRange(reportpaper::smallestMargin, across);
-    mUi->MarginTop->setRange(reportpaper::smallestMargin, down);
-    mUi->MarginBottom->setRange(reportpaper::smallestMargin, down);
+    fit(mUi->MarginLeft, sheet.width());
+    fit(mUi->MarginRight, sheet.width());
+    fit(mUi->MarginTop, sheet.height());
+    fit(mUi->MarginBottom, sheet.height());
     mUi->Picture->setPaper(paper());
+}
+
+void frmPageSetup::fit(QSpinBox *margin, double side)
+{
+    const QScopedValueRollback<bool> fitting(mFitting, true);
+    margin->setRange(reportpaper::smallestMargin, reportpaper::largestMargin(side));
+    margin->setValue(mWanted.value(margin, margin->value()));
 }
 
 void frmPageSetup::cmdOK_Click()

@@ -3,9 +3,11 @@
 #include "collection/reportcontent.h"
 #include "platform/desktop/form.h"
 
+#include <QHash>
 #include <QPageLayout>
 #include <memory>
 
+class QSpinBox;
 namespace Ui
 {
 class frmPageSetup;
@@ -32,7 +34,10 @@ private:
     void showPaper(const QPageLayout &paper);
     QPageLayout paper() const;
     void paper_Change();
+    void fit(QSpinBox *margin, double side);
     void cmdOK_Click();
 
     std::unique_ptr<Ui::frmPageSetup> mUi;
+    QHash<QSpinBox *, int> mWanted; // margins as the user set them, though the paper be too small
+    bool mFitting = false;
 };

@@ -304,6 +304,12 @@ private slots:
             auto *top = form.findChild<QSpinBox *>(u"MarginTop"_s);
             top->setValue(500);
             QCOMPARE(top->value(), 37); // a quarter of the paper
+            auto *left = form.findChild<QSpinBox *>(u"MarginLeft"_s);
+            left->setValue(50);
+            form.findChild<QRadioButton *>(u"Portrait"_s)->setChecked(true);
+            QCOMPARE(left->value(), 37);
+            form.findChild<QRadioButton *>(u"Landscape"_s)->setChecked(true);
+            QCOMPARE(left->value(), 50);
             QTest::keyClick(&form, Qt::Key_Return);
         });
         press(report, "cmdPageSetup");

@@ -6,9 +6,11 @@
 #include <QApplication>
 #include <QClipboard>
 #include <QHeaderView>
+#include <QHelpEvent>
 #include <QScrollBar>
 #include <QSignalSpy>
 #include <QTimer>
+#include <QToolTip>
 
 using namespace ADODB;
 
@@ -449,6 +451,19 @@ private slots:
                                 byEsc ? edge : QPoint(-20, 20));
             QCOMPARE(drops.count(), 0);
             QVERIFY(!timer->isActive());
+        }
+    }
+
+    void aTextThatIsCutIsToldWhole()
+    {
+        ShownList list;
+        list.ListItems().Item(1).setSubItems(1, u"<b>Long & Bold</b>"_s);
+        for (const int width : {300, 20}) {
+            list.ColumnHeaders().Item(2).setWidth(width);
+            const QPoint at = list.centreOf(1);
+            QHelpEvent event(QEvent::ToolTip, at, list.viewport()->mapToGlobal(at));
+            QApplication::sendEvent(list.viewport(), &event);
+            QCOMPARE(QToolTip::text().contains(u"&lt;b&gt;Long &amp; Bold"_s), width == 20);
         }
     }
 
