@@ -5,6 +5,7 @@
 
 #include <QString>
 #include <algorithm>
+#include <optional>
 #include <sqlite3.h>
 
 namespace ADODB
@@ -24,19 +25,21 @@ int prepareOne(sqlite3 *db, std::string_view sql, PreparedStatement &prepared)
     return code == SQLITE_OK && !s ? SQLITE_ERROR : code;
 }
 
-// Whether rows can be sorted by a column of the result without the engine.
-bool hasOurOrder(sqlite3 *db, sqlite3_stmt *s, int column)
+// How rows can be sorted by a column of the result without the engine; nothing if they cannot.
+std::optional<OrderColumn> orderBy(sqlite3 *db, sqlite3_stmt *s, int column)
 {
     const char *table = sqlite3_column_table_name(s, column);
     const char *origin = sqlite3_column_origin_name(s, column);
-    const char *type = nullptr, *collation = nullptr;
+    const char *collation = nullptr;
     if (!table || !origin)
-        return false; // an expression
+        return {}; // an expression
     if (sqlite3_table_column_metadata(db, sqlite3_column_database_name(s, column), table, origin,
-                                      &type, &collation, nullptr, nullptr, nullptr) != SQLITE_OK)
-        return false;
-    return sqlite3_stricmp(collation, collationName) == 0 ||
-           (type && sqlite3_stricmp(type, "INTEGER") == 0);
+                                      nullptr, &collation, nullptr, nullptr, nullptr) != SQLITE_OK)
+        return {};
+    const bool bytes = sqlite3_stricmp(collation, "BINARY") == 0;
+    if (!bytes && sqlite3_stricmp(collation, collationName) != 0)
+        return {};
+    return OrderColumn{column, bytes};
 }
 
 bool coversAll(const std::vector<int> &columns, int count)
@@ -55,12 +58,14 @@ bool prepareUnordered(sqlite3 *db, std::string_view sql, PreparedStatement &prep
     if (tail.columns.empty() || prepareOne(db, sql.substr(0, tail.from), prepared) != SQLITE_OK)
         return false;
     sqlite3_stmt *s = prepared.statement.get();
-    const auto sortable = [&](int column) {
-        return column < sqlite3_column_count(s) && hasOurOrder(db, s, column);
-    };
-    if (!std::all_of(tail.columns.begin(), tail.columns.end(), sortable))
-        return false;
-    prepared.order = tail.columns;
+    std::vector<OrderColumn> order;
+    for (const int column : tail.columns) {
+        const auto found = column < sqlite3_column_count(s) ? orderBy(db, s, column) : std::nullopt;
+        if (!found)
+            return false;
+        order.push_back(*found);
+    }
+    prepared.order = std::move(order);
     constexpr std::string_view distinct = "select distinct ";
     if (sql.starts_with(distinct) && coversAll(tail.columns, sqlite3_column_count(s))) {
         const auto all = sql.substr(distinct.size(), tail.from - distinct.size());

@@ -26,7 +26,7 @@ struct PreparedStatement {
     /// 1,2" is run without it where all of its columns are in the program's order of texts. The
     /// rows are in memory anyway, sorting them there takes half the time, and the engine is free to
     /// join as is fastest.
-    std::vector<int> order;
+    std::vector<OrderColumn> order;
 
     /// A "select distinct" ordered by all of its columns is run without the "distinct" too: rows
     /// that are alike are found side by side.

@@ -25,7 +25,7 @@ private:
 class RowOrder
 {
 public:
-    RowOrder(const Rows &rows, const std::vector<int> &columns, Repeats repeats)
+    RowOrder(const Rows &rows, const std::vector<OrderColumn> &columns, Repeats repeats)
         : mRows(rows), mColumns(columns), mRepeats(repeats)
     {
     }
@@ -65,7 +65,7 @@ private:
             finish(from, to);
             return;
         }
-        const int column = mColumns[level];
+        const int column = mColumns[level].column;
         const auto kind = [&](const Entry &e) { return mRows.kind(e.row, column); };
         Entry *numbers =
             std::partition(from, to, [&](const Entry &e) { return kind(e) == Kind::Null; });
@@ -86,7 +86,7 @@ private:
 
     void sortNumbers(Entry *from, Entry *to, std::size_t level) const
     {
-        const int column = mColumns[level];
+        const int column = mColumns[level].column;
         std::sort(from, to, [&](const Entry &a, const Entry &b) {
             return number(a.row, column) < number(b.row, column);
         });
@@ -97,11 +97,25 @@ private:
 
     void sortTexts(Entry *from, Entry *to, std::size_t level) const
     {
-        const ColumnTexts texts(mRows, mColumns[level]);
+        const ColumnTexts texts(mRows, mColumns[level].column);
+        if (mColumns[level].byBytes) {
+            sortBytes(from, to, level, texts);
+            return;
+        }
         TextSort(texts).sort(from, to);
         sortRuns(from, to, level, [&](const Entry &a, const Entry &b) {
             const auto x = texts.text(a.row), y = texts.text(b.row);
             return x == y || text::Collation::root().compare(x, y) == 0;
+        });
+    }
+
+    void sortBytes(Entry *from, Entry *to, std::size_t level, const ColumnTexts &texts) const
+    {
+        std::sort(from, to, [&](const Entry &a, const Entry &b) {
+            return texts.text(a.row) < texts.text(b.row);
+        });
+        sortRuns(from, to, level, [&](const Entry &a, const Entry &b) {
+            return texts.text(a.row) == texts.text(b.row);
         });
     }
 
@@ -118,13 +132,13 @@ private:
     }
 
     const Rows &mRows;
-    const std::vector<int> &mColumns;
+    const std::vector<OrderColumn> &mColumns;
     Repeats mRepeats;
 };
 
 } // namespace
 
-std::vector<std::uint32_t> rowOrder(const Rows &rows, const std::vector<int> &columns,
+std::vector<std::uint32_t> rowOrder(const Rows &rows, const std::vector<OrderColumn> &columns,
                                     Repeats repeats)
 {
     return RowOrder(rows, columns, repeats).sorted();

@@ -107,7 +107,8 @@ private:
                 ('жук',11),('日本',12),('10',13),('9',14),(' a',15),('a',16),('œuvre',17),('zz%',18);
             insert into Artiesten select n, w from Word;
             insert into Tracks select a.n * 100 + b.n, a.n % 5, b.w, a.w,
-                case b.n % 4 when 0 then null when 1 then 1985.5 when 2 then 1985 else 2000 - b.n end
+                case b.n % 5 when 0 then null when 1 then 1985.5 when 2 then 1985 when 3 then b.w
+                    else 2000 - b.n end
                 from Word a, Word b;)"));
     }
 };
