@@ -280,6 +280,10 @@ private slots:
         QVERIFY(field->value() > 1 && field->value() < 5);
         field->setFocus();
         field->selectAll();
+        QTest::keyClicks(field, u"99999"_s);
+        QCOMPARE(key(Qt::Key_Return), last);
+        field->setFocus();
+        field->selectAll();
         QTest::keyClicks(field, u"1234"_s);
         QCOMPARE(key(Qt::Key_Return), 1234);
         QCOMPARE(QApplication::focusWidget(), view);
