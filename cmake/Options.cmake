@@ -24,6 +24,15 @@ set_target_properties(songcase_pch PROPERTIES AUTOMOC OFF AUTOUIC OFF AUTORCC OF
 function(songcase_room name folder)
     file(GLOB sources CONFIGURE_DEPENDS ${CMAKE_SOURCE_DIR}/src/${folder}/*.cpp
         ${CMAKE_SOURCE_DIR}/src/${folder}/*.h ${CMAKE_SOURCE_DIR}/src/${folder}/*.ui)
+    # A header that is new to a build is not seen by AUTOMOC until its stamp is gone.
+    set(known ${CMAKE_CURRENT_BINARY_DIR}/${name}.sources)
+    if(EXISTS ${known})
+        file(READ ${known} before)
+    endif()
+    if(NOT "${before}" STREQUAL "${sources}")
+        file(REMOVE ${CMAKE_CURRENT_BINARY_DIR}/${name}_autogen/timestamp)
+        file(WRITE ${known} "${sources}")
+    endif()
     add_library(${name} STATIC ${sources})
     target_link_libraries(${name} PUBLIC songcase_options Qt6::Widgets ${ARGN})
     target_precompile_headers(${name} REUSE_FROM songcase_pch)
