@@ -2,12 +2,12 @@
 
 #include "collection/frmPageSetup.h"
 #include "collection/reportpaper.h"
+#include "collection/ui_Report.h"
 #include "platform/desktop/throttledpump.h"
 #include "shell/services/captions.h"
 #include "shell/services/fileutilities.h"
 #include "shell/services/frame.h"
 #include "shell/services/messages.h"
-#include "ui_Report.h"
 
 #include <QKeyEvent>
 #include <QPrinter>

@@ -6,6 +6,7 @@
 #include "collection/editors.h"
 #include "collection/recordnodes.h"
 #include "collection/reports.h"
+#include "collection/ui_frmCDList.h"
 #include "controls/DBListViewCTL.h"
 #include "platform/desktop/desktop.h"
 #include "platform/text/textrules.h"
@@ -13,7 +14,6 @@
 #include "shell/services/frame.h"
 #include "shell/services/globals.h"
 #include "shell/services/messages.h"
-#include "ui_frmCDList.h"
 
 #include <QHeaderView>
 

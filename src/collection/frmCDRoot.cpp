@@ -1,11 +1,11 @@
 #include "collection/frmCDRoot.h"
 
 #include "catalogue/quoting.h"
+#include "collection/ui_frmCDRoot.h"
 #include "platform/ado/error.h"
 #include "platform/desktop/desktop.h"
 #include "shell/services/captions.h"
 #include "shell/services/messages.h"
-#include "ui_frmCDRoot.h"
 
 frmCDRoot::frmCDRoot()
     : CdEditor(QStringLiteral("frmCDRoot")), mUi(std::make_unique<Ui::frmCDRoot>())

@@ -2,9 +2,9 @@
 
 #include "catalogue/quoting.h"
 #include "collection/albumartist.h"
+#include "collection/ui_frmCDRootE.h"
 #include "shell/services/captions.h"
 #include "shell/services/messages.h"
-#include "ui_frmCDRootE.h"
 
 frmCDRootE::frmCDRootE()
     : CdEditor(QStringLiteral("frmCDRootE")), mUi(std::make_unique<Ui::frmCDRootE>())

@@ -1,10 +1,10 @@
 #include "collection/frmPageSetup.h"
 
 #include "collection/reportpaper.h"
+#include "collection/ui_frmPageSetup.h"
 #include "shell/services/captions.h"
 #include "shell/services/frame.h"
 #include "shell/services/messages.h"
-#include "ui_frmPageSetup.h"
 
 #include <QScopedValueRollback>
 

@@ -3,6 +3,7 @@
 #include "collection/editors.h"
 #include "collection/foundtrack.h"
 #include "collection/resultlines.h"
+#include "collection/ui_frmSearchArtistsTitles.h"
 #include "controls/DBListViewCTL.h"
 #include "platform/desktop/desktop.h"
 #include "platform/desktop/throttledpump.h"
@@ -12,7 +13,6 @@
 #include "shell/services/globals.h"
 #include "shell/services/messages.h"
 #include "shell/services/textfiles.h"
-#include "ui_frmSearchArtistsTitles.h"
 
 #include <QKeyEvent>
 

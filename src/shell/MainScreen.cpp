@@ -14,8 +14,8 @@
 #include "shell/services/fileutilities.h"
 #include "shell/services/globals.h"
 #include "shell/services/messages.h"
+#include "shell/ui_MainScreen.h"
 #include "textimport/frmImportWizard.h"
-#include "ui_MainScreen.h"
 
 #include <QCloseEvent>
 #include <QDir>

@@ -4,7 +4,7 @@
 #include "shell/services/captions.h"
 #include "shell/services/globals.h"
 #include "shell/services/messages.h"
-#include "ui_frmHelp.h"
+#include "shell/ui_frmHelp.h"
 
 #include <QCoreApplication>
 #include <QFileInfo>

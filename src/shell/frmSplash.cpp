@@ -1,7 +1,7 @@
 #include "shell/frmSplash.h"
 
 #include "shell/services/messages.h"
-#include "ui_frmSplash.h"
+#include "shell/ui_frmSplash.h"
 
 #include <QElapsedTimer>
 #include <QScreen>

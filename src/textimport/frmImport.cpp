@@ -6,7 +6,7 @@
 #include "shell/services/messages.h"
 #include "textimport/frmImportDBBusy.h"
 #include "textimport/importrecords.h"
-#include "ui_frmImport.h"
+#include "textimport/ui_frmImport.h"
 
 #include <QStyle>
 

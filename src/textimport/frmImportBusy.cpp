@@ -7,7 +7,7 @@
 #include "shell/services/messages.h"
 #include "textimport/filereading.h"
 #include "textimport/frmImport.h"
-#include "ui_frmImportBusy.h"
+#include "textimport/ui_frmImportBusy.h"
 
 #include <QTimer>
 

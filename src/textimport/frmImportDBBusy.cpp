@@ -9,7 +9,7 @@
 #include "shell/services/globals.h"
 #include "shell/services/messages.h"
 #include "textimport/catalogueload.h"
-#include "ui_frmImportDBBusy.h"
+#include "textimport/ui_frmImportDBBusy.h"
 
 #include <QTimer>
 

@@ -6,7 +6,7 @@
 #include "shell/services/globals.h"
 #include "shell/services/messages.h"
 #include "textimport/frmImportBusy.h"
-#include "ui_frmImportWizard.h"
+#include "textimport/ui_frmImportWizard.h"
 
 #include <QFileInfo>
 
