@@ -417,6 +417,8 @@ void CdEditor::GoToTrack(int disc, int track)
         return;
     const QScopedValueRollback<bool> busy(mBusy, true);
     goToTab(disc - 1);
+    if (mControls.discs->currentIndex() != disc - 1)
+        return; // the disc that showed could not be saved, and stays
     mControls.disk->setCurrentRow(track);
     mControls.disk->setCurrentColumn(1);
     focusDisk();

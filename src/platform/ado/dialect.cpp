@@ -194,7 +194,7 @@ void Dialect::word(QStringView s)
     if (is(w, QLatin1String("like")) && likeText(s, w))
         return;
     deleteAlias(w);
-    mBetween = behind(mBetween, w);
+    mBetween = betweenAfter(mBetween, w);
     const auto last = mSql.find_last_not_of(' ');
     if (last == std::string::npos || mSql[last] != '.')
         mNameAt = mSql.size();
@@ -203,7 +203,7 @@ void Dialect::word(QStringView s)
 }
 
 // "between a and b": a condition may begin behind the next "and" only.
-Dialect::Between Dialect::behind(Between now, QStringView w)
+Dialect::Between Dialect::betweenAfter(Between now, QStringView w)
 {
     if (is(w, QLatin1String("between")))
         return Between::Lower;

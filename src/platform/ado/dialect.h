@@ -41,7 +41,7 @@ private:
     bool maxOfSum(QStringView s);
     void deleteAlias(QStringView w);
     enum class Between { None, Lower, Upper };
-    static Between behind(Between now, QStringView w);
+    static Between betweenAfter(Between now, QStringView w);
     bool likeText(QStringView s, QStringView w);
     bool liftsHere() const { return mLifts && !mOrdinals.back(); }
     [[noreturn]] void refuse(const QString &why) const;

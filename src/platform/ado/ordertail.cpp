@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cctype>
 #include <charconv>
+#include <string>
 
 namespace ADODB
 {
@@ -25,6 +26,16 @@ bool dropWord(std::string_view &text, std::string_view word)
         return false;
     text.remove_suffix(word.size());
     return text.ends_with(' ');
+}
+
+// No literal can be taken for one of these words: those were lifted out.
+bool isCompound(std::string_view sql)
+{
+    std::string small(sql);
+    std::transform(small.begin(), small.end(), small.begin(),
+                   [](unsigned char c) { return char(std::tolower(c)); });
+    return small.find("union") != std::string::npos || small.find("except") != std::string::npos ||
+           small.find("intersect") != std::string::npos;
 }
 
 // The numbers of a list "1,2, 3"; none if it holds anything else.
@@ -56,7 +67,7 @@ OrderTail orderTail(std::string_view sql)
     auto head = sql.substr(0, sql.find_last_not_of("0123456789, ") + 1);
     const auto columns = ordinals(sql.substr(head.size()));
     if (!sql.starts_with("select ") || columns.empty() || !dropWord(head, "by") ||
-        !dropWord(head, "order"))
+        !dropWord(head, "order") || isCompound(head))
         return {};
     return {head.size(), columns};
 }

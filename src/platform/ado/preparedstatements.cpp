@@ -65,13 +65,14 @@ bool prepareUnordered(sqlite3 *db, std::string_view sql, PreparedStatement &prep
             return false;
         order.push_back(*found);
     }
-    prepared.order = std::move(order);
     constexpr std::string_view distinct = "select distinct ";
     if (sql.starts_with(distinct) && coversAll(tail.columns, sqlite3_column_count(s))) {
         const auto all = sql.substr(distinct.size(), tail.from - distinct.size());
+        if (prepareOne(db, "select " + std::string(all), prepared) != SQLITE_OK)
+            return false;
         prepared.repeats = Repeats::Dropped;
-        return prepareOne(db, "select " + std::string(all), prepared) == SQLITE_OK;
     }
+    prepared.order = std::move(order);
     return true;
 }
 

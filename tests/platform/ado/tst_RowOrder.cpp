@@ -22,8 +22,10 @@ private slots:
             << QByteArray("select a from t ORDER  BY 2 , 1") << u"1 0"_s;
         for (const char *other :
              {"select a from t order by 1 desc", "select a from t order by a, 1", "select a from t",
-              "select a from t group by 1", "select a from t where reorder by 1",
-              "update t set a = 1", "select a from t order by 0", "select a from t order by 1,,2",
+              "select a from t group by 1",
+              "select distinct a from t union all select b from u order by 1",
+              "select a from t where reorder by 1", "update t set a = 1",
+              "select a from t order by 0", "select a from t order by 1,,2",
               "select a from t limit 2", "select a from t where x between 1 and 2",
               "select a from (select b order by 1)", "select a from t order by 1,",
               "select a from t order by 99999999999"})
