@@ -1,7 +1,7 @@
 #include "browsepages.h"
 #include "cases.h"
 #include "platform/ado/recordset.h"
-#include "shell/services/globals.h"
+#include "services/globals.h"
 #include "shell/startup.h"
 
 namespace

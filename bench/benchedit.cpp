@@ -2,22 +2,24 @@
 #include "collection/frmCDList.h"
 #include "collection/frmCDRoot.h"
 #include "collection/recordtree.h"
-#include "controls/trackcompletion.h"
-#include "controls/trackrow.h"
-#include "controls/trackstore.h"
+#include "controls/tracks/trackcompletion.h"
+#include "controls/tracks/trackrow.h"
+#include "controls/tracks/trackstore.h"
 #include "platform/ado/recordset.h"
-#include "shell/services/globals.h"
+#include "services/globals.h"
 #include "shell/startup.h"
 
 #include <QApplication>
 
+using namespace Qt::StringLiterals;
+
 namespace
 {
 
-const auto sizeOfDiscs = QStringLiteral(
-    "select cdt.id as ID, count(*) as N from CDTitels cdt, CompactDiscs cds where cdt.cd_type='V'"
+const auto sizeOfDiscs =
+    u"select cdt.id as ID, count(*) as N from CDTitels cdt, CompactDiscs cds where cdt.cd_type='V'"
     " and cds.CDTitels_ID=cdt.id and cds.DiskNo=1 and cdt.id < 5000 group by cdt.id having "
-    "count(*)=20");
+    "count(*)=20"_s;
 
 void openCopy(const benchdata::Scale &scale)
 {
@@ -39,7 +41,7 @@ void openEditor(benchmark::State &state, const benchdata::Scale &scale)
     const qint64 disc = aDisc();
     for (auto _ : state) {
         auto *editor = new frmCDRoot;
-        editor->Mode = QStringLiteral("U");
+        editor->Mode = u"U"_s;
         editor->CdId = disc;
         editor->Show();
         QApplication::processEvents();
@@ -66,7 +68,7 @@ void saveDisc(benchmark::State &state, const benchdata::Scale &scale)
             tracks.append({track.linkId, false, track.texts, track.texts});
             links.append(track.linkId);
         }
-        tracks[3].texts[TitleField] = QStringLiteral("Another title ") + QString::number(++round);
+        tracks[3].texts[TitleField] = u"Another title "_s + QString::number(++round);
         tracks[3].changed = true;
         ADODB::Transaction transaction(*gConnection);
         store.save(tracks, links);
@@ -79,8 +81,7 @@ void completeArtist(benchmark::State &state, const benchdata::Scale &scale)
 {
     openCopy(scale);
     for (auto _ : state) {
-        for (const QString &typed :
-             {QStringLiteral("m"), QStringLiteral("ma"), QStringLiteral("de ")})
+        for (const QString &typed : {u"m"_s, u"ma"_s, u"de "_s})
             benchmark::DoNotOptimize(trackcompletion::artists(*gConnection, typed));
     }
     state.SetItemsProcessed(state.iterations() * 3);
@@ -92,11 +93,11 @@ void openLetter(benchmark::State &state, const benchdata::Scale &scale)
     openCopy(scale);
     auto *browser = new frmCDList;
     browser->Show();
-    auto *tree = browser->findChild<RecordTree *>(QStringLiteral("Platenbak"));
+    auto *tree = browser->findChild<RecordTree *>(u"Platenbak"_s);
     int artists = 0;
     for (auto _ : state) {
-        browser->FillArtistNode(*tree, QStringLiteral("D"));
-        artists = tree->node(QStringLiteral("D"))->childCount() - 1; // the placeholder
+        browser->FillArtistNode(*tree, u"D"_s);
+        artists = tree->node(u"D"_s)->childCount() - 1; // the placeholder
         state.PauseTiming();
         tree->resetRoots();
         state.ResumeTiming();

@@ -2,7 +2,7 @@
 #include "catalogue/cleanorphans.h"
 #include "platform/ado/connection.h"
 #include "rawdatabase.h"
-#include "shell/services/globals.h"
+#include "services/globals.h"
 #include "shell/startup.h"
 
 namespace

@@ -2,13 +2,15 @@
 #include "platform/ado/dialect.h"
 #include "platform/ado/recordset.h"
 #include "rawdatabase.h"
-#include "shell/services/globals.h"
+#include "services/globals.h"
 #include "shell/startup.h"
+
+using namespace Qt::StringLiterals;
 
 namespace
 {
 
-const auto findArtist = QStringLiteral("Select ID, Naam From Artiesten where Naam = '%1'");
+const auto findArtist = u"Select ID, Naam From Artiesten where Naam = '%1'"_s;
 
 const char *const typical[] = {
     "Select ID, Naam From Artiesten where Naam = 'O''Brien & The Foxes'",
@@ -24,8 +26,7 @@ void find(benchmark::State &state)
 {
     startup::openCatalogue(
         QString::fromStdString(benchdata::catalogue(benchdata::scales().front())), false);
-    const QString statement =
-        QString(findArtist).replace(QLatin1String("%1"), QLatin1String("Nobody At All"));
+    const QString statement = QString(findArtist).replace("%1"_L1, "Nobody At All"_L1);
     const ADODB::Transaction transaction(*gConnection);
     for (auto _ : state) {
         ADODB::Recordset answer;

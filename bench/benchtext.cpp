@@ -2,7 +2,7 @@
 #include "cases.h"
 #include "chooseimport.h"
 #include "platform/ado/recordset.h"
-#include "shell/services/globals.h"
+#include "services/globals.h"
 #include "shell/startup.h"
 #include "textimport/catalogueload.h"
 #include "textimport/filereading.h"

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "controls/sortedrows.h"
+#include "controls/list/sortedrows.h"
 
 #include <memory>
 

@@ -1,6 +1,6 @@
 #include "chooseimport.h"
 
-#include "shell/services/globals.h"
+#include "services/globals.h"
 
 void chooseImport(char format, const QString &file)
 {

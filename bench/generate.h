@@ -23,7 +23,7 @@ struct CatalogueCounts {
 
 /// Writes a catalogue of compilations (three in ten), albums and box sets of both kinds; a quarter
 /// of a compilation's tracks stand on another title too. The file must not be there yet. Throws
-/// ADODB::Error or std::runtime_error.
+/// Error or std::runtime_error.
 CatalogueCounts generateCatalogue(const std::string &file, const CataloguePlan &plan);
 
 /// Writes a text file of discs with that many tracks in all, in UTF-8. Format 'A': compilations,

@@ -3,7 +3,7 @@
 #include "catalogue/cataloguefile.h"
 #include "catalogue/connect.h"
 #include "platform/ado/connection.h"
-#include "shell/services/globals.h"
+#include "services/globals.h"
 
 void openForWork(const QString &file)
 {

@@ -3,5 +3,5 @@
 #include <QString>
 
 /// Opens a catalogue as gConnection as the program does, less the look through the whole file that
-/// belongs to a start and not to the work that is measured. Throws ADODB::Error.
+/// belongs to a start and not to the work that is measured. Throws Error.
 void openForWork(const QString &file);

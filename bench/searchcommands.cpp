@@ -1,41 +1,43 @@
 #include "collection/resultlines.h"
 #include "collection/searchstatement.h"
-#include "controls/sortedrows.h"
+#include "controls/list/sortedrows.h"
 #include "measure.h"
 #include "opencatalogue.h"
 #include "platform/ado/connection.h"
 #include "platform/ado/recordset.h"
 #include "platform/desktop/desktop.h"
-#include "shell/services/globals.h"
-#include "shell/services/textfiles.h"
+#include "services/globals.h"
+#include "services/textfiles.h"
 #include "workcommands.h"
 
 #include <QFileInfo>
+
+using namespace Qt::StringLiterals;
 
 namespace
 {
 
 SearchKey::Mode modeOf(const QString &name)
 {
-    if (name == QLatin1String("full"))
+    if (name == "full"_L1)
         return SearchKey::FullWord;
-    if (name == QLatin1String("begin"))
+    if (name == "begin"_L1)
         return SearchKey::BeginWord;
-    return name == QLatin1String("end") ? SearchKey::EndWord : SearchKey::PartWord;
+    return name == "end"_L1 ? SearchKey::EndWord : SearchKey::PartWord;
 }
 
 SearchKey keyOf(const QString &mode, const QString &field, const QString &word)
 {
     SearchKey key;
     key.mode = modeOf(mode);
-    const bool three = field == QLatin1String("three");
-    if (three || field == QLatin1String("artist"))
+    const bool three = field == "three"_L1;
+    if (three || field == "artist"_L1)
         key.artist = word;
-    if (three || field == QLatin1String("title"))
+    if (three || field == "title"_L1)
         key.title = word;
-    if (three || field == QLatin1String("genre"))
+    if (three || field == "genre"_L1)
         key.genre = word;
-    if (field == QLatin1String("year"))
+    if (field == "year"_L1)
         key.firstYear = word;
     return key;
 }
@@ -66,7 +68,7 @@ void exportAll(const QStringList &arguments)
             written = written && WriteTextLine(file, resultLine(texts));
         }
         if (!written || !CloseTextFile(file))
-            errorBox(QStringLiteral("The file could not be written."));
+            errorBox(u"The file could not be written."_s);
         return count("bytes", QFileInfo(arguments[1]).size());
     });
 }

@@ -3,12 +3,14 @@
 #include "measure.h"
 #include "opencatalogue.h"
 #include "platform/ado/recordset.h"
-#include "shell/services/globals.h"
+#include "services/globals.h"
 #include "textimport/catalogueload.h"
 #include "textimport/filereading.h"
 #include "workcommands.h"
 
 #include <QTemporaryDir>
+
+using namespace Qt::StringLiterals;
 
 namespace
 {
@@ -21,7 +23,7 @@ void read(const QString &format, const QString &file)
         try {
             reading.run();
         } catch (const DataError &error) {
-            throw ADODB::Error(error.line, QString(), error.reason);
+            throw Error(error.line, QString(), error.reason);
         }
         return count("rows", gImportRecords->RecordCount()) + count("lines", reading.lineNumber());
     });
@@ -33,7 +35,7 @@ void read(const QString &format, const QString &file)
 void readText(const QStringList &arguments)
 {
     const QTemporaryDir folder;
-    const QString catalogue = folder.filePath(QStringLiteral("empty.orv"));
+    const QString catalogue = folder.filePath(u"empty.orv"_s);
     cataloguefile::create(catalogue);
     openForWork(catalogue);
     read(arguments[0], arguments[1]);

@@ -1,8 +1,8 @@
 #include "consoledesktop.h"
 #include "measure.h"
 #include "platform/ado/connection.h"
-#include "platform/ado/error.h"
-#include "shell/services/globals.h"
+#include "platform/error/error.h"
+#include "services/globals.h"
 #include "workcommands.h"
 
 #include <QCoreApplication>

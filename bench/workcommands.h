@@ -3,7 +3,7 @@
 #include <QStringList>
 
 // What songcase-work can do: each command is what a screen does, with the program's own code, and
-// prints what it did. Failures are ADODB::Error or an error box.
+// prints what it did. Failures are Error or an error box.
 
 void newCatalogue(const QStringList &arguments);  // CATALOGUE
 void browse(const QStringList &arguments);        // CATALOGUE

@@ -13,15 +13,31 @@ if(SONGCASE_SANITIZE)
     target_link_options(songcase_options INTERFACE -fsanitize=address,undefined)
 endif()
 
-# One precompiled header for all that uses Qt.
+# A precompiled header for the rooms without widgets and one for all others. Every source compiles
+# without them too: the preset "tidy" has none.
+option(SONGCASE_PCH "Precompiled headers" ON)
 file(WRITE ${CMAKE_BINARY_DIR}/pch.cpp "")
-add_library(songcase_pch STATIC ${CMAKE_BINARY_DIR}/pch.cpp)
-target_link_libraries(songcase_pch PUBLIC songcase_options Qt6::Widgets)
-target_precompile_headers(songcase_pch PRIVATE <QtCore> <QtWidgets>)
-set_target_properties(songcase_pch PROPERTIES AUTOMOC OFF AUTOUIC OFF AUTORCC OFF)
+function(songcase_pch name library)
+    add_library(${name} STATIC ${CMAKE_BINARY_DIR}/pch.cpp)
+    target_link_libraries(${name} PUBLIC songcase_options ${library})
+    if(SONGCASE_PCH)
+        target_precompile_headers(${name} PRIVATE ${ARGN})
+    endif()
+    set_target_properties(${name} PROPERTIES AUTOMOC OFF AUTOUIC OFF AUTORCC OFF)
+endfunction()
+songcase_pch(songcase_pch Qt6::Widgets <QtCore> <QtWidgets>)
+songcase_pch(songcase_core_pch Qt6::Core <QtCore>)
 
-# songcase_room(NAME FOLDER DEPENDENCIES...): a library of all sources in a folder below src/.
+# songcase_use_pch(TARGET PCH)
+function(songcase_use_pch target pch)
+    if(SONGCASE_PCH)
+        target_precompile_headers(${target} REUSE_FROM ${pch})
+    endif()
+endfunction()
+
+# songcase_room(NAME FOLDER [WIDGETS] LIBRARIES...): a library of all sources in a folder below src/.
 function(songcase_room name folder)
+    cmake_parse_arguments(PARSE_ARGV 2 room WIDGETS "" "")
     file(GLOB sources CONFIGURE_DEPENDS ${CMAKE_SOURCE_DIR}/src/${folder}/*.cpp
         ${CMAKE_SOURCE_DIR}/src/${folder}/*.h ${CMAKE_SOURCE_DIR}/src/${folder}/*.ui)
     # A header that is new to a build is not seen by AUTOMOC until its stamp is gone.
@@ -34,6 +50,11 @@ function(songcase_room name folder)
         file(WRITE ${known} "${sources}")
     endif()
     add_library(${name} STATIC ${sources})
-    target_link_libraries(${name} PUBLIC songcase_options Qt6::Widgets ${ARGN})
-    target_precompile_headers(${name} REUSE_FROM songcase_pch)
+    target_link_libraries(${name} PUBLIC songcase_options Qt6::Core ${room_UNPARSED_ARGUMENTS})
+    if(room_WIDGETS)
+        target_link_libraries(${name} PUBLIC Qt6::Widgets)
+        songcase_use_pch(${name} songcase_pch)
+    else()
+        songcase_use_pch(${name} songcase_core_pch)
+    endif()
 endfunction()

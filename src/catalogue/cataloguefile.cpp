@@ -1,14 +1,17 @@
 #include "catalogue/cataloguefile.h"
 
+#include "platform/ado/engineerror.h"
 #include "platform/ado/recordset.h"
 #include "platform/ado/sqlfunctions.h"
 #include "platform/text/collation.h"
-#include "shell/services/messages.h"
+#include "services/messages.h"
 
 #include <QFile>
 #include <QFileInfo>
 #include <QtEndian>
 #include <sqlite3.h>
+
+using namespace Qt::StringLiterals;
 
 namespace cataloguefile
 {
@@ -77,9 +80,9 @@ QByteArray pragma(const char *name, int value)
     return QByteArray("PRAGMA ") + name + '=' + QByteArray::number(value);
 }
 
-[[noreturn]] void refuse(ADODB::ErrorNumber number, const char *key)
+[[noreturn]] void refuse(ErrorNumber number, const char *key)
 {
-    throw ADODB::Error(number, QStringLiteral("Songcase"), GetMessage(key));
+    throw Error(number, u"Songcase"_s, GetMessage(key));
 }
 
 bool mayBeWritten(const QFileInfo &file)
@@ -123,18 +126,18 @@ void inspect(const QString &name)
     const QFileInfo info(name);
     QFile file(name);
     if (info.isDir())
-        refuse(ADODB::errCannotUse, "xNotACatalogue");
+        refuse(errCannotUse, "xNotACatalogue");
     if (!file.open(QIODevice::ReadOnly))
         throw ADODB::engineError(SQLITE_CANTOPEN, file.errorString());
     const QByteArray header = file.read(headerSize);
     const bool database = header.size() == headerSize && header.startsWith("SQLite format 3");
     if (!database ||
         qFromBigEndian<qint32>(header.constData() + applicationOffset) != applicationId)
-        refuse(ADODB::errCannotUse, "xNotACatalogue");
+        refuse(errCannotUse, "xNotACatalogue");
     if (qFromBigEndian<quint32>(header.constData() + versionOffset) >> 24 > quint32(formatVersion))
-        refuse(ADODB::errCannotUse, "xNewerCatalogue");
+        refuse(errCannotUse, "xNewerCatalogue");
     if (!mayBeWritten(info))
-        refuse(ADODB::errReadOnly, "xReadOnly");
+        refuse(errReadOnly, "xReadOnly");
 }
 
 namespace
@@ -143,14 +146,13 @@ namespace
 void requireTables(ADODB::Connection &connection)
 {
     ADODB::Recordset names;
-    names.Open(QStringLiteral("select name as Name from sqlite_schema where type='table'"),
-               connection);
+    names.Open(u"select name as Name from sqlite_schema where type='table'"_s, connection);
     QStringList found;
     for (; !names.isEOF(); names.MoveNext())
         found.append(names.Fields(0).Value().toText().toLower());
     for (const char *table : tables) {
         if (!found.contains(QLatin1String(table).toString().toLower()))
-            refuse(ADODB::errCannotUse, "xTablesMissing");
+            refuse(errCannotUse, "xTablesMissing");
     }
 }
 
@@ -176,8 +178,8 @@ void verify(ADODB::Connection &connection, bool thorough)
     requireTables(connection);
     const QFileInfo file(ADODB::Connection::dataSource(connection.ConnectionString));
     const bool check = thorough || file.size() <= quicklyChecked;
-    if (check && connection.housekeeping("PRAGMA quick_check(1)") != QLatin1String("ok"))
-        refuse(ADODB::errCannotUse, "xDamaged");
+    if (check && connection.housekeeping("PRAGMA quick_check(1)") != "ok"_L1)
+        refuse(errCannotUse, "xDamaged");
     // Another program may have left it in a mode that keeps files beside it.
     connection.housekeeping("PRAGMA journal_mode=DELETE");
     keepSortOrder(connection);

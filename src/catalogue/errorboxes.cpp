@@ -2,14 +2,14 @@
 
 #include "platform/ado/connection.h"
 #include "platform/desktop/desktop.h"
-#include "shell/services/globals.h"
+#include "services/globals.h"
 
-void showDatabaseErrors(const ADODB::Error &error, const QString &title)
+void showDatabaseErrors(const Error &error, const QString &title)
 {
     errorBox(error.numbered(), title);
     if (!gConnection)
         return;
     const auto entries = gConnection->Errors;
-    for (const ADODB::Error &entry : entries)
+    for (const Error &entry : entries)
         errorBox(entry.numbered());
 }

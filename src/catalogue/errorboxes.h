@@ -1,7 +1,7 @@
 #pragma once
 
-#include "platform/ado/error.h"
+#include "platform/error/error.h"
 
 /// What a handler shows of a failed routine: one box with the error under the given title, then one
 /// for each entry of the connection's Errors.
-void showDatabaseErrors(const ADODB::Error &error, const QString &title = {});
+void showDatabaseErrors(const Error &error, const QString &title = {});

@@ -1,6 +1,6 @@
 #include "catalogue/genres.h"
 
-#include "shell/services/messages.h"
+#include "services/messages.h"
 
 namespace
 {
@@ -19,7 +19,7 @@ constexpr char englishGenres[] =
 
 QStringList parted(const char *words)
 {
-    return QString::fromLatin1(words).split(QLatin1Char('|'));
+    return QString::fromLatin1(words).split(u'|');
 }
 
 } // namespace

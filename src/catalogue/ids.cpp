@@ -1,7 +1,7 @@
 #include "catalogue/ids.h"
 
 #include "platform/ado/recordset.h"
-#include "shell/services/globals.h"
+#include "services/globals.h"
 
 qint64 nextId(const QString &statement, QLatin1String field)
 {

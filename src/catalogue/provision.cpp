@@ -1,16 +1,18 @@
 #include "catalogue/provision.h"
 
-#include "platform/ado/error.h"
 #include "platform/desktop/desktop.h"
 #include "platform/desktop/programfolder.h"
-#include "shell/services/clsRegistry.h"
-#include "shell/services/fileutilities.h"
-#include "shell/services/messages.h"
-#include "shell/services/wholefile.h"
+#include "platform/error/error.h"
+#include "services/clsRegistry.h"
+#include "services/fileutilities.h"
+#include "services/messages.h"
+#include "services/wholefile.h"
 
 #include <QDir>
 #include <QFileInfo>
 #include <QSaveFile>
+
+using namespace Qt::StringLiterals;
 
 namespace
 {
@@ -20,8 +22,7 @@ constexpr auto shipped = ":/catalogue/empty-catalogue";
 bool firstStart(const QString &folder)
 {
     clsRegistry settings;
-    const bool startedBefore =
-        settings.GetValue(settingsReadKey, QStringLiteral("Session")).isValid();
+    const bool startedBefore = settings.GetValue(settingsReadKey, u"Session"_s).isValid();
     return !startedBefore && !QFileInfo::exists(folder);
 }
 
@@ -43,13 +44,12 @@ void provisionCatalogue()
     const QString folder = Desktop::current().programFolder();
     if (folder != programfolder::userFolder() || !firstStart(folder))
         return;
-    const QString beside = folder + QStringLiteral(".new");
+    const QString beside = folder + u".new"_s;
     QDir(beside).removeRecursively(); // an attempt that did not get through
-    const bool made = QDir().mkpath(beside) &&
-                      copyCatalogue(beside + QStringLiteral("/Compact4.orv")) &&
+    const bool made = QDir().mkpath(beside) && copyCatalogue(beside + u"/Compact4.orv"_s) &&
                       QDir().rename(beside, folder);
     if (!made)
-        throw ADODB::Error(ADODB::errCannotUse, QStringLiteral("Songcase"),
-                           GetMessage("xCannotMakeCatalogue") + QDir::toNativeSeparators(folder));
+        throw Error(errCannotUse, u"Songcase"_s,
+                    GetMessage("xCannotMakeCatalogue") + QDir::toNativeSeparators(folder));
     syncFolder(QFileInfo(folder).absolutePath());
 }

@@ -3,7 +3,9 @@
 #include "catalogue/ids.h"
 #include "catalogue/quoting.h"
 #include "platform/ado/recordset.h"
-#include "shell/services/globals.h"
+#include "services/globals.h"
+
+using namespace Qt::StringLiterals;
 
 namespace albumartist
 {
@@ -11,52 +13,52 @@ namespace albumartist
 namespace
 {
 
-const auto nextArtistId = QStringLiteral("SELECT max(id)+1 as id FROM Artiesten");
-const auto nextTrackId = QStringLiteral("SELECT max(id)+1 as id FROM Tracks");
-const auto idField = QLatin1String("id");
+const auto nextArtistId = u"SELECT max(id)+1 as id FROM Artiesten"_s;
+const auto nextTrackId = u"SELECT max(id)+1 as id FROM Tracks"_s;
+const auto idField = "id"_L1;
 
 QString selectArtist(const QString &name)
 {
-    return QStringLiteral("SELECT id FROM Artiesten where Naam = ") + quoted(name);
+    return u"SELECT id FROM Artiesten where Naam = "_s + quoted(name);
 }
 
 QString insertArtist(qint64 id, const QString &name)
 {
-    return QStringLiteral("Insert into artiesten(id,naam) values (") + QString::number(id) +
-           QLatin1Char(',') + quoted(name) + QLatin1Char(')');
+    return u"Insert into artiesten(id,naam) values ("_s + QString::number(id) + u',' +
+           quoted(name) + u')';
 }
 
 QString selectTracksOf(qint64 cd)
 {
-    return QStringLiteral("select trk.id as ID, "
-                          "trk.titel as Titel, "
-                          "trk.genre as Genre, "
-                          "trk.hitjaar as Hitjaar "
-                          "from tracks trk, compactdiscs cds "
-                          "where trk.id = cds.track_id "
-                          "and cds.cdtitels_id= ") +
+    return u"select trk.id as ID, "
+           "trk.titel as Titel, "
+           "trk.genre as Genre, "
+           "trk.hitjaar as Hitjaar "
+           "from tracks trk, compactdiscs cds "
+           "where trk.id = cds.track_id "
+           "and cds.cdtitels_id= "_s +
            QString::number(cd);
 }
 
 QString selectTrack(qint64 artist, const QString &title)
 {
-    return QStringLiteral("SELECT id From Tracks where artiest_id = ") + QString::number(artist) +
-           QStringLiteral(" and Titel = ") + quoted(title);
+    return u"SELECT id From Tracks where artiest_id = "_s + QString::number(artist) +
+           u" and Titel = "_s + quoted(title);
 }
 
 QString insertTrack(qint64 id, qint64 artist, const QString &title, const QString &genre,
                     const QString &year)
 {
-    return QStringLiteral("Insert into Tracks(id,artiest_id,titel,genre,hitjaar) values (") +
-           QString::number(id) + QLatin1Char(',') + QString::number(artist) + QLatin1Char(',') +
-           title + QLatin1Char(',') + genre + QLatin1Char(',') + year + QLatin1Char(')');
+    return u"Insert into Tracks(id,artiest_id,titel,genre,hitjaar) values ("_s +
+           QString::number(id) + u',' + QString::number(artist) + u',' + title + u',' + genre +
+           u',' + year + u')';
 }
 
 QString updateLinks(qint64 cd, qint64 from, qint64 to)
 {
-    return QStringLiteral("update compactdiscs set track_id= ") + QString::number(to) +
-           QStringLiteral(" where cdtitels_id = ") + QString::number(cd) +
-           QStringLiteral(" and track_id = ") + QString::number(from);
+    return u"update compactdiscs set track_id= "_s + QString::number(to) +
+           u" where cdtitels_id = "_s + QString::number(cd) + u" and track_id = "_s +
+           QString::number(from);
 }
 
 // 0 unless there is exactly one.
@@ -70,7 +72,7 @@ qint64 onlyId(const QString &statement)
 // A NULL stays one, and an empty text of another program's stays that.
 QString sameText(const ADODB::Value &value)
 {
-    return value.isNull() ? QStringLiteral("NULL") : quoted(value.toText());
+    return value.isNull() ? u"NULL"_s : quoted(value.toText());
 }
 
 qint64 trackOf(qint64 artist, ADODB::Recordset &old)

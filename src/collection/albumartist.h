@@ -2,7 +2,7 @@
 
 #include <QString>
 
-/// The artist of an album in the catalogue. Both throw ADODB::Error and run in the transaction of
+/// The artist of an album in the catalogue. Both throw Error and run in the transaction of
 /// the save.
 namespace albumartist
 {

@@ -1,6 +1,8 @@
 #include "collection/browserlists.h"
 
-#include "shell/services/globals.h"
+#include "services/globals.h"
+
+using namespace Qt::StringLiterals;
 
 namespace browserlists
 {
@@ -8,41 +10,38 @@ namespace browserlists
 namespace
 {
 
-const auto selectCompilations =
-    QStringLiteral(" select cdt.id as Id, cdt.titel as Titel from cdtitels as cdt"
-                   " where cdt.cd_type='V' order by cdt.titel asc ");
+const auto selectCompilations = u" select cdt.id as Id, cdt.titel as Titel from cdtitels as cdt"
+                                " where cdt.cd_type='V' order by cdt.titel asc "_s;
 
 const auto selectAlbums =
-    QStringLiteral(" select cdt.id as Id, art.naam as Artiest, cdt.titel as Titel from cdtitels as "
-                   "cdt, artiesten as art"
-                   " where cdt.cd_type='E' and cdt.artiest_id=art.id order by cdt.titel asc ");
+    u" select cdt.id as Id, art.naam as Artiest, cdt.titel as Titel from cdtitels as "
+    "cdt, artiesten as art"
+    " where cdt.cd_type='E' and cdt.artiest_id=art.id order by cdt.titel asc "_s;
 
-const auto selectMP3Collections = QStringLiteral(
-    " select mcs.id as Id, mcs.map as Map, mcs.album as Album from mp3collections as mcs"
-    " order by mcs.album asc ");
+const auto selectMP3Collections =
+    u" select mcs.id as Id, mcs.map as Map, mcs.album as Album from mp3collections as mcs"
+    " order by mcs.album asc "_s;
 
-const auto countTracks = QStringLiteral("SELECT COUNT(*) AS AANTAL FROM TRACKS");
+const auto countTracks = u"SELECT COUNT(*) AS AANTAL FROM TRACKS"_s;
 
 QString deleteDiscsOf(qint64 title)
 {
-    return QStringLiteral(" delete from compactdiscs where cdtitels_id = ") +
-           QString::number(title);
+    return u" delete from compactdiscs where cdtitels_id = "_s + QString::number(title);
 }
 
 QString deleteTitleRow(qint64 title)
 {
-    return QStringLiteral(" delete from cdtitels where id = ") + QString::number(title);
+    return u" delete from cdtitels where id = "_s + QString::number(title);
 }
 
 QString deleteFilesOf(qint64 collection)
 {
-    return QStringLiteral(" delete from mp3files where collectionid = ") +
-           QString::number(collection);
+    return u" delete from mp3files where collectionid = "_s + QString::number(collection);
 }
 
 QString deleteCollectionRow(qint64 collection)
 {
-    return QStringLiteral(" delete from mp3collections where id = ") + QString::number(collection);
+    return u" delete from mp3collections where id = "_s + QString::number(collection);
 }
 
 ADODB::RecordsetPtr open(const QString &statement)

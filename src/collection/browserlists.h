@@ -3,7 +3,7 @@
 #include "platform/ado/recordset.h"
 
 /// What the browser of the collection shows, read from the catalogue; no widgets. All throw
-/// ADODB::Error.
+/// Error.
 namespace browserlists
 {
 

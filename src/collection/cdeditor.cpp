@@ -3,14 +3,14 @@
 #include "catalogue/cleanorphans.h"
 #include "catalogue/ids.h"
 #include "collection/disctabs.h"
-#include "controls/trackgrid.h"
+#include "controls/tracks/trackgrid.h"
 #include "platform/ado/recordset.h"
 #include "platform/desktop/desktop.h"
-#include "shell/services/browser.h"
-#include "shell/services/captions.h"
-#include "shell/services/frame.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
+#include "services/browser.h"
+#include "services/captions.h"
+#include "services/frame.h"
+#include "services/globals.h"
+#include "services/messages.h"
 
 #include <QAction>
 #include <QComboBox>
@@ -20,13 +20,15 @@
 #include <QToolBar>
 #include <QToolButton>
 
+using namespace Qt::StringLiterals;
+
 namespace
 {
 
-const auto modeNew = QLatin1String("I"), modeExisting = QLatin1String("U");
+const auto modeNew = "I"_L1, modeExisting = "U"_L1;
 
-const auto nextTitleId = QStringLiteral("Select max(id) + 1 as N from CDTitels");
-const auto idField = QLatin1String("N");
+const auto nextTitleId = u"Select max(id) + 1 as N from CDTitels"_s;
+const auto idField = "N"_L1;
 
 // Buttons of the toolbar, counted from 0, that need the focus in the grid.
 constexpr int insertTrack = 3, deleteTrack = 4, previousTrack = 10;
@@ -128,7 +130,7 @@ void CdEditor::command(Routine routine)
     const QScopedValueRollback<bool> busy(mBusy, true);
     try {
         (this->*routine)();
-    } catch (const ADODB::Error &error) {
+    } catch (const Error &error) {
         if (gConnection)
             gConnection->RollbackTrans();
         releaseFrame();
@@ -146,16 +148,15 @@ void CdEditor::Form_Load()
     mFields->show(mSaved);
     try {
         load();
-    } catch (const ADODB::Error &error) {
-        errorBox(QString::number(error.Number) + QLatin1Char(' ') + error.Description,
-                 GetMessage("MsgSysErr"));
+    } catch (const Error &error) {
+        errorBox(QString::number(error.Number) + u' ' + error.Description, GetMessage("MsgSysErr"));
     }
 }
 
 void CdEditor::load()
 {
     if (!gConnection)
-        throw ADODB::makeError(ADODB::errObjectClosed);
+        throw makeError(errObjectClosed);
     if (Mode == modeNew)
         loadNew();
     else if (Mode != modeExisting)
@@ -240,11 +241,10 @@ void CdEditor::RestoreDiskPosition()
     pump();
 }
 
-QString CdEditor::withPosition(const ADODB::Error &error) const
+QString CdEditor::withPosition(const Error &error) const
 {
-    return QString::number(error.Number) + QLatin1Char('-') + error.Description +
-           QStringLiteral(" ( ") + QString::number(mSavedColumn) + QStringLiteral(" - ") +
-           QString::number(mSavedRow) + QLatin1Char(')');
+    return QString::number(error.Number) + u'-' + error.Description + u" ( "_s +
+           QString::number(mSavedColumn) + u" - "_s + QString::number(mSavedRow) + u')';
 }
 
 void CdEditor::SaveAtUserRequest(bool Reload)
@@ -270,7 +270,7 @@ void CdEditor::save(bool reload)
         if (!mSaveFailed)
             write(header, reload);
         setPointer(vbDefault);
-    } catch (const ADODB::Error &error) {
+    } catch (const Error &error) {
         setPointer(vbDefault);
         releaseFrame();
         errorBox(error.numbered(), GetMessage("MsgSysErr"));
@@ -295,9 +295,9 @@ void CdEditor::write(const Header &header, bool reload)
 {
     const bool isNew = Mode == modeNew;
     if (!isNew && Mode != modeExisting)
-        throw ADODB::Error(0, Name(), QString());
+        throw Error(0, Name(), QString());
     if (!gConnection)
-        throw ADODB::makeError(ADODB::errObjectClosed);
+        throw makeError(errObjectClosed);
     const qint64 earlyId = isNew && mKind.idBeforeTransaction ? nextId(nextTitleId, idField) : 0;
     ADODB::Transaction transaction(*gConnection);
     const TitleRow row = isNew ? TitleRow::New : findTitleRow();
@@ -384,7 +384,7 @@ void CdEditor::saveCommand()
         save(true);
         pump();
         RestoreDiskPosition();
-    } catch (const ADODB::Error &error) {
+    } catch (const Error &error) {
         errorBox(withPosition(error), mKind.positionTitle);
     }
     releaseFrame();
@@ -444,7 +444,7 @@ void CdEditor::changeDisc(int leftBehind)
         }
         releaseFrame();
         Desktop::current().setPointer(this, vbDefault);
-    } catch (const ADODB::Error &error) {
+    } catch (const Error &error) {
         errorBox(withPosition(error), GetMessage("MsgSysErr"));
         releaseFrame();
     }

@@ -6,11 +6,11 @@
 class DiscTabs;
 class QToolBar;
 class TrackGrid;
+class Error;
 namespace ADODB
 {
-class Error;
 class Recordset;
-} // namespace ADODB
+}
 
 /// What the editors of compilations and albums have in common, which is nearly all: a head that the
 /// form reads and writes, a tab for each disc, and a grid with the tracks of the disc that shows.
@@ -97,7 +97,7 @@ private:
     void saveCommand();
 
     void RememberDiskPosition();
-    QString withPosition(const ADODB::Error &error) const;
+    QString withPosition(const Error &error) const;
     void DiscsTab_Click(int leftBehind);
     void goToTab(int tab);
     void changeDisc(int leftBehind);

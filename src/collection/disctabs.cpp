@@ -1,9 +1,11 @@
 #include "collection/disctabs.h"
 
-#include "shell/services/messages.h"
+#include "services/messages.h"
 
 #include <QSignalBlocker>
 #include <QWheelEvent>
+
+using namespace Qt::StringLiterals;
 
 DiscTabs::DiscTabs(QWidget *parent) : QTabBar(parent)
 {
@@ -26,7 +28,7 @@ void DiscTabs::setCount(int count)
 void DiscTabs::add()
 {
     const QSignalBlocker quiet(this);
-    addTab(QStringLiteral("Disc &") + QString::number(count() + 1));
+    addTab(u"Disc &"_s + QString::number(count() + 1));
 }
 
 void DiscTabs::showTab(int tab)

@@ -4,6 +4,8 @@
 #include "collection/frmCDRootE.h"
 #include "platform/desktop/desktop.h"
 
+using namespace Qt::StringLiterals;
+
 namespace editors
 {
 
@@ -24,7 +26,7 @@ template <typename Editor> Editor *find(qint64 id)
 {
     for (Form *form : Form::openForms()) {
         auto *editor = qobject_cast<Editor *>(form);
-        if (editor && editor->CdId == id && editor->Mode != QLatin1String("I"))
+        if (editor && editor->CdId == id && editor->Mode != "I"_L1)
             return editor;
     }
     return nullptr;
@@ -34,7 +36,7 @@ template <typename Editor> CdEditor *edit(qint64 id)
 {
     Editor *editor = find<Editor>(id);
     if (!editor)
-        return open<Editor>(QStringLiteral("U"), id);
+        return open<Editor>(u"U"_s, id);
     editor->Show();
     return editor;
 }
@@ -43,12 +45,12 @@ template <typename Editor> CdEditor *edit(qint64 id)
 
 void newCompilation()
 {
-    open<frmCDRoot>(QStringLiteral("I"), 0);
+    open<frmCDRoot>(u"I"_s, 0);
 }
 
 void newAlbum()
 {
-    open<frmCDRootE>(QStringLiteral("I"), 0);
+    open<frmCDRootE>(u"I"_s, 0);
 }
 
 void editCompilation(qint64 id)

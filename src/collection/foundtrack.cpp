@@ -3,23 +3,23 @@
 #include "catalogue/quoting.h"
 #include "platform/ado/recordset.h"
 #include "platform/text/textrules.h"
-#include "shell/services/globals.h"
+#include "services/globals.h"
+
+using namespace Qt::StringLiterals;
 
 namespace
 {
 
-const auto selectRecords =
-    QStringLiteral("select cdt.id as ID from artiesten as art, tracks as trk,"
-                   " cdtitels as cdt, compactdiscs as vcd where trk.artiest_id = art.id"
-                   " and cdt.id = vcd.cdtitels_id and trk.id = vcd.track_id");
+const auto selectRecords = u"select cdt.id as ID from artiesten as art, tracks as trk,"
+                           " cdtitels as cdt, compactdiscs as vcd where trk.artiest_id = art.id"
+                           " and cdt.id = vcd.cdtitels_id and trk.id = vcd.track_id"_s;
 
 QString isText(const char *column, const QString &text)
 {
     const QLatin1String name(column);
     if (text.isEmpty())
-        return QLatin1String(" and (") + name + QLatin1String(" is null or ") + name +
-               QLatin1String(" = '')");
-    return QLatin1String(" and ") + name + QLatin1String(" = ") + quoted(text);
+        return " and ("_L1 + name + " is null or "_L1 + name + " = '')"_L1;
+    return " and "_L1 + name + " = "_L1 + quoted(text);
 }
 
 // A number, or what an older catalogue may have in its place.
@@ -32,18 +32,16 @@ QString isNumber(const char *column, const QString &text)
 {
     if (text.isEmpty())
         return isText(column, text);
-    return QLatin1String(" and ") + QLatin1String(column) + QLatin1String(" = ") + number(text);
+    return " and "_L1 + QLatin1String(column) + " = "_L1 + number(text);
 }
 
 // The tracks of the disc before this one; their numbers may have gaps, and those without one come
 // first.
 QString countTracksBefore(qint64 id, const FoundTrack &track)
 {
-    return QStringLiteral(
-               "select count(*) as N from compactdiscs as vcd where vcd.cdtitels_id = ") +
+    return u"select count(*) as N from compactdiscs as vcd where vcd.cdtitels_id = "_s +
            QString::number(id) + isNumber("vcd.diskno", track.disc) +
-           QLatin1String(" and (vcd.trackno is null or vcd.trackno < ") + number(track.track) +
-           QLatin1Char(')');
+           " and (vcd.trackno is null or vcd.trackno < "_L1 + number(track.track) + u')';
 }
 
 QString selectRecord(const FoundTrack &track)
@@ -51,8 +49,7 @@ QString selectRecord(const FoundTrack &track)
     return selectRecords + isText("art.naam", track.artist) + isText("trk.titel", track.title) +
            isText("cdt.titel", track.cdTitle) + isNumber("vcd.diskno", track.disc) +
            isNumber("vcd.trackno", track.track) +
-           isText("iif(cdt.cd_type='V','Compilation','Album')", track.type) +
-           QLatin1String(" order by cdt.id");
+           isText("iif(cdt.cd_type='V','Compilation','Album')", track.type) + " order by cdt.id"_L1;
 }
 
 } // namespace
@@ -63,7 +60,7 @@ FoundRecord findRecord(const FoundTrack &track)
     if (records.isEOF())
         return {};
     const qint64 id = records.Fields(u"ID").Value().toLong();
-    const bool isCompilation = track.type == QLatin1String("Compilation");
+    const bool isCompilation = track.type == "Compilation"_L1;
     if (track.track.isEmpty())
         return {id, isCompilation, 1};
     auto before = gConnection->Execute(countTracksBefore(id, track));

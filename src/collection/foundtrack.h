@@ -14,5 +14,5 @@ struct FoundRecord {
     int row = 0; // of the track on its disc, from 1
 };
 
-/// Looks the record up by what the row shows; of several equal ones the first. Throws ADODB::Error.
+/// Looks the record up by what the row shows; of several equal ones the first. Throws Error.
 FoundRecord findRecord(const FoundTrack &track);

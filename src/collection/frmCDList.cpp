@@ -5,17 +5,19 @@
 #include "collection/browserlists.h"
 #include "collection/editors.h"
 #include "collection/recordnodes.h"
-#include "collection/reports.h"
 #include "collection/ui_frmCDList.h"
-#include "controls/DBListViewCTL.h"
+#include "controls/list/DBListViewCTL.h"
 #include "platform/desktop/desktop.h"
 #include "platform/text/textrules.h"
-#include "shell/services/captions.h"
-#include "shell/services/frame.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
+#include "reports/reports.h"
+#include "services/captions.h"
+#include "services/frame.h"
+#include "services/globals.h"
+#include "services/messages.h"
 
 #include <QHeaderView>
+
+using namespace Qt::StringLiterals;
 
 namespace
 {
@@ -38,7 +40,7 @@ std::vector<RecordTree::Node> nodesOf(const ADODB::Recordset &recordset, QChar k
 template <typename PrintedReport> void startReport()
 {
     if (!gConnection)
-        throw ADODB::makeError(ADODB::errObjectClosed);
+        throw makeError(errObjectClosed);
     const auto rows = gConnection->Execute(PrintedReport::command(), ADODB::adOptionUnspecified);
     auto &report = defaultInstance<PrintedReport>();
     report.setDataSource(rows);
@@ -48,7 +50,7 @@ template <typename PrintedReport> void startReport()
 
 } // namespace
 
-frmCDList::frmCDList() : Form(QStringLiteral("frmCDList")), mUi(std::make_unique<Ui::frmCDList>())
+frmCDList::frmCDList() : Form(u"frmCDList"_s), mUi(std::make_unique<Ui::frmCDList>())
 {
     mUi->setupUi(this);
     mPages = {
@@ -81,7 +83,7 @@ void frmCDList::setCaptions()
     for (int i = 0; i < 4; ++i) {
         const QString caption = GetMessage(tabs[i]);
         mUi->CDTab->setTabText(i, caption);
-        pages[i]->setAccessibleName(QString(caption).remove(QLatin1Char('&')));
+        pages[i]->setAccessibleName(QString(caption).remove(u'&'));
     }
 }
 
@@ -150,7 +152,7 @@ void frmCDList::LoadLists()
     setFramePointer(vbHourglass);
     try {
         if (!gConnection)
-            throw ADODB::makeError(ADODB::errObjectClosed);
+            throw makeError(errObjectClosed);
         SaveColumnWidths();
         loadPage(mPages[0]);
         loadPage(mPages[1]);
@@ -158,7 +160,7 @@ void frmCDList::LoadLists()
         mUi->Platenbak->resetRoots();
         loadPage(mPages[2]);
         showPage();
-    } catch (const ADODB::Error &error) {
+    } catch (const Error &error) {
         showDatabaseErrors(error, GetMessage("UFL"));
         releaseFrame();
     }
@@ -314,8 +316,8 @@ void frmCDList::FillCDNode(RecordTree &TheTree, const QString &TheKey)
     const auto rows = discs->rows();
     auto nodes = nodesOf(*discs, u'C');
     for (std::size_t i = 0; i < nodes.size(); ++i) {
-        nodes[i].text += QStringLiteral(" (Track ") + rows->text(qsizetype(i), 3) +
-                         GetMessage("VanDisc") + rows->text(qsizetype(i), 2) + QLatin1Char(')');
+        nodes[i].text += u" (Track "_s + rows->text(qsizetype(i), 3) + GetMessage("VanDisc") +
+                         rows->text(qsizetype(i), 2) + u')';
     }
     TheTree.addNodes(TheKey, RecordTree::Disc, nodes);
 }
@@ -326,8 +328,7 @@ void frmCDList::Platenbak_Expand(const QString &key)
 {
     RecordTree &tree = *mUi->Platenbak;
     const QTreeWidgetItem *node = tree.node(key);
-    if (node->childCount() == 0 ||
-        !RecordTree::keyOf(node->child(0)).startsWith(QLatin1String("dummy")))
+    if (node->childCount() == 0 || !RecordTree::keyOf(node->child(0)).startsWith("dummy"_L1))
         return;
     tree.removeNode(RecordTree::keyOf(node->child(0)));
     if (key.size() == 1 || key == GetMessage("Overige"))
@@ -428,7 +429,7 @@ void frmCDList::deleteSelected(ListPage &page, void (*remove)(qint64))
         LoadLists();
         Desktop::current().pump();
         focusList();
-    } catch (const ADODB::Error &error) {
+    } catch (const Error &error) {
         gConnection->RollbackTrans();
         showDatabaseErrors(error);
         releaseFrame();

@@ -2,7 +2,7 @@
 
 #include "platform/ado/recordset.h"
 #include "platform/desktop/form.h"
-#include "shell/services/browser.h"
+#include "services/browser.h"
 
 #include <array>
 #include <memory>
@@ -30,7 +30,7 @@ public:
     void RefreshLists() override;
 
     // Fill the node of this key with the artists, tracks or discs below it, by one statement. Throw
-    // ADODB::Error.
+    // Error.
     void FillArtistNode(RecordTree &TheTree, const QString &TheKey);
     void FillTrackNode(RecordTree &TheTree, const QString &TheKey);
     void FillCDNode(RecordTree &TheTree, const QString &TheKey);

@@ -2,13 +2,14 @@
 
 #include "catalogue/quoting.h"
 #include "collection/ui_frmCDRoot.h"
-#include "platform/ado/error.h"
 #include "platform/desktop/desktop.h"
-#include "shell/services/captions.h"
-#include "shell/services/messages.h"
+#include "platform/error/error.h"
+#include "services/captions.h"
+#include "services/messages.h"
 
-frmCDRoot::frmCDRoot()
-    : CdEditor(QStringLiteral("frmCDRoot")), mUi(std::make_unique<Ui::frmCDRoot>())
+using namespace Qt::StringLiterals;
+
+frmCDRoot::frmCDRoot() : CdEditor(u"frmCDRoot"_s), mUi(std::make_unique<Ui::frmCDRoot>())
 {
     mUi->setupUi(this);
     setTexts();
@@ -20,7 +21,7 @@ frmCDRoot::frmCDRoot()
            mUi->cmdCancel},
           {.left = 0.2,
            .unknownMode = GetMessage("MsgModeFalse"),
-           .positionTitle = QStringLiteral("Systeemfout"),
+           .positionTitle = u"Systeemfout"_s,
            .idBeforeTransaction = true});
 }
 
@@ -29,9 +30,9 @@ frmCDRoot::~frmCDRoot() = default;
 void frmCDRoot::setTexts()
 {
     applyCaptions(this, {{"frmCDRoot", "frmCDRootCaption"}, {"cmdCancel", "cmdCancelCaption"}});
-    mUi->lblTitle->setText(GetMessage("Titel") + QLatin1Char(':'));
-    mUi->lblGenre->setText(GetMessage("Genre") + QLatin1Char(':'));
-    mUi->lblYear->setText(GetMessage("HitYear") + QLatin1Char(':'));
+    mUi->lblTitle->setText(GetMessage("Titel") + u':');
+    mUi->lblGenre->setText(GetMessage("Genre") + u':');
+    mUi->lblYear->setText(GetMessage("HitYear") + u':');
 }
 
 const char *frmCDRoot::gapIn(const Header &header) const
@@ -41,39 +42,37 @@ const char *frmCDRoot::gapIn(const Header &header) const
 
 QString frmCDRoot::selectRecord(qint64 id) const
 {
-    return QStringLiteral("select cdt.id as CdId,"
-                          "       cdt.titel as CDTitle, "
-                          "       cdt.genre as Genre, "
-                          "       cdt.hitjaar as hitjaar, "
-                          "       max(cds.diskno) as DiscNum "
-                          "from  CDTitels cdt, "
-                          "      Compactdiscs cds "
-                          "where cdt.id = cds.CDtitels_Id "
-                          "and   cdt.id = ") +
-           QString::number(id) + QStringLiteral(" group by cdt.id,cdt.titel,cdt.genre,cdt.hitjaar");
+    return u"select cdt.id as CdId,"
+           "       cdt.titel as CDTitle, "
+           "       cdt.genre as Genre, "
+           "       cdt.hitjaar as hitjaar, "
+           "       max(cds.diskno) as DiscNum "
+           "from  CDTitels cdt, "
+           "      Compactdiscs cds "
+           "where cdt.id = cds.CDtitels_Id "
+           "and   cdt.id = "_s +
+           QString::number(id) + u" group by cdt.id,cdt.titel,cdt.genre,cdt.hitjaar"_s;
 }
 
 QString frmCDRoot::selectIsOwn(qint64 id, const Header &saved) const
 {
-    return QStringLiteral("select iif(cd_type = 'V' and titel = ") + quoted(saved.title) +
-           QStringLiteral(", 1, 0) as Own from CDTitels where id = ") + QString::number(id);
+    return u"select iif(cd_type = 'V' and titel = "_s + quoted(saved.title) +
+           u", 1, 0) as Own from CDTitels where id = "_s + QString::number(id);
 }
 
 QString frmCDRoot::insertTitle(qint64 id, const Header &header) const
 {
-    return QStringLiteral("Insert into CDTitels(id,titel,cd_type,genre,hitjaar) "
-                          " values (") +
-           QString::number(id) + QLatin1Char(',') + quoted(header.title) +
-           QStringLiteral(", 'V',") + quotedOrNull(header.genre) + QLatin1Char(',') +
-           numberOrNull(header.year) + QLatin1Char(')');
+    return u"Insert into CDTitels(id,titel,cd_type,genre,hitjaar) "
+           " values ("_s +
+           QString::number(id) + u',' + quoted(header.title) + u", 'V',"_s +
+           quotedOrNull(header.genre) + u',' + numberOrNull(header.year) + u')';
 }
 
 QString frmCDRoot::updateTitle(qint64 id, const Header &header) const
 {
-    return QStringLiteral("Update CDTitels set titel = ") + quoted(header.title) +
-           QStringLiteral(", genre = ") + quotedOrNull(header.genre) +
-           QStringLiteral(", hitjaar = ") + numberOrNull(header.year) +
-           QStringLiteral(" where ID = ") + QString::number(id);
+    return u"Update CDTitels set titel = "_s + quoted(header.title) + u", genre = "_s +
+           quotedOrNull(header.genre) + u", hitjaar = "_s + numberOrNull(header.year) +
+           u" where ID = "_s + QString::number(id);
 }
 
 QWidget *frmCDRoot::behindLastTrack() const
@@ -85,7 +84,7 @@ void frmCDRoot::RestoreDiskPosition()
 {
     try {
         CdEditor::RestoreDiskPosition();
-    } catch (const ADODB::Error &error) {
+    } catch (const Error &error) {
         errorBox(error.numbered(), GetMessage("MsgSysErr"));
     }
 }

@@ -3,11 +3,12 @@
 #include "catalogue/quoting.h"
 #include "collection/albumartist.h"
 #include "collection/ui_frmCDRootE.h"
-#include "shell/services/captions.h"
-#include "shell/services/messages.h"
+#include "services/captions.h"
+#include "services/messages.h"
 
-frmCDRootE::frmCDRootE()
-    : CdEditor(QStringLiteral("frmCDRootE")), mUi(std::make_unique<Ui::frmCDRootE>())
+using namespace Qt::StringLiterals;
+
+frmCDRootE::frmCDRootE() : CdEditor(u"frmCDRootE"_s), mUi(std::make_unique<Ui::frmCDRootE>())
 {
     mUi->setupUi(this);
     setTexts();
@@ -18,7 +19,7 @@ frmCDRootE::frmCDRootE()
            mUi->TheDiskE,
            mUi->cmdCancel},
           {.left = 0.42,
-           .unknownMode = QStringLiteral("MsgModeFalse"),
+           .unknownMode = u"MsgModeFalse"_s,
            .positionTitle = GetMessage("MsgSysErr"),
            .idBeforeTransaction = false});
 }
@@ -28,10 +29,10 @@ frmCDRootE::~frmCDRootE() = default;
 void frmCDRootE::setTexts()
 {
     applyCaptions(this, {{"frmCDRootE", "frmCDRootECaption"}, {"cmdCancel", "cmdCancelCaption"}});
-    mUi->lblArtist->setText(GetMessage("Artiest") + QLatin1Char(':'));
-    mUi->lblTitle->setText(GetMessage("Titel") + QLatin1Char(':'));
-    mUi->lblGenre->setText(GetMessage("Genre") + QLatin1Char(':'));
-    mUi->lblHitYear->setText(GetMessage("HitYear") + QLatin1Char(':'));
+    mUi->lblArtist->setText(GetMessage("Artiest") + u':');
+    mUi->lblTitle->setText(GetMessage("Titel") + u':');
+    mUi->lblGenre->setText(GetMessage("Genre") + u':');
+    mUi->lblHitYear->setText(GetMessage("HitYear") + u':');
 }
 
 const char *frmCDRootE::gapIn(const Header &header) const
@@ -43,47 +44,44 @@ const char *frmCDRootE::gapIn(const Header &header) const
 
 QString frmCDRootE::selectRecord(qint64 id) const
 {
-    return QStringLiteral("select cdt.id as CdId,"
-                          "       art.naam as Artiest, "
-                          "       cdt.titel as CDTitle, "
-                          "       cdt.genre as Genre, "
-                          "       cdt.hitjaar as hitjaar, "
-                          "       max(cds.diskno) as DiscNum "
-                          "from  CDTitels cdt, "
-                          "      Compactdiscs cds, "
-                          "      Artiesten art "
-                          "where cdt.id = cds.CDtitels_Id "
-                          "and   art.id = cdt.artiest_id "
-                          "and   cdt.id = ") +
-           QString::number(id) +
-           QStringLiteral(" group by cdt.id,art.naam, cdt.titel,cdt.genre,cdt.hitjaar");
+    return u"select cdt.id as CdId,"
+           "       art.naam as Artiest, "
+           "       cdt.titel as CDTitle, "
+           "       cdt.genre as Genre, "
+           "       cdt.hitjaar as hitjaar, "
+           "       max(cds.diskno) as DiscNum "
+           "from  CDTitels cdt, "
+           "      Compactdiscs cds, "
+           "      Artiesten art "
+           "where cdt.id = cds.CDtitels_Id "
+           "and   art.id = cdt.artiest_id "
+           "and   cdt.id = "_s +
+           QString::number(id) + u" group by cdt.id,art.naam, cdt.titel,cdt.genre,cdt.hitjaar"_s;
 }
 
 QString frmCDRootE::selectIsOwn(qint64 id, const Header &saved) const
 {
-    return QStringLiteral("select iif(cdt.cd_type = 'E' and cdt.titel = ") + quoted(saved.title) +
-           QStringLiteral(" and exists (select '1' from Artiesten art where art.id = "
-                          "cdt.artiest_id and art.naam = ") +
-           quoted(saved.artist) +
-           QStringLiteral("), 1, 0) as Own from CDTitels cdt where cdt.id = ") +
+    return u"select iif(cdt.cd_type = 'E' and cdt.titel = "_s + quoted(saved.title) +
+           u" and exists (select '1' from Artiesten art where art.id = "
+           "cdt.artiest_id and art.naam = "_s +
+           quoted(saved.artist) + u"), 1, 0) as Own from CDTitels cdt where cdt.id = "_s +
            QString::number(id);
 }
 
 QString frmCDRootE::insertTitle(qint64 id, const Header &header) const
 {
-    return QStringLiteral("Insert into CDTitels(id,titel,artiest_id,cd_type,genre,hitjaar) "
-                          " values (") +
-           QString::number(id) + QLatin1Char(',') + quoted(header.title) + QStringLiteral(", ") +
-           QString::number(mArtistId) + QStringLiteral(",'E',") + quotedOrNull(header.genre) +
-           QLatin1Char(',') + numberOrNull(header.year) + QLatin1Char(')');
+    return u"Insert into CDTitels(id,titel,artiest_id,cd_type,genre,hitjaar) "
+           " values ("_s +
+           QString::number(id) + u',' + quoted(header.title) + u", "_s +
+           QString::number(mArtistId) + u",'E',"_s + quotedOrNull(header.genre) + u',' +
+           numberOrNull(header.year) + u')';
 }
 
 QString frmCDRootE::updateTitle(qint64 id, const Header &header) const
 {
-    return QStringLiteral(" Update CDTitels set artiest_id = ") + QString::number(mArtistId) +
-           QStringLiteral(", titel = ") + quoted(header.title) + QStringLiteral(", genre = ") +
-           quotedOrNull(header.genre) + QStringLiteral(", hitjaar = ") + numberOrNull(header.year) +
-           QStringLiteral(" where ID = ") + QString::number(id);
+    return u" Update CDTitels set artiest_id = "_s + QString::number(mArtistId) + u", titel = "_s +
+           quoted(header.title) + u", genre = "_s + quotedOrNull(header.genre) + u", hitjaar = "_s +
+           numberOrNull(header.year) + u" where ID = "_s + QString::number(id);
 }
 
 void frmCDRootE::beforeTitle(const Header &header)

@@ -4,17 +4,19 @@
 #include "collection/foundtrack.h"
 #include "collection/resultlines.h"
 #include "collection/ui_frmSearchArtistsTitles.h"
-#include "controls/DBListViewCTL.h"
+#include "controls/list/DBListViewCTL.h"
 #include "platform/desktop/desktop.h"
 #include "platform/desktop/throttledpump.h"
-#include "shell/services/captions.h"
-#include "shell/services/fileutilities.h"
-#include "shell/services/frame.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
-#include "shell/services/textfiles.h"
+#include "services/captions.h"
+#include "services/fileutilities.h"
+#include "services/frame.h"
+#include "services/globals.h"
+#include "services/messages.h"
+#include "services/textfiles.h"
 
 #include <QKeyEvent>
+
+using namespace Qt::StringLiterals;
 
 namespace
 {
@@ -41,8 +43,7 @@ QStringList textsOf(const ListItem &item)
 } // namespace
 
 frmSearchArtistsTitles::frmSearchArtistsTitles()
-    : Form(QStringLiteral("frmSearchArtistsTitles")),
-      mUi(std::make_unique<Ui::frmSearchArtistsTitles>())
+    : Form(u"frmSearchArtistsTitles"_s), mUi(std::make_unique<Ui::frmSearchArtistsTitles>())
 {
     mUi->setupUi(this);
     setCaptions();
@@ -121,7 +122,7 @@ void frmSearchArtistsTitles::cmdSearch_Click()
     try {
         freezeFrame();
         show(wanted);
-    } catch (const ADODB::Error &error) {
+    } catch (const Error &error) {
         // By design: the wait cursor stays.
         plainBox(error.numbered());
     }
@@ -170,7 +171,7 @@ void frmSearchArtistsTitles::refuse(const char *message, QLineEdit *field)
 void frmSearchArtistsTitles::show(const SearchKey &key)
 {
     if (!gConnection)
-        throw ADODB::makeError(ADODB::errObjectClosed);
+        throw makeError(errObjectClosed);
     if (mUi->ResultList->ListItems().Count() > largeResult)
         showNothing(); // makes room for as many
     const auto found = std::make_shared<ADODB::Recordset>();
@@ -256,7 +257,7 @@ void frmSearchArtistsTitles::openDisc(const ListItem &item)
         else
             editors::editTrack(record.isCompilation, record.id, texts[DiscNumber].toInt(),
                                record.row);
-    } catch (const ADODB::Error &error) {
+    } catch (const Error &error) {
         plainBox(error.numbered());
     }
 }

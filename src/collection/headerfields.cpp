@@ -2,10 +2,10 @@
 
 #include "catalogue/genres.h"
 #include "catalogue/hityear.h"
-#include "controls/keycodes.h"
+#include "controls/list/keycodes.h"
 #include "platform/desktop/desktop.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
+#include "services/globals.h"
+#include "services/messages.h"
 
 #include <QApplication>
 #include <QComboBox>
@@ -14,6 +14,8 @@
 #include <QLineEdit>
 #include <QRegularExpression>
 #include <QTimer>
+
+using namespace Qt::StringLiterals;
 
 namespace
 {
@@ -25,9 +27,9 @@ constexpr int shiftAlone = 1;
 // A pasted text may have line ends, and the limit may have parted a pair of surrogates.
 void keepOneLine(QLineEdit *field)
 {
-    static const QRegularExpression lineEnds(QStringLiteral("\\s*[\\r\\n\\x{2028}\\x{2029}]+\\s*"));
+    static const QRegularExpression lineEnds(u"\\s*[\\r\\n\\x{2028}\\x{2029}]+\\s*"_s);
     QString clean = field->text();
-    clean.replace(lineEnds, QStringLiteral(" "));
+    clean.replace(lineEnds, u" "_s);
     if (clean.size() == field->maxLength() && clean.back().isHighSurrogate())
         clean.chop(1);
     if (clean == field->text())

@@ -1,6 +1,8 @@
 #include "collection/recordnodes.h"
 
-#include "shell/services/globals.h"
+#include "services/globals.h"
+
+using namespace Qt::StringLiterals;
 
 namespace recordnodes
 {
@@ -10,33 +12,33 @@ namespace
 
 QString selectArtists(const QString &letter)
 {
-    return QStringLiteral(" select art.id as ID, art.naam as Artiest from artiesten as art"
-                          " where art.naam like '") +
-           letter + QStringLiteral("%' order by art.naam ");
+    return u" select art.id as ID, art.naam as Artiest from artiesten as art"
+           " where art.naam like '"_s +
+           letter + u"%' order by art.naam "_s;
 }
 
 const auto selectArtistsWithDigit =
-    QStringLiteral(" select art.id as ID, art.naam as Artiest from artiesten as art"
-                   " where iif(isnumeric(left(art.naam,1)),1,0)=1 order by art.naam ");
+    u" select art.id as ID, art.naam as Artiest from artiesten as art"
+    " where iif(isnumeric(left(art.naam,1)),1,0)=1 order by art.naam "_s;
 
 QString selectTracks(const QString &artistId)
 {
-    return QStringLiteral("select id as ID, Titel as Titel from Tracks where Artiest_ID = ") +
-           artistId + QStringLiteral(" order by Titel");
+    return u"select id as ID, Titel as Titel from Tracks where Artiest_ID = "_s + artistId +
+           u" order by Titel"_s;
 }
 
 QString selectDiscs(const QString &trackId)
 {
-    return QStringLiteral("select cds.id as ID, cdt.Titel as Titel, cds.diskno as Diskno, "
-                          "cds.trackno as Trackno from CDtitels cdt, CompactDiscs cds "
-                          "where cdt.id = cds.cdtitels_id and cds.Track_ID = ") +
-           trackId + QStringLiteral(" order by Titel");
+    return u"select cds.id as ID, cdt.Titel as Titel, cds.diskno as Diskno, "
+           "cds.trackno as Trackno from CDtitels cdt, CompactDiscs cds "
+           "where cdt.id = cds.cdtitels_id and cds.Track_ID = "_s +
+           trackId + u" order by Titel"_s;
 }
 
 QString selectTitle(const QString &linkId)
 {
-    return QStringLiteral("SELECT cdt.cd_type as type, cdt.id as ID FROM CDtitels cdt, "
-                          "CompactDiscs cds WHERE cds.CDTitels_id = cdt.id AND cds.id = ") +
+    return u"SELECT cdt.cd_type as type, cdt.id as ID FROM CDtitels cdt, "
+           "CompactDiscs cds WHERE cds.CDTitels_id = cdt.id AND cds.id = "_s +
            linkId;
 }
 

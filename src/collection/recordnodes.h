@@ -3,7 +3,7 @@
 #include "platform/ado/recordset.h"
 
 /// What the record tree shows, read from the catalogue one opened node at a time; no widgets. All
-/// throw ADODB::Error.
+/// throw Error.
 namespace recordnodes
 {
 

@@ -1,12 +1,14 @@
 #include "collection/recordtree.h"
 
-#include "shell/services/messages.h"
+#include "services/messages.h"
 
 #include <QGuiApplication>
 #include <QIcon>
 #include <QKeyEvent>
 #include <QPainter>
 #include <QPalette>
+
+using namespace Qt::StringLiterals;
 
 namespace
 {
@@ -25,7 +27,7 @@ enum class OnSelection { Same, Silhouette };
 // on a selected node, and a blue note on blue is none.
 QIcon icon(const char *name, OnSelection onSelection)
 {
-    const QIcon drawn(QStringLiteral(":/icons/") + QLatin1String(name) + QStringLiteral(".svg"));
+    const QIcon drawn(u":/icons/"_s + QLatin1String(name) + u".svg"_s);
     QIcon icon;
     for (const int size : {16, 24, 32, 48, 64}) {
         QPixmap picture = drawn.pixmap(QSize(size, size), 1.0);
@@ -109,10 +111,9 @@ QTreeWidgetItem *RecordTree::make(Level level, const Node &node)
 
 void RecordTree::putPlaceholder(QTreeWidgetItem *item, Level level, const Node &node)
 {
-    const Node below[] = {
-        {QStringLiteral("dummyArtist") + node.key, QStringLiteral("dummy") + node.text},
-        {QStringLiteral("dummyT") + node.key, QStringLiteral("dummyTrack")},
-        {QStringLiteral("dummyC") + node.key, QStringLiteral("dummyCD")}};
+    const Node below[] = {{u"dummyArtist"_s + node.key, u"dummy"_s + node.text},
+                          {u"dummyT"_s + node.key, u"dummyTrack"_s},
+                          {u"dummyC"_s + node.key, u"dummyCD"_s}};
     auto *placeholder = new Item(below[level].key, below[level].text);
     mNodes.insert(below[level].key, placeholder);
     item->addChild(placeholder);

@@ -6,14 +6,14 @@
 #include "collection/frmCDList.h"
 #include "collection/frmSearchArtistsTitles.h"
 #include "platform/ado/connection.h"
+#include "services/captions.h"
+#include "services/clsRegistry.h"
+#include "services/fileutilities.h"
+#include "services/globals.h"
+#include "services/messages.h"
 #include "shell/accesskeys.h"
 #include "shell/frmHelp.h"
 #include "shell/frmSplash.h"
-#include "shell/services/captions.h"
-#include "shell/services/clsRegistry.h"
-#include "shell/services/fileutilities.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
 #include "shell/ui_MainScreen.h"
 #include "textimport/frmImportWizard.h"
 
@@ -23,6 +23,8 @@
 #include <QTimer>
 #include <QToolButton>
 #include <algorithm>
+
+using namespace Qt::StringLiterals;
 
 namespace
 {
@@ -37,7 +39,7 @@ MainScreen::MainScreen(bool lastRunBroken)
       mTimer1(new QTimer(this)),
       mLastRunBroken(lastRunBroken)
 {
-    mTimer1->setObjectName(QStringLiteral("Timer1"));
+    mTimer1->setObjectName(u"Timer1"_s);
     mTimer1->setInterval(splashTime);
     connect(mTimer1, &QTimer::timeout, this, &MainScreen::Timer1_Timer);
 }
@@ -66,7 +68,7 @@ bool MainScreen::Load()
             Unload();
             return false;
         }
-    } catch (const ADODB::Error &error) {
+    } catch (const Error &error) {
         showConnectErrors(error);
     }
     mTimer1->start();
@@ -89,7 +91,7 @@ void MainScreen::InitMainScreen()
     mStart = startup::readSettings(folder);
     emit languageKnown();
     markLanguage();
-    gDatabasePath = folder + QDir::separator() + QStringLiteral("Compact4.orv");
+    gDatabasePath = folder + QDir::separator() + u"Compact4.orv"_s;
     setCaptions();
     setBoxTitle(windowTitle());
 }
@@ -159,18 +161,17 @@ void MainScreen::connectActions()
     on(mUi->mnuNederlands, [this] { ChangeLanguage(languageDutch); });
 }
 
-void MainScreen::showConnectErrors(const ADODB::Error &error)
+void MainScreen::showConnectErrors(const Error &error)
 {
-    const auto show = [](const ADODB::Error &e) {
-        errorBox(QStringLiteral("ADO Connect Error: ") + QString::number(e.Number) +
-                     QLatin1Char(' ') + e.Description,
+    const auto show = [](const Error &e) {
+        errorBox(u"ADO Connect Error: "_s + QString::number(e.Number) + u' ' + e.Description,
                  GetMessage("MsgSysErr"));
     };
     show(error);
     if (!gConnection)
         return;
     const auto entries = gConnection->Errors;
-    for (const ADODB::Error &entry : entries)
+    for (const Error &entry : entries)
         show(entry);
 }
 
@@ -205,18 +206,16 @@ void MainScreen::ChangeLanguage(int language)
     if (!isMarked)
         return; // the entry of the marked language was pressed again
     clsRegistry settings;
-    settings.SetValue(settingsKey, QStringLiteral("Language"), language);
+    settings.SetValue(settingsKey, u"Language"_s, language);
     // The running program keeps its language, so these words are in no table.
     if (dutch)
-        informationBox(
-            QStringLiteral("De taalinstellingen worden van toepassing indien u dit programma "
-                           "afsluit en daarna opnieuw start."),
-            QStringLiteral("Instellingen"));
+        informationBox(u"De taalinstellingen worden van toepassing indien u dit programma "
+                       "afsluit en daarna opnieuw start."_s,
+                       u"Instellingen"_s);
     else
-        informationBox(
-            QStringLiteral("If you close and restart this program, the preferred language "
-                           "will be English."),
-            QStringLiteral("Preferences"));
+        informationBox(u"If you close and restart this program, the preferred language "
+                       "will be English."_s,
+                       u"Preferences"_s);
 }
 
 void MainScreen::Over_Click()
@@ -299,7 +298,7 @@ bool MainScreen::unloadChildren()
     }
     const auto forms = Form::openForms();
     for (Form *form : forms) {
-        if (form->Name() != QLatin1String("frmSplash") && !form->Unload())
+        if (form->Name() != "frmSplash"_L1 && !form->Unload())
             return false;
     }
     return true;
@@ -328,10 +327,10 @@ void MainScreen::closeCatalogue()
     try {
         CleanOrphans();
         if (!gConnection)
-            throw ADODB::makeError(ADODB::errObjectClosed);
+            throw makeError(errObjectClosed);
         gConnection->Close();
         gConnection.reset();
-    } catch (const ADODB::Error &error) {
+    } catch (const Error &error) {
         errorBox(error.numbered(), GetMessage("MsgSysErr"));
         if (gConnection)
             gConnection->RollbackTrans();

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "platform/desktop/form.h"
-#include "shell/services/frame.h"
+#include "services/frame.h"
 #include "shell/startup.h"
 
 #include <QMainWindow>
@@ -9,11 +9,8 @@
 
 class QMdiSubWindow;
 class QTimer;
-
-namespace ADODB
-{
 class Error;
-}
+
 namespace Ui
 {
 class MainScreen;
@@ -57,7 +54,7 @@ private:
     void InitMainScreen();
     void setCaptions();
     void markLanguage();
-    void showConnectErrors(const ADODB::Error &error);
+    void showConnectErrors(const Error &error);
     void Timer1_Timer();
     void openBrowser();
     void ChangeLanguage(int language);

@@ -2,11 +2,13 @@
 
 #include "platform/ado/connection.h"
 #include "platform/desktop/desktop.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
+#include "services/globals.h"
+#include "services/messages.h"
 
 #include <QLibraryInfo>
 #include <QTranslator>
+
+using namespace Qt::StringLiterals;
 
 namespace
 {
@@ -26,7 +28,7 @@ bool Application::notify(QObject *receiver, QEvent *event)
 {
     try {
         return QApplication::notify(receiver, event);
-    } catch (const ADODB::Error &error) {
+    } catch (const Error &error) {
         endWithReport(error.numbered());
     } catch (const std::exception &error) {
         endWithReport(QString::fromUtf8(error.what()));
@@ -38,14 +40,13 @@ void Application::translateQt()
     if (gLanguage != languageDutch)
         return;
     auto *translator = new QTranslator(this);
-    if (translator->load(QStringLiteral("qtbase_nl"),
-                         QLibraryInfo::path(QLibraryInfo::TranslationsPath)))
+    if (translator->load(u"qtbase_nl"_s, QLibraryInfo::path(QLibraryInfo::TranslationsPath)))
         installTranslator(translator);
 }
 
 void nameApplication()
 {
-    QCoreApplication::setApplicationName(QStringLiteral("songcase"));
-    QCoreApplication::setApplicationVersion(QStringLiteral(SONGCASE_VERSION));
-    QGuiApplication::setDesktopFileName(QStringLiteral("songcase"));
+    QCoreApplication::setApplicationName(u"songcase"_s);
+    QCoreApplication::setApplicationVersion(u"" SONGCASE_VERSION ""_s);
+    QGuiApplication::setDesktopFileName(u"songcase"_s);
 }

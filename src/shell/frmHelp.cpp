@@ -1,9 +1,9 @@
 #include "shell/frmHelp.h"
 
 #include "platform/desktop/desktop.h"
-#include "shell/services/captions.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
+#include "services/captions.h"
+#include "services/globals.h"
+#include "services/messages.h"
 #include "shell/ui_frmHelp.h"
 
 #include <QCoreApplication>
@@ -12,10 +12,12 @@
 #include <QStandardPaths>
 #include <QUrl>
 
-frmHelp::frmHelp() : Form(QStringLiteral("frmHelp")), mUi(std::make_unique<Ui::frmHelp>())
+using namespace Qt::StringLiterals;
+
+frmHelp::frmHelp() : Form(u"frmHelp"_s), mUi(std::make_unique<Ui::frmHelp>())
 {
     mUi->setupUi(this);
-    mUi->Picture1->setSource(QStringLiteral(":/icons/songcase.svg"));
+    mUi->Picture1->setSource(u":/icons/songcase.svg"_s);
     connect(mUi->Link, &QLabel::linkActivated, this, &frmHelp::Link_Click);
 }
 
@@ -23,14 +25,13 @@ frmHelp::~frmHelp() = default;
 
 QString frmHelp::guideAddress()
 {
-    const QString page =
-        QLatin1String(gLanguage == languageDutch ? "nl" : "en") + QStringLiteral("/index.html");
+    const QString page = QLatin1String(gLanguage == languageDutch ? "nl" : "en") + u"/index.html"_s;
     const QString beside =
-        QCoreApplication::applicationDirPath() + QStringLiteral("/../share/songcase/guide/") + page;
+        QCoreApplication::applicationDirPath() + u"/../share/songcase/guide/"_s + page;
     QString file = QFileInfo(beside).canonicalFilePath();
     if (file.isEmpty())
         file = QStandardPaths::locate(QStandardPaths::GenericDataLocation,
-                                      QStringLiteral("songcase/guide/") + page);
+                                      u"songcase/guide/"_s + page);
     return file.isEmpty() ? QString() : QUrl::fromLocalFile(file).toString();
 }
 
@@ -40,7 +41,7 @@ void frmHelp::Form_Load()
                          {"lblToGetYourHelpOnLine", "lblToGetYourHelpOnLine"}});
     setWindowTitle(GetMessage("TTHelp"));
     const QString name = GetMessage("xGuide");
-    mUi->Link->setText(QStringLiteral("<a href=\"guide\"><b>") + name + QStringLiteral("</b></a>"));
+    mUi->Link->setText(u"<a href=\"guide\"><b>"_s + name + u"</b></a>"_s);
     mUi->Link->setAccessibleName(name);
     mUi->Link->setToolTip(guideAddress());
 }
@@ -67,7 +68,7 @@ void frmHelp::Link_Click()
 {
     const QString address = guideAddress();
     if (address.isEmpty() || !Desktop::current().openAddress(address))
-        errorBox(QStringLiteral("No browser detected!"));
+        errorBox(u"No browser detected!"_s);
 }
 
 void ShowHelpLinks()

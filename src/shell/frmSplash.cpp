@@ -1,10 +1,12 @@
 #include "shell/frmSplash.h"
 
-#include "shell/services/messages.h"
+#include "services/messages.h"
 #include "shell/ui_frmSplash.h"
 
 #include <QElapsedTimer>
 #include <QScreen>
+
+using namespace Qt::StringLiterals;
 
 namespace
 {
@@ -25,12 +27,12 @@ void setLight(QLabel *label, int pixels, int alpha)
 
 } // namespace
 
-frmSplash::frmSplash() : Form(QStringLiteral("frmSplash")), mUi(std::make_unique<Ui::frmSplash>())
+frmSplash::frmSplash() : Form(u"frmSplash"_s), mUi(std::make_unique<Ui::frmSplash>())
 {
     mUi->setupUi(this);
     setWindowFlags(Qt::SplashScreen | Qt::FramelessWindowHint);
     setFixedSize(size());
-    mUi->Picture1->setSource(QStringLiteral(":/splash/splash.svg"));
+    mUi->Picture1->setSource(u":/splash/splash.svg"_s);
     for (QLabel *label : {mUi->lblProgram, mUi->lblVersion, mUi->lblAuthor})
         label->hide();
     connect(mUi->Picture1, &SvgPicture::Painted, this, &frmSplash::showWords);
@@ -44,7 +46,7 @@ void frmSplash::Form_Load()
     const QString name = GetMessage("MainScreen.Caption");
     setWindowTitle(name);
     mUi->lblProgram->setText(name);
-    mUi->lblVersion->setText(QStringLiteral("Version " SONGCASE_VERSION));
+    mUi->lblVersion->setText(u"Version " SONGCASE_VERSION ""_s);
     mUi->Picture1->setAccessibleName(name);
     move(screen()->availableGeometry().center() - rect().center());
 }

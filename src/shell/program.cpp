@@ -1,12 +1,12 @@
 #include "shell/program.h"
 
 #include "platform/desktop/qtdesktop.h"
+#include "services/globals.h"
+#include "services/messages.h"
 #include "shell/MainScreen.h"
 #include "shell/application.h"
 #include "shell/endsignals.h"
 #include "shell/frmSplash.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
 #include "shell/singleinstance.h"
 #include "shell/startup.h"
 

@@ -7,6 +7,8 @@
 #include <QFileInfo>
 #include <QLocalSocket>
 
+using namespace Qt::StringLiterals;
+
 namespace
 {
 
@@ -17,7 +19,7 @@ QString nameFor(const QString &folder)
 {
     const QByteArray hash = QCryptographicHash::hash(QFileInfo(folder).absoluteFilePath().toUtf8(),
                                                      QCryptographicHash::Sha1);
-    return QStringLiteral("songcase-") + QString::fromLatin1(hash.toHex().left(16));
+    return u"songcase-"_s + QString::fromLatin1(hash.toHex().left(16));
 }
 
 } // namespace
@@ -26,7 +28,7 @@ SingleInstance::SingleInstance(const QString &programFolder) : mServerName(nameF
 {
     const QString beside = QFileInfo(Desktop::current().settingsFile()).absolutePath();
     QDir().mkpath(beside);
-    mLockName = beside + QDir::separator() + mServerName + QStringLiteral(".lock");
+    mLockName = beside + QDir::separator() + mServerName + u".lock"_s;
 }
 
 SingleInstance::~SingleInstance()

@@ -5,12 +5,14 @@
 #include "platform/ado/connection.h"
 #include "platform/ado/value.h"
 #include "platform/text/textrules.h"
-#include "shell/services/clsRegistry.h"
-#include "shell/services/fileutilities.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
+#include "services/clsRegistry.h"
+#include "services/fileutilities.h"
+#include "services/globals.h"
+#include "services/messages.h"
 
 #include <QDir>
+
+using namespace Qt::StringLiterals;
 
 namespace startup
 {
@@ -40,7 +42,7 @@ int number(const QString &text)
 {
     const qint64 value = ADODB::Value(text).toLong();
     if (value != int(value))
-        throw ADODB::makeError(ADODB::errOverflow);
+        throw makeError(errOverflow);
     return int(value);
 }
 
@@ -72,8 +74,8 @@ void readLanguage(clsRegistry &settings)
 
 bool oldCatalogueIn(const QString &folder)
 {
-    return FileExists(folder + QDir::separator() + QStringLiteral("Compact.orv")) ||
-           FileExists(folder + QDir::separator() + QStringLiteral("Compact3.orv"));
+    return FileExists(folder + QDir::separator() + u"Compact.orv"_s) ||
+           FileExists(folder + QDir::separator() + u"Compact3.orv"_s);
 }
 
 void readGeneration(clsRegistry &settings, const QString &programFolder, Found &found)
@@ -86,8 +88,8 @@ void readGeneration(clsRegistry &settings, const QString &programFolder, Found &
     }
     found.dbVersion = number(stored);
     if (found.dbVersion < currentGeneration) {
-        settings.SetValue(QStringLiteral("Software\\Orvanta Software\\Songcase"),
-                          QStringLiteral("DBVersion"), currentGeneration);
+        settings.SetValue(u"Software\\Orvanta Software\\Songcase"_s, u"DBVersion"_s,
+                          currentGeneration);
         found.conversionPending = true;
     }
 }
@@ -100,7 +102,6 @@ Found readSettings(const QString &programFolder)
     Found found;
     found.session = countSession(settings);
     readLanguage(settings);
-    ADODB::setErrorLanguage(gLanguage);
     readGeneration(settings, programFolder, found);
     found.useProxy = ReadProxySettings();
     return found;
@@ -117,11 +118,11 @@ QString ReadProxySettings()
 {
     clsRegistry settings;
     const QString useProxy = read(settings, "UseProxy");
-    gUseProxy = useProxy == QLatin1String("1");
+    gUseProxy = useProxy == "1"_L1;
     gProxyServer = gUseProxy ? read(settings, "ProxyServer") : QString();
     gProxyPassword = gUseProxy ? read(settings, "ProxyPassword") : QString();
     gProxyUserName = gUseProxy ? read(settings, "ProxyUserName") : QString();
-    gProxyServerPort = gUseProxy ? read(settings, "ProxyServerPort") : QStringLiteral("0");
+    gProxyServerPort = gUseProxy ? read(settings, "ProxyServerPort") : u"0"_s;
     return useProxy;
 }
 
@@ -133,7 +134,7 @@ void openCatalogue(const QString &file, bool lastRunBroken)
         cataloguefile::inspect(file);
         gConnection->Open();
         cataloguefile::verify(*gConnection, lastRunBroken);
-    } catch (const ADODB::Error &error) {
+    } catch (const Error &error) {
         gConnection->Errors.assign(1, error);
         if (gConnection->State() == ADODB::adStateOpen)
             gConnection->Close();

@@ -15,7 +15,7 @@ struct Found {
 };
 
 /// Reads the settings, mends and counts on, and sets gLanguage and the proxy globals. Throws
-/// ADODB::Error for a number that is too large.
+/// Error for a number that is too large.
 Found readSettings(const QString &programFolder);
 
 /// The language that the settings hold, English where they hold none; nothing is written.
@@ -24,7 +24,7 @@ int storedLanguage();
 /// Reads the proxy globals; gives the text of the value UseProxy.
 QString ReadProxySettings();
 
-/// Opens the catalogue as gConnection. Throws ADODB::Error, which then stands in its Errors too,
+/// Opens the catalogue as gConnection. Throws Error, which then stands in its Errors too,
 /// and gConnection is there but closed.
 void openCatalogue(const QString &file, bool lastRunBroken);
 

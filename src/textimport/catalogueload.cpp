@@ -3,9 +3,11 @@
 #include "catalogue/ids.h"
 #include "catalogue/quoting.h"
 #include "platform/ado/recordset.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
+#include "services/globals.h"
+#include "services/messages.h"
 #include "textimport/importrecords.h"
+
+using namespace Qt::StringLiterals;
 
 /// One track as the statements take it: texts with their quotes doubled, genre and year as finished
 /// values, numbers as digits.
@@ -84,8 +86,8 @@ QString insertLink(const QString &id, const QString &cd, const QString &disk, co
            trackId + Literal(")");
 }
 
-const auto nextArtistId = QStringLiteral("Select max(ID)+1 as ID from Artiesten");
-const auto nextTrackId = QStringLiteral("select max(id+1) as ID from tracks");
+const auto nextArtistId = u"Select max(ID)+1 as ID from Artiesten"_s;
+const auto nextTrackId = u"select max(id+1) as ID from tracks"_s;
 
 bool compilations()
 {
@@ -96,7 +98,7 @@ bool compilations()
 // import.
 QString genreValue(const QString &genre)
 {
-    return genre.isEmpty() ? QStringLiteral("NULL") : QString(u'\'' + genre + u'\'');
+    return genre.isEmpty() ? u"NULL"_s : QString(u'\'' + genre + u'\'');
 }
 
 bool isThere(const QString &statement)
@@ -119,7 +121,7 @@ QString findOrMakeArtist(const QString &artist)
 {
     QString id = onlyId(selectArtist(artist), u"ID");
     if (id.isEmpty()) {
-        id = QString::number(nextId(nextArtistId, QLatin1String("ID")));
+        id = QString::number(nextId(nextArtistId, "ID"_L1));
         gConnection->Execute(insertArtist(id, artist));
     }
     return id;
@@ -131,7 +133,7 @@ QString findOrMakeTrack(const QString &title, const QString &artistId, const QSt
 {
     QString id = onlyId(selectTrack(title, artistId), u"trackid");
     if (id.isEmpty()) {
-        id = QString::number(nextId(nextTrackId, QLatin1String("ID")));
+        id = QString::number(nextId(nextTrackId, "ID"_L1));
         gConnection->Execute(insertTrack(id, artistId, title, genre, year));
     }
     return id;

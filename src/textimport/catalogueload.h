@@ -23,7 +23,7 @@ public:
     /// takes everything back.
     std::function<BoxAnswer(const QString &question)> ask;
 
-    /// Throws ADODB::Error. The transaction is then left open for the caller's handler to roll
+    /// Throws Error. The transaction is then left open for the caller's handler to roll
     /// back, after it has shown what the connection says.
     Outcome run();
 

@@ -1,16 +1,18 @@
 #include "textimport/filereading.h"
 
 #include "catalogue/ids.h"
-#include "platform/ado/error.h"
-#include "shell/services/fileutilities.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
+#include "platform/error/error.h"
+#include "services/fileutilities.h"
+#include "services/globals.h"
+#include "services/messages.h"
+
+using namespace Qt::StringLiterals;
 
 namespace
 {
 
-const auto nextCompactDiscId = QStringLiteral("select max(id+1) as ID from CompactDiscs");
-const auto nextCdTitelId = QStringLiteral("select max(id+1) as ID from CDtitels");
+const auto nextCompactDiscId = u"select max(id+1) as ID from CompactDiscs"_s;
+const auto nextCdTitelId = u"select max(id+1) as ID from CDtitels"_s;
 
 // By design: where a reader does not take the word behind the percentage from the table, it is
 // Dutch in both languages.
@@ -24,13 +26,13 @@ bool wordIsFromTable(FilePart part)
 void FileReading::run()
 {
     gImportRecords = newImportRecords();
-    const qint64 discRow = nextId(nextCompactDiscId, QLatin1String("ID"));
-    const qint64 cd = nextId(nextCdTitelId, QLatin1String("ID"));
+    const qint64 discRow = nextId(nextCompactDiscId, "ID"_L1);
+    const qint64 cd = nextId(nextCdTitelId, "ID"_L1);
     if (!FileExists(gImportFile))
         return;
     InputTextFile file;
     if (!OpenInputFile(gImportFile, file))
-        throw ADODB::makeError(ADODB::errCannotUse, gImportFile);
+        throw makeError(errCannotUse, gImportFile);
     mLineTotal = file.countLines();
     tell(FilePart::Head);
     if (mLineTotal == 0)
@@ -68,6 +70,6 @@ void FileReading::tell(FilePart part)
         return;
     mPercentShown = percent;
     mFromTableShown = fromTable;
-    show(percent, QString::number(percent) +
-                      (fromTable ? GetMessage("lblRead") : QStringLiteral("% ingelezen")));
+    show(percent,
+         QString::number(percent) + (fromTable ? GetMessage("lblRead") : u"% ingelezen"_s));
 }

@@ -1,14 +1,16 @@
 #include "textimport/frmImport.h"
 
-#include "shell/services/captions.h"
-#include "shell/services/frame.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
+#include "services/captions.h"
+#include "services/frame.h"
+#include "services/globals.h"
+#include "services/messages.h"
 #include "textimport/frmImportDBBusy.h"
 #include "textimport/importrecords.h"
 #include "textimport/ui_frmImport.h"
 
 #include <QStyle>
+
+using namespace Qt::StringLiterals;
 
 namespace
 {
@@ -25,13 +27,13 @@ constexpr Column columns[] = {{"No", 0},     {"Artiest", 29}, {"Titel", 34},
 
 int neededWidth(const Column &column, const QFontMetrics &metrics)
 {
-    const int head = metrics.horizontalAdvance(GetMessage(column.key) + QStringLiteral("mm"));
-    return qMax(head, metrics.horizontalAdvance(QStringLiteral("000000")));
+    const int head = metrics.horizontalAdvance(GetMessage(column.key) + u"mm"_s);
+    return qMax(head, metrics.horizontalAdvance(u"000000"_s));
 }
 
 } // namespace
 
-frmImport::frmImport() : Form(QStringLiteral("frmImport")), mUi(std::make_unique<Ui::frmImport>())
+frmImport::frmImport() : Form(u"frmImport"_s), mUi(std::make_unique<Ui::frmImport>())
 {
     mUi->setupUi(this);
     connect(mUi->StartDBImport, &QPushButton::clicked, this, &frmImport::StartDBImport_Click);

@@ -1,15 +1,17 @@
 #include "textimport/frmImportBusy.h"
 
 #include "platform/desktop/throttledpump.h"
-#include "shell/services/captions.h"
-#include "shell/services/frame.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
+#include "services/captions.h"
+#include "services/frame.h"
+#include "services/globals.h"
+#include "services/messages.h"
 #include "textimport/filereading.h"
 #include "textimport/frmImport.h"
 #include "textimport/ui_frmImportBusy.h"
 
 #include <QTimer>
+
+using namespace Qt::StringLiterals;
 
 namespace
 {
@@ -24,12 +26,12 @@ QString atLine(int lineNumber, const QString &what)
 } // namespace
 
 frmImportBusy::frmImportBusy()
-    : Form(QStringLiteral("frmImportBusy")),
+    : Form(u"frmImportBusy"_s),
       mUi(std::make_unique<Ui::frmImportBusy>()),
       mStartReading(new QTimer(this))
 {
     mUi->setupUi(this);
-    mStartReading->setObjectName(QStringLiteral("StartReading"));
+    mStartReading->setObjectName(u"StartReading"_s);
     connect(mStartReading, &QTimer::timeout, this, &frmImportBusy::StartReading_Timer);
     mStartReading->start(1);
 }
@@ -78,7 +80,7 @@ bool frmImportBusy::read(FileReading &reading)
         reading.run();
         return true;
     } catch (const DataError &error) {
-        errorBox(atLine(error.line, QStringLiteral(": ") + error.reason), GetMessage("FileError"));
+        errorBox(atLine(error.line, u": "_s + error.reason), GetMessage("FileError"));
     } catch (const std::exception &) {
         // What cannot be taken apart has no reason but the general one.
     }

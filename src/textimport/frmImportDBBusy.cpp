@@ -3,15 +3,17 @@
 #include "catalogue/errorboxes.h"
 #include "platform/ado/connection.h"
 #include "platform/desktop/throttledpump.h"
-#include "shell/services/browser.h"
-#include "shell/services/captions.h"
-#include "shell/services/frame.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
+#include "services/browser.h"
+#include "services/captions.h"
+#include "services/frame.h"
+#include "services/globals.h"
+#include "services/messages.h"
 #include "textimport/catalogueload.h"
 #include "textimport/ui_frmImportDBBusy.h"
 
 #include <QTimer>
+
+using namespace Qt::StringLiterals;
 
 namespace
 {
@@ -22,7 +24,7 @@ void unloadReview()
 {
     const auto forms = Form::openForms();
     for (Form *form : forms) {
-        if (form->Name() == QLatin1String("frmImport"))
+        if (form->Name() == "frmImport"_L1)
             form->Unload();
     }
 }
@@ -30,12 +32,12 @@ void unloadReview()
 } // namespace
 
 frmImportDBBusy::frmImportDBBusy()
-    : Form(QStringLiteral("frmImportDBBusy")),
+    : Form(u"frmImportDBBusy"_s),
       mUi(std::make_unique<Ui::frmImportDBBusy>()),
       mStartImporting(new QTimer(this))
 {
     mUi->setupUi(this);
-    mStartImporting->setObjectName(QStringLiteral("StartImporting"));
+    mStartImporting->setObjectName(u"StartImporting"_s);
     connect(mStartImporting, &QTimer::timeout, this, &frmImportDBBusy::StartImporting_Timer);
     mStartImporting->start(1);
 }
@@ -63,7 +65,7 @@ void frmImportDBBusy::StartImporting_Timer()
     Desktop::current().setPointer(this, vbHourglass);
     try {
         load();
-    } catch (const ADODB::Error &error) {
+    } catch (const Error &error) {
         showDatabaseErrors(error);
         gConnection->RollbackTrans();
         leave();

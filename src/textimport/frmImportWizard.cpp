@@ -1,14 +1,16 @@
 #include "textimport/frmImportWizard.h"
 
 #include "platform/desktop/desktop.h"
-#include "shell/services/captions.h"
-#include "shell/services/frame.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
+#include "services/captions.h"
+#include "services/frame.h"
+#include "services/globals.h"
+#include "services/messages.h"
 #include "textimport/frmImportBusy.h"
 #include "textimport/ui_frmImportWizard.h"
 
 #include <QFileInfo>
+
+using namespace Qt::StringLiterals;
 
 namespace
 {
@@ -21,13 +23,13 @@ QString shortened(const QString &name)
     constexpr qsizetype wholeBelow = 21, kept = 3, keptAtEnd = 18;
     if (name.size() < wholeBelow)
         return name;
-    return name.first(kept) + QStringLiteral(".......") + name.last(keptAtEnd);
+    return name.first(kept) + u"......."_s + name.last(keptAtEnd);
 }
 
 } // namespace
 
 frmImportWizard::frmImportWizard()
-    : Form(QStringLiteral("frmImportWizard")), mUi(std::make_unique<Ui::frmImportWizard>())
+    : Form(u"frmImportWizard"_s), mUi(std::make_unique<Ui::frmImportWizard>())
 {
     mUi->setupUi(this);
     connectControls();

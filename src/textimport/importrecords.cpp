@@ -2,6 +2,8 @@
 
 #include "platform/text/textrules.h"
 
+using namespace Qt::StringLiterals;
+
 namespace
 {
 
@@ -12,7 +14,7 @@ constexpr int fieldLength = 255;
 ADODB::RecordsetPtr newImportRecords()
 {
     auto records = std::make_shared<ADODB::Recordset>();
-    records->appendField(QStringLiteral("ListIndex"), ADODB::adBigInt);
+    records->appendField(u"ListIndex"_s, ADODB::adBigInt);
     for (const char *name : {"Artist", "TrackTitle", "Genre", "Hitjaar", "MainTitle",
                              "MainTitleIndex", "DiskIndex", "TrackIndex"})
         records->appendField(QString::fromLatin1(name), ADODB::adVarWChar, fieldLength);
@@ -26,7 +28,7 @@ QString treatedField(QStringView field)
     QString kept =
         text::cutTo(field.first(qMin(field.size(), fieldLength + 1)).toString(), fieldLength);
     if (kept.contains(u'"'))
-        kept.replace(u'"', QLatin1String("''"));
+        kept.replace(u'"', "''"_L1);
     return text::properCase(kept);
 }
 

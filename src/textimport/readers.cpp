@@ -1,11 +1,13 @@
 #include "textimport/readers.h"
 
-#include "platform/ado/error.h"
+#include "platform/error/error.h"
 #include "platform/text/textrules.h"
-#include "shell/services/messages.h"
+#include "services/messages.h"
 
 #include <algorithm>
 #include <limits>
+
+using namespace Qt::StringLiterals;
 
 QString ImportLines::next(FilePart part)
 {
@@ -86,7 +88,7 @@ int countLine(ImportLines &lines)
         lines.refuse("NumberNotFound");
     const qint64 count = ADODB::Value(line).toLong();
     if (count < std::numeric_limits<int>::min() || count > std::numeric_limits<int>::max())
-        throw ADODB::makeError(ADODB::errOverflow);
+        throw makeError(errOverflow);
     return int(count);
 }
 
@@ -149,7 +151,7 @@ QStringView beforeStar(QStringView &rest)
 {
     const auto star = rest.indexOf(u'*');
     if (star < 0)
-        throw ADODB::makeError(ADODB::errTypeMismatch, rest.toString());
+        throw makeError(errTypeMismatch, rest.toString());
     const QStringView field = rest.first(star);
     rest = rest.sliced(star + 1);
     return field;
@@ -231,7 +233,7 @@ void ReadAlbumFlat(ImportLines &lines, TrackRows &rows)
         place.main = lines.next(FilePart::Tracks);
         // By design: Dutch in both languages.
         if (place.main.contains(u'*'))
-            lines.refuseWith(QStringLiteral("Hoofdtitel mag het teken * niet bevatten!"));
+            lines.refuseWith(u"Hoofdtitel mag het teken * niet bevatten!"_s);
     };
     readMarked(lines, place, readTrack, readHead);
 }

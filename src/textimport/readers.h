@@ -1,6 +1,6 @@
 #pragma once
 
-#include "shell/services/textfiles.h"
+#include "services/textfiles.h"
 #include "textimport/importrecords.h"
 
 #include <functional>
@@ -38,7 +38,7 @@ private:
 
 // The readers of the four formats: lines into rows. A fault in the data is thrown as DataError;
 // what a reader cannot even take apart (a count beyond 32 bits, a track without its stars) as
-// ADODB::Error. The rows up to there are kept.
+// Error. The rows up to there are kept.
 
 /// One field per row: title, count of discs; per disc a count of tracks; per track artist, title,
 /// genre, year.

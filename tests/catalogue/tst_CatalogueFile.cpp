@@ -1,7 +1,7 @@
 // Label: unit
 #include "catalogue/cataloguefile.h"
 #include "platform/ado/recordset.h"
-#include "shell/services/globals.h"
+#include "services/globals.h"
 #include "support/datarows.h"
 #include "support/ordinaryuser.h"
 #include "support/testcatalogue.h"
@@ -61,7 +61,7 @@ private:
             openConnection(file());
             cataloguefile::verify(*gConnection, thorough);
             return {};
-        } catch (const ADODB::Error &error) {
+        } catch (const Error &error) {
             return error.Description;
         }
     }
@@ -109,10 +109,10 @@ private slots:
     void makesNoneOverAnother()
     {
         const auto before = snapshot();
-        QVERIFY_EXCEPTION_THROWN(cataloguefile::create(file()), ADODB::Error);
+        QVERIFY_EXCEPTION_THROWN(cataloguefile::create(file()), Error);
         QCOMPARE(snapshot(), before);
         const QString nowhere = folder() + u"/none/Compact4.orv"_s;
-        QVERIFY_EXCEPTION_THROWN(cataloguefile::create(nowhere), ADODB::Error);
+        QVERIFY_EXCEPTION_THROWN(cataloguefile::create(nowhere), Error);
         QVERIFY(!QFile::exists(nowhere));
     }
 

@@ -3,7 +3,7 @@
 #include "catalogue/ids.h"
 #include "catalogue/quoting.h"
 #include "platform/ado/recordset.h"
-#include "shell/services/globals.h"
+#include "services/globals.h"
 #include "support/datarows.h"
 #include "support/scripteddesktop.h"
 #include "support/testcatalogue.h"
@@ -91,7 +91,7 @@ private slots:
     void firstAndNextIds()
     {
         const QString statement = u"SELECT max(ID)+1 as ID FROM Tracks"_s;
-        const auto next = [&] { return nextId(statement, QLatin1String("ID")); };
+        const auto next = [&] { return nextId(statement, "ID"_L1); };
         QCOMPARE(next(), 3);
         mCatalogue->exec("delete from tracks where id=2");
         QCOMPARE(next(), 2);

@@ -3,8 +3,8 @@
 #include "catalogue/provision.h"
 #include "platform/ado/recordset.h"
 #include "platform/desktop/programfolder.h"
-#include "shell/services/clsRegistry.h"
-#include "shell/services/globals.h"
+#include "services/clsRegistry.h"
+#include "services/globals.h"
 #include "support/datarows.h"
 #include "support/ordinaryuser.h"
 #include "support/scripteddesktop.h"
@@ -77,7 +77,7 @@ private slots:
             const OrdinaryUser user;
             try {
                 provisionCatalogue();
-            } catch (const ADODB::Error &error) {
+            } catch (const Error &error) {
                 told = error.Description;
             }
         }

@@ -86,9 +86,8 @@ private:
     void addTrack()
     {
         const Song added = song();
-        mE->addTracks({mShown.record.isAlbum
-                           ? added.title
-                           : QString(added.artist + QLatin1Char('|') + added.title)});
+        mE->addTracks(
+            {mShown.record.isAlbum ? added.title : QString(added.artist + u'|' + added.title)});
         mShown.disc.push_back(added);
     }
 
@@ -286,7 +285,7 @@ private:
                                               record.isAlbum ? record.artist : u"NULL"_s,
                                               QString::number(number), QString::number(i + 1),
                                               artist, disc[i].title})
-                                     .join(QLatin1Char('|')));
+                                     .join(u'|'));
                 }
             }
         }

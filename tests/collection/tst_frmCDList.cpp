@@ -1,7 +1,7 @@
 // Label: screen
 #include "collection/frmCDList.h"
 #include "collection/recordtree.h"
-#include "controls/DBListViewCTL.h"
+#include "controls/list/DBListViewCTL.h"
 #include "platform/ado/connection.h"
 #include "support/editing.h"
 #include "support/screentest.h"
@@ -123,9 +123,8 @@ private slots:
     void aFailedDeleteTakesAllBack()
     {
         fill();
-        mCatalogue->exec(
-            QStringLiteral("create trigger refuse before delete on CDTitels when old.ID=2 "
-                           "begin select raise(abort, 'not this one'); end"));
+        mCatalogue->exec(u"create trigger refuse before delete on CDTitels when old.ID=2 "
+                         "begin select raise(abort, 'not this one'); end"_s);
         show();
         mDesktop->expectBox(u"yes-no"_s, vbYes);
         mDesktop->expectBox(u"not this one"_s);
@@ -139,10 +138,8 @@ private slots:
     void theRememberedRowIsSelectedAgain()
     {
         for (int i = 1; i <= 7; ++i)
-            mCatalogue->exec(
-                QStringLiteral("insert into CDTitels values (%1,'T%1',null,'V',null,null);"
-                               "insert into CompactDiscs values (%1,%1,1,1,1,null)")
-                    .arg(i));
+            mCatalogue->exec(u"insert into CDTitels values (%1,'T%1',null,'V',null,null);"
+                             "insert into CompactDiscs values (%1,%1,1,1,1,null)"_s.arg(i));
         show();
         auto *col = list("ColList");
         QTest::keyClick(col, Qt::Key_End);
@@ -235,7 +232,7 @@ private:
     // artist 3 has album 5 alone.
     void fill()
     {
-        mCatalogue->exec(QStringLiteral(R"(
+        mCatalogue->exec(uR"(
             insert into Artiesten values (1,'Zed'),(2,'Édith'),(3,'alone'),(4,'Eddy');
             insert into Tracks values (1,1,'One',null,null),(2,2,'Two',null,1985),(3,3,'Three',null,null),
                 (4,4,'Four',null,null);
@@ -244,7 +241,7 @@ private:
             insert into CompactDiscs values (1,1,1,1,1,null),(2,2,1,1,2,null),(3,3,1,1,2,null),(4,4,1,1,4,null),
                 (5,5,1,1,3,null);
             insert into MP3Collections values (1,'/b','Second'),(2,'/a','First');
-            insert into MP3Files values (1,1,'x.mp3',1),(2,1,'y.mp3',2);)"));
+            insert into MP3Files values (1,1,'x.mp3',1),(2,1,'y.mp3',2);)"_s);
     }
 
     void show()

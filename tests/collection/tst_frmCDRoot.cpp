@@ -354,8 +354,8 @@ private slots:
         const QStringList before = three();
         QStringList lines;
         for (int i = 0; i < 100; ++i)
-            lines.append(u"Anna\t"_s + QString(200, QLatin1Char('x')) + QString::number(i));
-        QApplication::clipboard()->setText(lines.join(QLatin1Char('\n')));
+            lines.append(u"Anna\t"_s + QString(200, u'x') + QString::number(i));
+        QApplication::clipboard()->setText(lines.join(u'\n'));
         mE->disk()->setFocus();
         mE->disk()->setCurrentRow(3);
         mE->disk()->setCurrentColumn(2);

@@ -1,8 +1,8 @@
 // Label: screen
 #include "collection/cdeditor.h"
 #include "collection/frmSearchArtistsTitles.h"
-#include "controls/DBListViewCTL.h"
-#include "controls/trackgrid.h"
+#include "controls/list/DBListViewCTL.h"
+#include "controls/tracks/trackgrid.h"
 #include "support/fulldisk.h"
 #include "support/ordinaryuser.h"
 #include "support/referencelike.h"

@@ -1,8 +1,8 @@
 #include "catalogue/cataloguefile.h"
 #include "fuzz/fuzz.h"
 #include "platform/ado/recordset.h"
-#include "shell/services/globals.h"
-#include "shell/services/settingsfile.h"
+#include "services/globals.h"
+#include "services/settingsfile.h"
 #include "support/testcatalogue.h"
 
 #include <QDir>
@@ -55,7 +55,7 @@ bool opens(const QString &name)
         openConnection(name);
         cataloguefile::verify(*gConnection, true);
         return true;
-    } catch (const ADODB::Error &error) {
+    } catch (const Error &error) {
         fuzz::must(!error.Description.isEmpty(), "refused without words");
         return false;
     }
@@ -73,7 +73,7 @@ void runCatalogue(const QByteArray &input)
               "delete from artiesten where naam like 'artist 1%'"}) {
             try {
                 gConnection->Execute(QLatin1String(statement));
-            } catch (const ADODB::Error &) {
+            } catch (const Error &) {
             }
         }
         gConnection.reset();

@@ -1,5 +1,5 @@
 #include "fuzz/fuzz.h"
-#include "platform/ado/error.h"
+#include "platform/error/error.h"
 #include "support/testcatalogue.h"
 #include "textimport/readers.h"
 
@@ -28,7 +28,7 @@ void runReader(const QByteArray &input)
     } catch (const DataError &error) {
         fuzz::must(error.line <= told && !error.reason.isEmpty(),
                    "a fault without place or reason");
-    } catch (const ADODB::Error &) {
+    } catch (const Error &) {
     }
     const auto made = records->rows();
     for (qsizetype row = 0; row < made->rowCount(); ++row)

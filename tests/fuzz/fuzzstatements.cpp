@@ -2,7 +2,7 @@
 #include "fuzz/fuzz.h"
 #include "platform/ado/dialect.h"
 #include "platform/ado/recordset.h"
-#include "shell/services/globals.h"
+#include "services/globals.h"
 #include "support/testcatalogue.h"
 
 namespace
@@ -39,7 +39,7 @@ void translate(const QString &statement)
             for (const ADODB::Literal &l : dialect.literals())
                 all.append("\n").append(dialect.text(l)).append(std::to_string(l.integer));
             return all;
-        } catch (const ADODB::Error &) {
+        } catch (const Error &) {
             return std::string("refused");
         }
     };
@@ -56,7 +56,7 @@ void runStatement(const QByteArray &input)
         const ADODB::Recordset answer = gConnection->Execute(statement);
         if (answer.State() == ADODB::adStateOpen)
             fuzz::must(answer.RecordCount() >= 0, "rows");
-    } catch (const ADODB::Error &error) {
+    } catch (const Error &error) {
         fuzz::must(!error.Description.isEmpty(), "an error without words");
     }
     transaction.RollbackTrans();
@@ -70,8 +70,7 @@ void runValue(const QByteArray &input)
     catalogue();
     const QString typed = QString::fromUtf8(input);
     ADODB::Transaction transaction(*gConnection);
-    gConnection->Execute(u"Insert into Artiesten(ID,Naam) values (3,"_s + quoted(typed) +
-                         QLatin1Char(')'));
+    gConnection->Execute(u"Insert into Artiesten(ID,Naam) values (3,"_s + quoted(typed) + u')');
     ADODB::Recordset rs;
     rs.Open(u"Select Naam From Artiesten where ID = 3 and Naam = "_s + quoted(typed), *gConnection);
     fuzz::must(rs.RecordCount() == 1, "a name is not found again");
@@ -81,7 +80,7 @@ void runValue(const QByteArray &input)
         gConnection->Execute(
             u"Insert into Tracks(ID,Artiest_ID,Titel,Genre,Hitjaar) values (2,1,"_s +
             quoted(typed) + u",'"_s + typed + u"',1985)"_s);
-    } catch (const ADODB::Error &) {
+    } catch (const Error &) {
         fuzz::must(count("tracks") == 1, "a refused statement has written");
     }
     fuzz::must(count("tracks") <= 2 && count("artiesten") == 3, "a genre has become a statement");

@@ -2,7 +2,7 @@
 #include "platform/text/collation.h"
 #include "platform/text/likepattern.h"
 #include "platform/text/textrules.h"
-#include "shell/services/textfiles.h"
+#include "services/textfiles.h"
 #include "support/icuorder.h"
 #include "support/referencelike.h"
 #include "support/testcatalogue.h"

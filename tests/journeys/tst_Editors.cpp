@@ -1,5 +1,5 @@
 // Label: journey
-#include "controls/DBListViewCTL.h"
+#include "controls/list/DBListViewCTL.h"
 #include "platform/ado/connection.h"
 #include "support/editing.h"
 #include "support/journey.h"
@@ -53,7 +53,7 @@ private:
             "CDTitels d on d.ID = c.CDTitels_ID join Tracks t "
             "on t.ID = c.Track_ID join Artiesten a on a.ID = t.Artiest_ID "
             "order by d.ID, DiskNo, TrackNo)");
-        return all.split(QLatin1Char('\n'), Qt::SkipEmptyParts);
+        return all.split(u'\n', Qt::SkipEmptyParts);
     }
 
 private slots:

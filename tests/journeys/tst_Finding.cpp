@@ -1,7 +1,7 @@
 // Label: journey
 #include "collection/cdeditor.h"
-#include "controls/DBListViewCTL.h"
-#include "controls/trackgrid.h"
+#include "controls/list/DBListViewCTL.h"
+#include "controls/tracks/trackgrid.h"
 #include "support/editing.h"
 #include "support/journey.h"
 

@@ -1,5 +1,5 @@
 // Label: journey
-#include "controls/DBListViewCTL.h"
+#include "controls/list/DBListViewCTL.h"
 #include "platform/ado/connection.h"
 #include "support/journey.h"
 
@@ -94,7 +94,7 @@ private slots:
             QCOMPARE(column("ColList", 1), texts("The Best Of 1985"));
             mProgram->control<QTabWidget>("frmCDList", "CDTab")->setCurrentIndex(2);
             QCOMPARE(mProgram->control<QStatusBar>("frmCDList", "TheStatusBar")->currentMessage(),
-                     GetMessage("DiffTracks") + QLatin1Char('3'));
+                     GetMessage("DiffTracks") + u'3');
         }
     }
 

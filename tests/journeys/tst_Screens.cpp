@@ -2,14 +2,14 @@
 #include "collection/frmCDList.h"
 #include "collection/frmCDRoot.h"
 #include "collection/frmCDRootE.h"
-#include "collection/frmPageSetup.h"
-#include "collection/reportpaper.h"
-#include "collection/reports.h"
 #include "platform/ado/connection.h"
+#include "reports/frmPageSetup.h"
+#include "reports/reportpaper.h"
+#include "reports/reports.h"
+#include "services/globals.h"
+#include "services/messages.h"
 #include "shell/frmHelp.h"
 #include "shell/frmSplash.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
 #include "support/scripteddesktop.h"
 #include "support/testcatalogue.h"
 #include "textimport/frmImport.h"
@@ -41,7 +41,7 @@ template <typename Editor> Make makeEditor()
 {
     return [] {
         auto *editor = new Editor;
-        editor->Mode = QStringLiteral("I");
+        editor->Mode = u"I"_s;
         return editor;
     };
 }
@@ -96,7 +96,7 @@ bool isCut(const QWidget *w)
 
 bool isPartOfAnother(const QWidget *w)
 {
-    return w->objectName().isEmpty() || w->objectName().startsWith(QLatin1String("qt_"));
+    return w->objectName().isEmpty() || w->objectName().startsWith("qt_"_L1);
 }
 
 } // namespace
@@ -140,8 +140,7 @@ private slots:
         ScriptedDesktop desktop;
         TestCatalogue catalogue;
         Form *screen = make();
-        QCOMPARE(screen->Name(),
-                 QString::fromLatin1(QTest::currentDataTag()).section(QLatin1Char(','), 0, 0));
+        QCOMPARE(screen->Name(), QString::fromLatin1(QTest::currentDataTag()).section(u',', 0, 0));
         for (QTimer *timer : screen->findChildren<QTimer *>())
             timer->stop();
         screen->Show();
@@ -151,9 +150,7 @@ private slots:
         for (const QWidget *w : screen->findChildren<QWidget *>()) {
             const QByteArray name = w->objectName().toLatin1();
             const QString text = textOf(w);
-            QVERIFY2(!text.contains(QLatin1String("Unknown")) &&
-                         !text.contains(QLatin1String("Onbekend")),
-                     name);
+            QVERIFY2(!text.contains("Unknown"_L1) && !text.contains("Onbekend"_L1), name);
             if (isPartOfAnother(w) || !w->isVisible())
                 continue;
             QVERIFY2(!needsName(w) || hasName(w, screen),

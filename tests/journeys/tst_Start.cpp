@@ -2,9 +2,9 @@
 #include "catalogue/cataloguefile.h"
 #include "platform/ado/connection.h"
 #include "platform/desktop/programfolder.h"
-#include "shell/services/clsRegistry.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
+#include "services/clsRegistry.h"
+#include "services/globals.h"
+#include "services/messages.h"
 #include "support/program.h"
 #include "support/testcatalogue.h"
 
@@ -65,12 +65,11 @@ private slots:
         const bool dutch = language == languageDutch;
         writeFile(mDesktop->folder + u"/Compact3.orv"_s, "old");
         const QString file = mDesktop->folder + u"/Compact4.orv"_s;
-        mDesktop->expectBox(
-            (dutch ? QStringLiteral("[Bestand niet gevonden] Er kan geen verbinding met "
-                                    "de database worden gemaakt!\rHet bestand ")
-                   : QStringLiteral("[File not found] Unable to connect with "
-                                    "database!\rFile ")) +
-            file);
+        mDesktop->expectBox((dutch ? u"[Bestand niet gevonden] Er kan geen verbinding met "
+                                     "de database worden gemaakt!\rHet bestand "_s
+                                   : u"[File not found] Unable to connect with "
+                                     "database!\rFile "_s) +
+                            file);
         Program program(*mDesktop);
         QVERIFY(!program.start());
         QVERIFY(Form::openForms().isEmpty());
@@ -94,13 +93,13 @@ private slots:
         makeCatalogue();
         const QString file = mDesktop->folder + u"/Compact4.orv"_s;
         sqlite3 *other = nullptr;
-        if (fault == QLatin1String("text"))
+        if (fault == "text"_L1)
             writeFile(file, QByteArray(5000, 'x'));
-        else if (fault == QLatin1String("truncated"))
+        else if (fault == "truncated"_L1)
             QVERIFY(QFile::resize(file, 4096 * 3));
-        else if (fault == QLatin1String("readonly"))
+        else if (fault == "readonly"_L1)
             QVERIFY(QFile::setPermissions(file, QFile::ReadOwner));
-        if (fault == QLatin1String("locked")) {
+        if (fault == "locked"_L1) {
             sqlite3_open(file.toUtf8().constData(), &other);
             QCOMPARE(sqlite3_exec(other, "BEGIN EXCLUSIVE", nullptr, nullptr, nullptr), SQLITE_OK);
         }
@@ -139,11 +138,10 @@ private slots:
             QVERIFY(program.start());
             program.choose(own);
             QVERIFY2(mDesktop->boxes.isEmpty(), "the current language is no change");
-            mDesktop->expectBox(
-                dutch ? QStringLiteral("information [Preferences] If you close and restart this "
-                                       "program, the preferred language will be English.")
-                      : QStringLiteral("information [Instellingen] De taalinstellingen worden "
-                                       "van toepassing indien u dit programma afsluit"));
+            mDesktop->expectBox(dutch ? u"information [Preferences] If you close and restart this "
+                                        "program, the preferred language will be English."_s
+                                      : u"information [Instellingen] De taalinstellingen worden "
+                                        "van toepassing indien u dit programma afsluit"_s);
             program.choose(other);
             QVERIFY(program.entry(other)->isChecked() && !program.entry(own)->isChecked());
             QCOMPARE(gLanguage, language);
@@ -168,7 +166,7 @@ private slots:
         QVERIFY(program.start());
         mDesktop->expectModal(u"frmSplash"_s, [](Form &splash) {
             QCOMPARE(splash.findChild<QLabel *>(u"lblVersion"_s)->text(),
-                     QStringLiteral("Version " SONGCASE_VERSION));
+                     u"Version " SONGCASE_VERSION ""_s);
             QCOMPARE(splash.findChild<QLabel *>(u"lblAuthor"_s)->text(), QString());
             QTest::keyClick(&splash, Qt::Key_Space);
         });
@@ -187,14 +185,13 @@ private slots:
         QTRY_VERIFY(link->hasFocus());
         QTest::keyClick(link, Qt::Key_Return); // and nothing before it
         QCOMPARE(mDesktop->addresses.size(), 1);
-        QVERIFY(mDesktop->addresses.first().endsWith(language == languageDutch
-                                                         ? QLatin1String("guide/nl/index.html")
-                                                         : QLatin1String("guide/en/index.html")));
+        QVERIFY(mDesktop->addresses.first().endsWith(
+            language == languageDutch ? "guide/nl/index.html"_L1 : "guide/en/index.html"_L1));
         QVERIFY(QFile::exists(QUrl(mDesktop->addresses.first()).toLocalFile()));
         mDesktop->browserThere = false;
         mDesktop->expectBox(u"error [] No browser detected!"_s.mid(0, 5));
         emit link->linkActivated(u"guide"_s);
-        QVERIFY(mDesktop->boxes.last().endsWith(QLatin1String("No browser detected!")));
+        QVERIFY(mDesktop->boxes.last().endsWith("No browser detected!"_L1));
         QVERIFY(program.end());
     }
 
@@ -209,9 +206,9 @@ private slots:
                    "mnuSearchArtistsTitles Ctrl+F1", "mnuCDInsert F2", "mnuInsertEnkelCD F3",
                    "mnuMP3 F4", "mnuUpdate F5", "mnuCDDB F6", "mnuRegisterCDDB F7", "mnuProxy F8",
                    "mnuHelp F1", "Over Ctrl+I", "mnuOverCDDB Ctrl+G")) {
-            const QByteArray entry = line.section(QLatin1Char(' '), 0, 0).toLatin1();
+            const QByteArray entry = line.section(u' ', 0, 0).toLatin1();
             QCOMPARE(program.entry(entry.constData())->shortcut(),
-                     QKeySequence(line.section(QLatin1Char(' '), 1)));
+                     QKeySequence(line.section(u' ', 1)));
         }
         QVERIFY(program.screen("frmCDList")->Unload());
         QTest::keyClick(&program.frame(), Qt::Key_F5);

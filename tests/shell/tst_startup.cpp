@@ -1,7 +1,7 @@
 // Label: unit
 #include "platform/ado/connection.h"
-#include "shell/services/clsRegistry.h"
-#include "shell/services/globals.h"
+#include "services/clsRegistry.h"
+#include "services/globals.h"
 #include "shell/startup.h"
 #include "support/datarows.h"
 #include "support/scripteddesktop.h"
@@ -54,7 +54,7 @@ private slots:
         QTEST(found.session, "session");
         QTEST(gLanguage, "language");
         QTEST(found.conversionPending, "conversion");
-        if (name == QLatin1String("DBVersion"))
+        if (name == "DBVersion"_L1)
             QVERIFY2(!startup::readSettings(desktop.folder).conversionPending, "offered once only");
     }
 

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "platform/desktop/form.h"
-#include "shell/services/browser.h"
+#include "services/browser.h"
 #include "support/texts.h"
 
 /// Stands for the open browser and counts how often its lists are read anew.

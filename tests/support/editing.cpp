@@ -68,7 +68,7 @@ void Editing::addTracks(const QStringList &tracks)
     for (const QString &track : tracks) {
         disk()->setCurrentRow(disk()->model()->rowCount());
         disk()->setCurrentColumn(2);
-        keyboard::fill(track.split(QLatin1Char('|')));
+        keyboard::fill(track.split(u'|'));
     }
 }
 

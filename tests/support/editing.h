@@ -1,9 +1,9 @@
 #pragma once
 
 #include "collection/cdeditor.h"
-#include "controls/trackgrid.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
+#include "controls/tracks/trackgrid.h"
+#include "services/globals.h"
+#include "services/messages.h"
 #include "support/countingbrowser.h"
 #include "support/datarows.h"
 #include "support/scripteddesktop.h"

@@ -1,7 +1,7 @@
 #include "support/importfixture.h"
 
 #include "platform/ado/recordset.h"
-#include "shell/services/globals.h"
+#include "services/globals.h"
 
 void chooseImport(char format, const QString &file)
 {
@@ -20,7 +20,7 @@ QStringList importRows()
         QStringList values;
         for (int column = 0; column < rows->columnCount(); ++column)
             values.append(rows->text(row, column));
-        all.append(values.join(QLatin1Char('|')));
+        all.append(values.join(u'|'));
     }
     return all;
 }

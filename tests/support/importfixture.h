@@ -1,6 +1,6 @@
 #pragma once
 
-#include "shell/services/frame.h"
+#include "services/frame.h"
 #include "support/screentest.h"
 
 #include <QWidget>

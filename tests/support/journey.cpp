@@ -1,7 +1,7 @@
 #include "support/journey.h"
 
 #include "catalogue/cataloguefile.h"
-#include "controls/DBListViewCTL.h"
+#include "controls/list/DBListViewCTL.h"
 
 void Journey::languages()
 {

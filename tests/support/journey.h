@@ -1,7 +1,7 @@
 #pragma once
 
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
+#include "services/globals.h"
+#include "services/messages.h"
 #include "support/datarows.h"
 #include "support/program.h"
 #include "support/testcatalogue.h"

@@ -1,7 +1,7 @@
 #include "support/program.h"
 
-#include "shell/services/clsRegistry.h"
-#include "shell/services/globals.h"
+#include "services/clsRegistry.h"
+#include "services/globals.h"
 
 #include "platform/ado/connection.h"
 

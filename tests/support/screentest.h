@@ -1,8 +1,8 @@
 #pragma once
 
 #include "platform/desktop/form.h"
-#include "shell/services/globals.h"
-#include "shell/services/messages.h"
+#include "services/globals.h"
+#include "services/messages.h"
 #include "support/datarows.h"
 #include "support/scripteddesktop.h"
 #include "support/testcatalogue.h"

@@ -4,7 +4,7 @@
 #include "catalogue/connect.h"
 #include "platform/ado/connection.h"
 #include "platform/ado/sqlfunctions.h"
-#include "shell/services/globals.h"
+#include "services/globals.h"
 
 #include <QFile>
 #include <QTest>
@@ -91,7 +91,7 @@ QStringList TestCatalogue::rows(const AnyText &sql)
         QStringList row;
         for (int i = 0; i < columns; ++i)
             row.append(values[i] ? QString::fromUtf8(values[i]) : u"NULL"_s);
-        static_cast<QStringList *>(to)->append(row.join(QLatin1Char('|')));
+        static_cast<QStringList *>(to)->append(row.join(u'|'));
         return 0;
     };
     if (sqlite3_exec(c.db, sql.toUtf8().constData(), take, &found, nullptr) != SQLITE_OK)
@@ -101,7 +101,7 @@ QStringList TestCatalogue::rows(const AnyText &sql)
 
 int TestCatalogue::count(const AnyText &sql)
 {
-    return rows(sql).value(0).section(QLatin1Char('|'), 0, 0).toInt();
+    return rows(sql).value(0).section(u'|', 0, 0).toInt();
 }
 
 QString writeFile(const QString &name, const QByteArray &content)
@@ -122,7 +122,7 @@ int numberOf(const std::function<void()> &fails)
 {
     try {
         fails();
-    } catch (const ADODB::Error &error) {
+    } catch (const Error &error) {
         return error.Number;
     }
     return 0;

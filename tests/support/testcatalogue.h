@@ -42,7 +42,7 @@ public:
 /// A connection to this file with the attributes that the program gives its own, opened.
 void openConnection(const QString &file);
 
-/// The number of the ADODB::Error that a piece of code ends with, 0 if it does not.
+/// The number of the Error that a piece of code ends with, 0 if it does not.
 int numberOf(const std::function<void()> &fails);
 
 /// A file with this content in a folder; gives its full name.

@@ -45,7 +45,7 @@ private:
             if (load.run() == CatalogueLoad::Outcome::Cancelled)
                 return u"cancelled"_s;
             return QString::number(load.importedCount()) + u" imported"_s;
-        } catch (const ADODB::Error &error) {
+        } catch (const Error &error) {
             gConnection->RollbackTrans();
             return u"error "_s + error.Description;
         }
@@ -205,7 +205,7 @@ private slots:
         const QStringList before = everything();
         gConnection->Errors.clear();
         const QString end = load();
-        QVERIFY2(end.startsWith(QLatin1String("error ")), qPrintable(end));
+        QVERIFY2(end.startsWith("error "_L1), qPrintable(end));
         QCOMPARE(gConnection->Errors.size(), 1u);
         QCOMPARE(everything(), before);
         mCatalogue->exec("drop trigger if exists T");

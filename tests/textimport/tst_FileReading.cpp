@@ -36,7 +36,7 @@ private:
     QString track(const QByteArray &line)
     {
         const QString end = read('C', "x\n" + line + '\n');
-        return end == QLatin1String("read") ? importRows().value(0) : end;
+        return end == "read"_L1 ? importRows().value(0) : end;
     }
 
     std::unique_ptr<TestCatalogue> mCatalogue;

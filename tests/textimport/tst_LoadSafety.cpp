@@ -189,7 +189,7 @@ int main(int argc, char **argv)
 {
     QApplication application(argc, argv);
     const QStringList arguments = QCoreApplication::arguments();
-    if (arguments.value(1) == QLatin1String("--load"))
+    if (arguments.value(1) == "--load"_L1)
         return loadAndStop(arguments.value(2), arguments.value(3), arguments.value(4).toInt());
     tst_LoadSafety test;
     return QTest::qExec(&test, argc, argv);

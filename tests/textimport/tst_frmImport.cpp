@@ -1,5 +1,5 @@
 // Label: screen
-#include "controls/DBListViewCTL.h"
+#include "controls/list/DBListViewCTL.h"
 #include "platform/ado/recordset.h"
 #include "support/countingbrowser.h"
 #include "support/importfixture.h"

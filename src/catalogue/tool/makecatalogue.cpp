@@ -1,5 +1,5 @@
 #include "catalogue/cataloguefile.h"
-#include "platform/ado/error.h"
+#include "platform/error/error.h"
 
 #include <cstdio>
 
@@ -11,7 +11,7 @@ int main(int argc, char **argv)
     try {
         cataloguefile::create(QString::fromLocal8Bit(argv[1]));
         return 0;
-    } catch (const ADODB::Error &error) {
+    } catch (const Error &error) {
         std::fprintf(stderr, "%s\n", error.what());
         return 1;
     }

@@ -1,6 +1,7 @@
 #include "platform/ado/connection.h"
 
 #include "platform/ado/dialect.h"
+#include "platform/ado/engineerror.h"
 #include "platform/ado/preparedstatements.h"
 #include "platform/ado/recordset.h"
 #include "platform/ado/roworder.h"
@@ -9,6 +10,8 @@
 #include <QStringList>
 #include <algorithm>
 #include <sqlite3.h>
+
+using namespace Qt::StringLiterals;
 
 namespace ADODB
 {
@@ -125,16 +128,16 @@ Connection::~Connection()
 
 QString Connection::dataSource(const QString &connectionString)
 {
-    const QString key = QStringLiteral("Data Source=");
+    const QString key = u"Data Source="_s;
     const auto from = connectionString.indexOf(key, 0, Qt::CaseInsensitive);
     if (from < 0)
         return {};
     // A file name may hold semicolons; the one that ends the entry has a blank or nothing behind
     // it.
     QString file = connectionString.sliced(from + key.size());
-    if (const auto end = file.lastIndexOf(QLatin1String("; ")); end >= 0)
+    if (const auto end = file.lastIndexOf("; "_L1); end >= 0)
         file.truncate(end);
-    else if (file.endsWith(QLatin1Char(';')))
+    else if (file.endsWith(u';'))
         file.chop(1);
     return file;
 }

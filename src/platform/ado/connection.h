@@ -1,6 +1,6 @@
 #pragma once
 
-#include "platform/ado/error.h"
+#include "platform/error/error.h"
 
 #include <QString>
 #include <memory>

@@ -1,9 +1,11 @@
 #include "platform/ado/dialect.h"
 
-#include "platform/ado/error.h"
+#include "platform/error/error.h"
 
 #include <QString>
 #include <algorithm>
+
+using namespace Qt::StringLiterals;
 
 namespace ADODB
 {
@@ -75,9 +77,9 @@ QString shapeContent(QStringView s)
         throw makeError(errSyntax);
     const QStringView content = s.sliced(open + 1, close - open - 1);
     const auto from = skipBlanks(content, 0), end = wordEnd(content, from);
-    if (!is(content.sliced(from, end - from), QLatin1String("select")))
+    if (!is(content.sliced(from, end - from), "select"_L1))
         throw makeError(errSyntax);
-    return QLatin1String("select distinct") + content.sliced(end);
+    return "select distinct"_L1 + content.sliced(end);
 }
 
 bool isOneOf(QStringView word, std::initializer_list<const char *> keywords)
@@ -127,7 +129,7 @@ void Dialect::translate(QStringView statement)
     begin(statement);
     const QStringView first = statement.sliced(mAt, wordEnd(statement, mAt) - mAt);
     mLifts = !isOneOf(first, {"create", "alter", "drop"});
-    if (is(first, QLatin1String("shape"))) {
+    if (is(first, "shape"_L1)) {
         translateShape(statement);
         return;
     }
@@ -185,13 +187,13 @@ void Dialect::word(QStringView s)
     const auto end = wordEnd(s, mAt);
     const QStringView w = s.sliced(mAt, end - mAt);
     mAt = end;
-    if (is(w, QLatin1String("left")) && charAt(s, skipBlanks(s, end)) == u'(') {
+    if (is(w, "left"_L1) && charAt(s, skipBlanks(s, end)) == u'(') {
         mSql.append("\"left\"");
         return;
     }
-    if (is(w, QLatin1String("max")) && maxOfSum(s))
+    if (is(w, "max"_L1) && maxOfSum(s))
         return;
-    if (is(w, QLatin1String("like")) && likeText(s, w))
+    if (is(w, "like"_L1) && likeText(s, w))
         return;
     deleteAlias(w);
     mBetween = betweenAfter(mBetween, w);
@@ -205,21 +207,21 @@ void Dialect::word(QStringView s)
 // "between a and b": a condition may begin behind the next "and" only.
 Dialect::Between Dialect::betweenAfter(Between now, QStringView w)
 {
-    if (is(w, QLatin1String("between")))
+    if (is(w, "between"_L1))
         return Between::Lower;
-    if (!is(w, QLatin1String("and")))
-        return is(w, QLatin1String("or")) ? Between::None : now;
+    if (!is(w, "and"_L1))
+        return is(w, "or"_L1) ? Between::None : now;
     return now == Between::Lower ? Between::Upper : Between::None;
 }
 
 void Dialect::afterWord(QStringView s, QStringView w)
 {
-    const bool orders = is(w, QLatin1String("order")) || is(w, QLatin1String("group"));
-    if (orders && nextWordIs(s, mAt, QLatin1String("by"))) {
+    const bool orders = is(w, "order"_L1) || is(w, "group"_L1);
+    if (orders && nextWordIs(s, mAt, "by"_L1)) {
         mOrdinals.back() = true;
-    } else if (is(w, QLatin1String("having")) || is(w, QLatin1String("union"))) {
+    } else if (is(w, "having"_L1) || is(w, "union"_L1)) {
         mOrdinals.back() = false;
-    } else if (is(w, QLatin1String("values"))) {
+    } else if (is(w, "values"_L1)) {
         mValues = Values::Expected;
     }
 }
@@ -251,14 +253,14 @@ void Dialect::deleteAlias(QStringView w)
 {
     switch (mDelete) {
     case Delete::None:
-        mDelete = mSql.empty() && is(w, QLatin1String("delete")) ? Delete::From : Delete::Done;
+        mDelete = mSql.empty() && is(w, "delete"_L1) ? Delete::From : Delete::Done;
         break;
     case Delete::From:
-        if (!is(w, QLatin1String("from")))
+        if (!is(w, "from"_L1))
             mDelete = Delete::Table;
         break;
     case Delete::Table:
-        if (!is(w, QLatin1String("where")) && !is(w, QLatin1String("as")))
+        if (!is(w, "where"_L1) && !is(w, "as"_L1))
             mSql.append("as ");
         mDelete = Delete::Done;
         break;
@@ -309,7 +311,7 @@ void Dialect::keepText(QStringView content, char16_t quote)
         refuse(QString(QChar(quote)));
     QString text = content.toString();
     text.replace(QString(2, QChar(quote)), QString(1, QChar(quote)));
-    text.replace(u'\'', QLatin1String("''"));
+    text.replace(u'\'', "''"_L1);
     mSql.push_back('\'');
     appendUtf8(mSql, text.normalized(QString::NormalizationForm_C));
     mSql.push_back('\'');

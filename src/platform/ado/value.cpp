@@ -1,6 +1,6 @@
 #include "platform/ado/value.h"
 
-#include "platform/ado/error.h"
+#include "platform/error/error.h"
 #include "platform/text/textrules.h"
 
 #include <cmath>

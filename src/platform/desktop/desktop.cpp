@@ -1,10 +1,12 @@
 #include "platform/desktop/desktop.h"
 
+using namespace Qt::StringLiterals;
+
 namespace
 {
 
 Desktop *gDesktop = nullptr;
-QString gBoxTitle = QStringLiteral("Songcase");
+QString gBoxTitle = u"Songcase"_s;
 
 BoxAnswer box(BoxKind kind, BoxButtons buttons, const QString &text, const QString &title)
 {

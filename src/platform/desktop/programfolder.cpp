@@ -4,6 +4,8 @@
 #include <QDir>
 #include <QStandardPaths>
 
+using namespace Qt::StringLiterals;
+
 namespace programfolder
 {
 
@@ -17,7 +19,7 @@ QString find()
     if (const QString told = qEnvironmentVariable("SONGCASE_FOLDER"); !told.isEmpty())
         return QDir::cleanPath(QDir(told).absolutePath());
     const QDir own(QCoreApplication::applicationDirPath());
-    if (!own.entryList({QStringLiteral("Compact*.orv")}, QDir::Files).isEmpty())
+    if (!own.entryList({u"Compact*.orv"_s}, QDir::Files).isEmpty())
         return own.absolutePath();
     return userFolder();
 }

@@ -16,6 +16,8 @@
 #include <QStandardPaths>
 #include <QUrl>
 
+using namespace Qt::StringLiterals;
+
 namespace
 {
 
@@ -217,7 +219,7 @@ bool QtDesktop::openAddress(const QString &url)
 QString QtDesktop::settingsFile()
 {
     return QStandardPaths::writableLocation(QStandardPaths::AppConfigLocation) +
-           QStringLiteral("/settings.json");
+           u"/settings.json"_s;
 }
 
 QString QtDesktop::programFolder()

@@ -2,6 +2,8 @@
 
 #include "platform/text/numeric.h"
 
+using namespace Qt::StringLiterals;
+
 namespace text
 {
 
@@ -66,8 +68,8 @@ QString cutTo(const QString &s, qsizetype length)
 
 QString withLineFeeds(QString s)
 {
-    s.replace(QLatin1String("\r\n"), QLatin1String("\n"));
-    s.replace(QLatin1Char('\r'), QLatin1Char('\n'));
+    s.replace("\r\n"_L1, "\n"_L1);
+    s.replace(u'\r', u'\n');
     return s;
 }
 

@@ -1,7 +1,7 @@
 // Label: unit
 #include "platform/ado/dialect.h"
 #include "platform/ado/recordset.h"
-#include "shell/services/globals.h"
+#include "services/globals.h"
 #include "support/datarows.h"
 #include "support/testcatalogue.h"
 
@@ -265,7 +265,7 @@ private slots:
             QFAIL("no error");
         } catch (const Error &error) {
             QCOMPARE(error.Number, int(errCannotUse));
-            QVERIFY(error.Description.contains(QLatin1String("in use by another program")));
+            QVERIFY(error.Description.contains("in use by another program"_L1));
         }
         QVERIFY(clock.elapsed() < 5000);
         QCOMPARE(other.run("commit"), SQLITE_OK);

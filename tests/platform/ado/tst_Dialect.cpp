@@ -1,6 +1,6 @@
 // Label: unit
 #include "platform/ado/dialect.h"
-#include "platform/ado/error.h"
+#include "platform/error/error.h"
 #include "support/datarows.h"
 #include "support/testcatalogue.h"
 
@@ -17,11 +17,11 @@ QString literalsOf(const Dialect &dialect)
         if (l.kind == Literal::Integer)
             all.append(QString::number(l.integer));
         else if (l.kind == Literal::Real)
-            all.append(QLatin1Char('r') + QString::number(l.real));
+            all.append(u'r' + QString::number(l.real));
         else
-            all.append(QLatin1Char('t') + QString::fromUtf8(bytes.data(), qsizetype(bytes.size())));
+            all.append(u't' + QString::fromUtf8(bytes.data(), qsizetype(bytes.size())));
     }
-    return all.join(QLatin1Char('|'));
+    return all.join(u'|');
 }
 
 } // namespace

@@ -1,7 +1,7 @@
 // Label: unit
 #include "platform/ado/ordertail.h"
 #include "platform/ado/recordset.h"
-#include "shell/services/globals.h"
+#include "services/globals.h"
 #include "support/testcatalogue.h"
 
 #include <QTest>

@@ -1,7 +1,7 @@
 // Label: unit
 #include "platform/ado/recordset.h"
 #include "platform/text/collation.h"
-#include "shell/services/globals.h"
+#include "services/globals.h"
 #include "support/datarows.h"
 #include "support/testcatalogue.h"
 
@@ -60,8 +60,7 @@ private slots:
     {
         TestCatalogue catalogue;
         const auto plan = [&](const char *statement) {
-            return catalogue.rows(QLatin1String("explain query plan ") + QLatin1String(statement))
-                .join(QLatin1Char('\n'));
+            return catalogue.rows("explain query plan "_L1 + QLatin1String(statement)).join(u'\n');
         };
         // The look-ups that run once per row of an import, and the three of the clean-up.
         for (const char *statement :
@@ -75,7 +74,7 @@ private slots:
               "select '1' from Tracks where Artiest_ID = 1",
               "select '1' from CDtitels where Artiest_ID = 1",
               "delete from mp3files where collectionid = 1"})
-            QVERIFY2(!plan(statement).contains(QLatin1String("SCAN")), qPrintable(plan(statement)));
+            QVERIFY2(!plan(statement).contains("SCAN"_L1), qPrintable(plan(statement)));
     }
 
     void extensionForOtherPrograms()

@@ -194,8 +194,8 @@ private slots:
         form.cancel.setEnabled(enabled);
         form.Show();
         QWidget *at = &form.text;
-        if (focus != QLatin1String("text"))
-            at = focus == QLatin1String("ok") ? &form.ok : &form.other;
+        if (focus != "text"_L1)
+            at = focus == "ok"_L1 ? &form.ok : &form.other;
         at->setFocus();
         TestForm::log.clear();
         QTest::keyClick(at, Qt::Key(key));

@@ -5,6 +5,8 @@
 #include <QTemporaryDir>
 #include <QtTest>
 
+using namespace Qt::StringLiterals;
+
 /// Where a program looks for its catalogue goes by where it lies itself, so each case runs a copy
 /// of this test in a folder of its own, which only tells what it has found.
 class tst_ProgramFolder : public QObject
@@ -41,19 +43,18 @@ private slots:
         QFETCH(const QString, found);
         const QTemporaryDir folder;
         const QString root = QFileInfo(folder.path()).canonicalFilePath() + u'/';
-        QVERIFY(QDir(root).mkpath(QStringLiteral("bin")));
-        const QString program = root + QStringLiteral("bin/program");
+        QVERIFY(QDir(root).mkpath(u"bin"_s));
+        const QString program = root + u"bin/program"_s;
         QVERIFY(QFile::copy(QCoreApplication::applicationFilePath(), program));
         if (!catalogue.isEmpty())
             QVERIFY(QFile(root + catalogue).open(QIODevice::WriteOnly));
 
         QProcess run;
         auto environment = QProcessEnvironment::systemEnvironment();
-        environment.insert(QStringLiteral("XDG_DATA_HOME"), root + QStringLiteral("data"));
-        environment.insert(QStringLiteral("SONGCASE_FOLDER"),
-                           told.isEmpty() ? QString() : QString(root + told));
+        environment.insert(u"XDG_DATA_HOME"_s, root + u"data"_s);
+        environment.insert(u"SONGCASE_FOLDER"_s, told.isEmpty() ? QString() : QString(root + told));
         run.setProcessEnvironment(environment);
-        run.start(program, {QStringLiteral("tell")});
+        run.start(program, {u"tell"_s});
         QVERIFY(run.waitForFinished());
         QCOMPARE(QString::fromUtf8(run.readAllStandardOutput()), QString(root + found));
     }
@@ -62,8 +63,8 @@ private slots:
 int main(int argc, char **argv)
 {
     QCoreApplication application(argc, argv);
-    QCoreApplication::setApplicationName(QStringLiteral("songcase"));
-    if (application.arguments().value(1) == QLatin1String("tell")) {
+    QCoreApplication::setApplicationName(u"songcase"_s);
+    if (application.arguments().value(1) == "tell"_L1) {
         QTextStream(stdout) << programfolder::find();
         return 0;
     }

@@ -1,3 +1,0 @@
-#include "controls/Disk.h"
-
-Disk::Disk(QWidget *parent) : TrackGrid(Columns::WithArtist, parent) {}

@@ -1,3 +1,0 @@
-#include "controls/DiskE.h"
-
-DiskE::DiskE(QWidget *parent) : TrackGrid(Columns::WithoutArtist, parent) {}

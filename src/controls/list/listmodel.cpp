@@ -1,0 +1,202 @@
+#include "controls/list/listmodel.h"
+
+#include <QFont>
+
+namespace
+{
+
+constexpr int sortedByOldTexts = -2;
+
+bool asciiEqual(char a, char16_t b)
+{
+    const auto small = [](char16_t c) { return c >= 'A' && c <= 'Z' ? char16_t(c | 0x20) : c; };
+    return small(char16_t(a)) == small(b);
+}
+
+} // namespace
+
+void ListModel::fill(std::shared_ptr<const ADODB::Rows> rows)
+{
+    beginResetModel();
+    ++mFilling;
+    mRows = std::move(rows);
+    mCaptions.clear();
+    if (mRows) {
+        for (const ADODB::FieldInfo &field : mRows->fields())
+            mCaptions.append(field.name);
+    }
+    mOrder = {};
+    mRowOf = {};
+    mSortedBy = -1;
+    mWritten.clear();
+    mMarks.clear();
+    endResetModel();
+}
+
+QString ListModel::text(int record, int column) const
+{
+    if (const auto written = mWritten.constFind(column); written != mWritten.constEnd()) {
+        if (const auto text = written->constFind(record); text != written->constEnd())
+            return *text;
+    }
+    return mRows->text(record, column);
+}
+
+void ListModel::write(int record, int column, const QString &text)
+{
+    mWritten[column].insert(record, text);
+    if (column == mSortedBy)
+        mSortedBy = sortedByOldTexts;
+    rowChanged(record);
+}
+
+void ListModel::setMarks(int record, const Marks &marks)
+{
+    mMarks.insert(record, marks);
+    rowChanged(record);
+}
+
+bool ListModel::startsWith(int record, int column, const QString &start) const
+{
+    // Most cells are told apart by their first byte, without making a text of them.
+    const char16_t first = start.front().unicode();
+    if (mRows->kind(record, column) == ADODB::Rows::Kind::Text && !mWritten.contains(column)) {
+        const auto bytes = mRows->utf8(record, column);
+        if (bytes.empty() || (!(bytes[0] & 0x80) && !asciiEqual(bytes[0], first)))
+            return false;
+    }
+    return text(record, column).startsWith(start, Qt::CaseInsensitive);
+}
+
+// Goes by records, since these lie in memory one behind the other: in the order of a sorted list a
+// million rows would take a second.
+int ListModel::findStart(int column, const QString &start, int fromRow) const
+{
+    const int rows = rowCount();
+    int nearest = rows;
+    for (int record = 0; record < rows && nearest > 0; ++record) {
+        const int distance = (rowOf(record) - fromRow + rows) % rows;
+        if (distance < nearest && startsWith(record, column, start))
+            nearest = distance;
+    }
+    return nearest < rows ? (fromRow + nearest) % rows : -1;
+}
+
+void ListModel::sortBy(int column)
+{
+    if (hasOrderOf(column))
+        return;
+    setOrder(column < 0 ? std::vector<std::uint32_t>()
+                        : sortedRows(*mRows, column, mWritten.value(column)));
+    mSortedBy = column;
+}
+
+void ListModel::setOrder(std::vector<std::uint32_t> order)
+{
+    emit layoutAboutToBeChanged({}, VerticalSortHint);
+    const QModelIndexList before = persistentIndexList();
+    std::vector<int> records;
+    for (const QModelIndex &index : before)
+        records.push_back(recordAt(index.row()));
+    mOrder = std::move(order);
+    mRowOf.resize(mOrder.size());
+    for (std::size_t row = 0; row < mOrder.size(); ++row)
+        mRowOf[mOrder[row]] = std::uint32_t(row);
+    QModelIndexList after;
+    for (qsizetype i = 0; i < before.size(); ++i)
+        after.append(index(rowOf(records[std::size_t(i)]), before[i].column()));
+    changePersistentIndexList(before, after);
+    emit layoutChanged({}, VerticalSortHint);
+}
+
+void ListModel::setCheckColumn(int column)
+{
+    if (column == mCheckColumn)
+        return;
+    mCheckColumn = column;
+    if (rowCount() > 0)
+        emit dataChanged(index(0, 0), index(rowCount() - 1, columnCount() - 1),
+                         {Qt::CheckStateRole});
+}
+
+void ListModel::rowChanged(int record)
+{
+    const int row = rowOf(record);
+    emit dataChanged(index(row, 0), index(row, columnCount() - 1));
+}
+
+int ListModel::rowCount(const QModelIndex &parent) const
+{
+    return parent.isValid() || !mRows ? 0 : int(mRows->rowCount());
+}
+
+int ListModel::columnCount(const QModelIndex &parent) const
+{
+    return parent.isValid() ? 0 : int(mCaptions.size());
+}
+
+QVariant ListModel::data(const QModelIndex &index, int role) const
+{
+    if (!checkIndex(index, CheckIndexOption::IndexIsValid))
+        return {};
+    const int record = recordAt(index.row());
+    switch (role) {
+    case Qt::DisplayRole:
+        return text(record, index.column());
+    case Qt::FontRole:
+        if (marks(record).bold) {
+            QFont font;
+            font.setBold(true);
+            return font;
+        }
+        return {};
+    case Qt::ForegroundRole: {
+        const QColor color = marks(record).color;
+        return color.isValid() ? QVariant(color) : QVariant();
+    }
+    case Qt::CheckStateRole:
+        if (index.column() == mCheckColumn)
+            return marks(record).checked ? Qt::Checked : Qt::Unchecked;
+        return {};
+    default:
+        return {};
+    }
+}
+
+bool ListModel::setData(const QModelIndex &index, const QVariant &value, int role)
+{
+    if (!index.isValid() || role != Qt::CheckStateRole || index.column() != mCheckColumn)
+        return false;
+    const int record = recordAt(index.row());
+    Marks changed = marks(record);
+    changed.checked = value.toInt() == Qt::Checked;
+    setMarks(record, changed);
+    emit checkToggled(record);
+    return true;
+}
+
+QVariant ListModel::headerData(int section, Qt::Orientation orientation, int role) const
+{
+    if (orientation == Qt::Horizontal && role == Qt::DisplayRole)
+        return mCaptions.value(section);
+    return {};
+}
+
+bool ListModel::setHeaderData(int section, Qt::Orientation orientation, const QVariant &value,
+                              int role)
+{
+    if (orientation != Qt::Horizontal || role != Qt::EditRole || section < 0 ||
+        section >= mCaptions.size())
+        return false;
+    mCaptions[section] = value.toString();
+    emit headerDataChanged(orientation, section, section);
+    return true;
+}
+
+Qt::ItemFlags ListModel::flags(const QModelIndex &index) const
+{
+    if (!index.isValid())
+        return {};
+    const Qt::ItemFlags usual = Qt::ItemIsEnabled | Qt::ItemIsSelectable | Qt::ItemNeverHasChildren;
+    return index.column() == mCheckColumn ? usual | Qt::ItemIsUserCheckable : usual;
+}

@@ -1,0 +1,3 @@
+#include "controls/tracks/DiskE.h"
+
+DiskE::DiskE(QWidget *parent) : TrackGrid(Columns::WithoutArtist, parent) {}

@@ -1,0 +1,41 @@
+#include "controls/tracks/trackdelegate.h"
+
+#include <QEvent>
+
+TrackDelegate::TrackDelegate(Describe describe, QObject *parent)
+    : RowDelegate(parent), mDescribe(std::move(describe))
+{
+}
+
+QWidget *TrackDelegate::createEditor(QWidget *parent, const QStyleOptionViewItem &,
+                                     const QModelIndex &index) const
+{
+    const Cell cell = mDescribe(index);
+    mEdit = new CellEdit(cell.name, parent);
+    mEdit->setSuggestions(cell.suggestions);
+    if (!cell.list.isEmpty())
+        mEdit->setList(cell.list, cell.listName);
+    connect(mEdit, &CellEdit::cancelled, this, &TrackDelegate::cancelled);
+    connect(mEdit, &CellEdit::gridKey, this, &TrackDelegate::gridKey);
+    return mEdit;
+}
+
+void TrackDelegate::destroyEditor(QWidget *editor, const QModelIndex &index) const
+{
+    if (editor == mEdit)
+        mEdit.clear();
+    RowDelegate::destroyEditor(editor, index);
+}
+
+// The field takes its keys itself: which of them end the edit depends on its list of suggestions.
+bool TrackDelegate::eventFilter(QObject *editor, QEvent *event)
+{
+    return event->type() != QEvent::KeyPress && RowDelegate::eventFilter(editor, event);
+}
+
+void TrackDelegate::initStyleOption(QStyleOptionViewItem *option, const QModelIndex &index) const
+{
+    QStyledItemDelegate::initStyleOption(option, index); // the focus is shown on its cell
+    if (index.column() == 0)
+        option->palette.setBrush(QPalette::Text, option->palette.placeholderText());
+}

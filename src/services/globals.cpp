@@ -1,0 +1,16 @@
+#include "services/globals.h"
+
+#include "platform/ado/recordset.h"
+#include "services/messages.h"
+
+std::unique_ptr<ADODB::Connection> gConnection;
+QString gDatabasePath;
+int gLanguage = languageEnglish;
+
+bool gUseProxy = false;
+QString gProxyServer, gProxyPassword, gProxyUserName, gProxyServerPort;
+
+QString gImportFile;
+bool gImportCompilationNested = false, gImportCompilationFlat = false;
+bool gImportAlbumNested = false, gImportAlbumFlat = false;
+std::shared_ptr<ADODB::Recordset> gImportRecords;
