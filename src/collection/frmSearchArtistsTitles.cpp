@@ -6,6 +6,7 @@
 #include "collection/ui_frmSearchArtistsTitles.h"
 #include "controls/list/DBListViewCTL.h"
 #include "platform/desktop/desktop.h"
+#include "platform/desktop/options.h"
 #include "platform/desktop/throttledpump.h"
 #include "services/captions.h"
 #include "services/fileutilities.h"
@@ -91,8 +92,7 @@ void frmSearchArtistsTitles::connectControls()
 // The columns are there from the start.
 void frmSearchArtistsTitles::Form_Load()
 {
-    for (QRadioButton *mode : {mUi->optFullWord, mUi->optPartWord}) // the last one is the tab stop
-        mode->setChecked(true);
+    chooseOption(mUi->optPartWord);
     for (QLineEdit *year : {mUi->txtHitjaarvan, mUi->txtHitjaartm})
         year->setMinimumWidth(year->fontMetrics().horizontalAdvance(u'0') * 7);
     showNothing();

@@ -1,5 +1,6 @@
 #include "reports/frmPageSetup.h"
 
+#include "platform/desktop/options.h"
 #include "reports/reportpaper.h"
 #include "reports/ui_frmPageSetup.h"
 #include "services/captions.h"
@@ -81,7 +82,7 @@ void frmPageSetup::showPaper(const QPageLayout &paper)
 {
     const QMargins margins = paper.margins(QPageLayout::Millimeter).toMargins();
     mUi->Paper->setCurrentIndex(mUi->Paper->findData(paper.pageSize().id()));
-    mUi->Landscape->setChecked(paper.orientation() == QPageLayout::Landscape);
+    chooseOption(paper.orientation() == QPageLayout::Landscape ? mUi->Landscape : mUi->Portrait);
     mUi->MarginLeft->setValue(margins.left());
     mUi->MarginTop->setValue(margins.top());
     mUi->MarginRight->setValue(margins.right());

@@ -2,14 +2,17 @@
 #include "collection/frmCDList.h"
 #include "collection/frmCDRoot.h"
 #include "collection/frmCDRootE.h"
+#include "collection/frmSearchArtistsTitles.h"
 #include "platform/ado/connection.h"
 #include "reports/frmPageSetup.h"
 #include "reports/reportpaper.h"
 #include "reports/reports.h"
+#include "reports/reportview.h"
 #include "services/globals.h"
 #include "services/messages.h"
 #include "shell/frmHelp.h"
 #include "shell/frmSplash.h"
+#include "support/datarows.h"
 #include "support/scripteddesktop.h"
 #include "support/testcatalogue.h"
 #include "textimport/frmImport.h"
@@ -19,12 +22,18 @@
 
 #include <QAbstractButton>
 #include <QAbstractItemView>
+#include <QAbstractSpinBox>
+#include <QComboBox>
 #include <QLabel>
 #include <QLineEdit>
 #include <QProgressBar>
+#include <QPushButton>
+#include <QRadioButton>
 #include <QStyle>
+#include <QTabWidget>
 #include <QTest>
 #include <QTimer>
+#include <QToolBar>
 #include <functional>
 
 namespace
@@ -46,6 +55,37 @@ template <typename Editor> Make makeEditor()
     };
 }
 
+// Of a record of theCatalogue(): by design nobody leaves the empty year of a new one by Tab.
+template <typename Editor> Make makeEditorOf(qint64 id)
+{
+    return [id] {
+        auto *editor = new Editor;
+        editor->Mode = u"U"_s;
+        editor->CdId = id;
+        return editor;
+    };
+}
+
+// The browser on one of its pages.
+Make makeBrowser(int page)
+{
+    return [page] {
+        auto *browser = new frmCDList;
+        browser->Load();
+        browser->findChild<QTabWidget *>(u"CDTab"_s)->setCurrentIndex(page);
+        return browser;
+    };
+}
+
+// With all that was found, so that nothing is disabled.
+Form *makeSearch()
+{
+    auto *search = new frmSearchArtistsTitles;
+    search->Show();
+    search->findChild<QPushButton *>(u"cmdSearch"_s)->click();
+    return search;
+}
+
 // With the rows that its command gives.
 template <typename PrintedReport> Make makeReport()
 {
@@ -57,11 +97,21 @@ template <typename PrintedReport> Make makeReport()
     };
 }
 
-Form *makePageSetup()
+Form *makePageSetupOf(const QPageLayout &paper)
 {
     const auto rows = gConnection->Execute(AlbumReport::command());
     const auto content = std::make_shared<ReportContent>(rows, AlbumReport::caption(), QDate());
-    return new frmPageSetup(content, reportpaper::stored());
+    return new frmPageSetup(content, paper);
+}
+
+Form *makePageSetup()
+{
+    return makePageSetupOf(reportpaper::stored());
+}
+
+Form *makeLandscapeSetup()
+{
+    return makePageSetupOf(reportpaper::layout(QPageSize::A4, QPageLayout::Landscape, QMargins()));
 }
 
 QString textOf(const QWidget *w)
@@ -94,9 +144,45 @@ bool isCut(const QWidget *w)
     return w->sizeHint().width() > w->width() || w->sizeHint().height() > w->height();
 }
 
+bool takesInput(const QWidget *w)
+{
+    const auto *label = qobject_cast<const QLabel *>(w);
+    return needsName(w) || qobject_cast<const QComboBox *>(w) ||
+           qobject_cast<const QAbstractSpinBox *>(w) || qobject_cast<const QTabBar *>(w) ||
+           qobject_cast<const ReportView *>(w) ||
+           (label && label->textInteractionFlags() & Qt::LinksAccessibleByKeyboard);
+}
+
+// The keys of a toolbar go to the grid, so its buttons take no focus, and arrows walk the buttons
+// of a group; what shows a percentage takes nothing.
 bool isPartOfAnother(const QWidget *w)
 {
     return w->objectName().isEmpty() || w->objectName().startsWith("qt_"_L1);
+}
+
+bool isTabStop(const QWidget *w)
+{
+    const auto *radio = qobject_cast<const QRadioButton *>(w);
+    const QWidget *parent = w->parentWidget();
+    return takesInput(w) && w->isVisible() && w->isEnabled() && !w->focusProxy() &&
+           !isPartOfAnother(w) && !(radio && !radio->isChecked()) &&
+           !qobject_cast<const QProgressBar *>(w) && !qobject_cast<const QToolBar *>(parent);
+}
+
+QString missedBy(Qt::Key key, Form *screen)
+{
+    QSet<const QWidget *> reached;
+    constexpr int enough = 100;
+    for (int i = 0; i < enough && QApplication::focusWidget(); ++i) {
+        reached.insert(QApplication::focusWidget());
+        QTest::keyClick(QApplication::focusWidget(), key);
+    }
+    QStringList missed;
+    for (const QWidget *w : screen->findChildren<QWidget *>()) {
+        if (isTabStop(w) && !reached.contains(w))
+            missed.append(w->objectName());
+    }
+    return missed.join(u' ');
 }
 
 } // namespace
@@ -118,6 +204,7 @@ private slots:
             {"frmCDList", make<frmCDList>()},
             {"frmCDRoot", makeEditor<frmCDRoot>()},
             {"frmCDRootE", makeEditor<frmCDRootE>()},
+            {"frmSearchArtistsTitles", make<frmSearchArtistsTitles>()},
             {"frmImportWizard", make<frmImportWizard>()},
             {"frmImportBusy", make<frmImportBusy>()},
             {"frmImport", make<frmImport>()},
@@ -157,6 +244,44 @@ private slots:
                      QByteArray(name).append(": no name for a screen reader"));
             QVERIFY2(!isCut(w), QByteArray(name).append(": text cut: ").append(text.toUtf8()));
         }
+        screen->Unload();
+        QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+    }
+
+    // Each control is reached by Tab, and by Shift+Tab. By design the last track of an editor
+    // leads to the first field: what stands below is reached from there, by Shift+Tab.
+    void tabWalksAround_data()
+    {
+        const DataRows<Make, QString> row("make", "by Shift+Tab alone");
+        row("frmHelp", make<frmHelp>(), "");
+        for (int page = 0; page < 4; ++page)
+            row("frmCDList, page " + QByteArray::number(page), makeBrowser(page), "");
+        row("frmCDRoot", makeEditorOf<frmCDRoot>(1), "DiscsTab cmdCancel");
+        row("frmCDRootE", makeEditorOf<frmCDRootE>(2), "DiscsTab cmdCancel");
+        row("frmSearchArtistsTitles", makeSearch, "");
+        row("frmImportWizard", make<frmImportWizard>(), "");
+        row("frmImport", make<frmImport>(), "");
+        row("AlbumReport", makeReport<AlbumReport>(), "");
+        row("frmPageSetup", makePageSetup, "");
+        row("frmPageSetup, landscape", makeLandscapeSetup, "");
+    }
+
+    void tabWalksAround()
+    {
+        QFETCH(Make, make);
+        ScriptedDesktop desktop;
+        TestCatalogue catalogue;
+        catalogue.exec(uR"(insert into Artiesten values (1,'Zed');
+            insert into Tracks values (1,1,'One',null,null);
+            insert into CDTitels values (1,'Best',null,'V',null,1990),(2,'Zebra',1,'E',null,1990);
+            insert into CompactDiscs values (1,1,1,1,1,null),(2,2,1,1,1,null),(3,1,2,1,1,null);
+            insert into MP3Collections values (1,'/b','Second');)"_s);
+        Form *screen = make();
+        screen->Show();
+        screen->activateWindow();
+        QVERIFY(QTest::qWaitForWindowActive(screen));
+        QTEST(missedBy(Qt::Key_Tab, screen), "by Shift+Tab alone");
+        QCOMPARE(missedBy(Qt::Key_Backtab, screen), QString());
         screen->Unload();
         QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
     }
