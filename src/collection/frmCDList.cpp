@@ -7,6 +7,7 @@
 #include "collection/recordnodes.h"
 #include "collection/ui_frmCDList.h"
 #include "controls/list/DBListViewCTL.h"
+#include "controls/list/listcolumns.h"
 #include "platform/desktop/desktop.h"
 #include "platform/text/textrules.h"
 #include "reports/reports.h"
@@ -15,14 +16,11 @@
 #include "services/globals.h"
 #include "services/messages.h"
 
-#include <QHeaderView>
-
 using namespace Qt::StringLiterals;
 
 namespace
 {
 
-constexpr int idColumn = 1;     // columns are counted from 1
 constexpr int firstSortKey = 1; // sort keys from 0: the first column that shows
 constexpr int keyEnter = 13, keyInsert = 45, keyDelete = 46;
 
@@ -53,16 +51,19 @@ template <typename PrintedReport> void startReport()
 frmCDList::frmCDList() : Form(u"frmCDList"_s), mUi(std::make_unique<Ui::frmCDList>())
 {
     mUi->setupUi(this);
-    mPages = {
-        ListPage{
-            Compilations, mUi->ColList, browserlists::compilations, {"Titel"}, "NumCompCol", {}},
-        ListPage{Albums, mUi->SngList, browserlists::albums, {"Artiest", "Titel"}, "NumAlbCol", {}},
-        ListPage{MP3Collections,
-                 mUi->MP3List,
-                 browserlists::mp3Collections,
-                 {"Map", "Titel"},
-                 "NumMP3Coll",
-                 {}}};
+    // Id is hidden; a dragged width is kept over a reload.
+    const auto columns = [](DBListViewCTL *list, std::initializer_list<const char *> captions) {
+        std::vector<ListColumn> all{{ListColumn::Hidden}};
+        for (const char *caption : captions)
+            all.push_back({ListColumn::Text, caption, 1});
+        return new ListColumns(list, std::move(all));
+    };
+    mPages = {ListPage{Compilations, mUi->ColList, browserlists::compilations,
+                       columns(mUi->ColList, {"Titel"}), "NumCompCol"},
+              ListPage{Albums, mUi->SngList, browserlists::albums,
+                       columns(mUi->SngList, {"Artiest", "Titel"}), "NumAlbCol"},
+              ListPage{MP3Collections, mUi->MP3List, browserlists::mp3Collections,
+                       columns(mUi->MP3List, {"Map", "Titel"}), "NumMP3Coll"}};
     setCancelButton(mUi->cmdCancel);
     setCaptions();
     connectControls();
@@ -125,21 +126,10 @@ void frmCDList::Form_Load()
     for (ListPage &page : mPages)
         page.index = 1;
     mColFocusDone = false;
-    setFirstWidths();
     LoadLists();
     setTabStops();
     showPage();
     mLoading = false;
-}
-
-// Id is hidden. The last column takes what the others leave free.
-void frmCDList::setFirstWidths()
-{
-    const int half = (width() - 60) / 2;
-    mPages[0].widths = {0, half};
-    mPages[1].widths = mPages[2].widths = {0, half, half / 2};
-    for (ListPage &page : mPages)
-        page.list->horizontalHeader()->setStretchLastSection(true);
 }
 
 void frmCDList::RefreshLists()
@@ -153,7 +143,6 @@ void frmCDList::LoadLists()
     try {
         if (!gConnection)
             throw makeError(errObjectClosed);
-        SaveColumnWidths();
         loadPage(mPages[0]);
         loadPage(mPages[1]);
         mTrackCount = browserlists::trackCount();
@@ -171,30 +160,13 @@ void frmCDList::loadPage(ListPage &page)
 {
     DBListViewCTL &list = *page.list;
     const auto rows = page.read();
-    list.setRecordset(rows);
-    list.Populate();
-    auto headers = list.ColumnHeaders();
-    for (int i = 0; i < int(page.widths.size()); ++i)
-        headers.Item(i + idColumn).setWidth(page.widths[std::size_t(i)]);
-    for (int i = 0; i < int(page.headers.size()); ++i)
-        headers.Item(i + idColumn + 1).setText(GetMessage(page.headers[std::size_t(i)]));
-    list.setSorted(true);
-    list.setSortKey(firstSortKey);
+    page.columns->show(rows);
+    list.sortBy(firstSortKey);
     page.count = rows->RecordCount();
     list.setEnabled(page.count != 0);
     rows->Close();
     if (page.index > 1)
         RestoreSelection(page);
-}
-
-void frmCDList::SaveColumnWidths()
-{
-    if (mLoading)
-        return;
-    for (ListPage &page : mPages) {
-        for (int i = 0; i < int(page.widths.size()); ++i)
-            page.widths[std::size_t(i)] = page.list->ColumnHeaders().Item(i + idColumn).Width();
-    }
 }
 
 frmCDList::ListPage *frmCDList::current()
@@ -293,8 +265,7 @@ void frmCDList::list_KeyDown(int keyCode, int shift)
 // ColList has one column that shows: it is sorted on that one whichever was clicked.
 void frmCDList::list_ColumnClick(ListPage &page, int column)
 {
-    page.list->setSorted(true);
-    page.list->setSortKey(page.page == Compilations ? firstSortKey : column - 1);
+    page.list->sortBy(page.page == Compilations ? firstSortKey : column - 1);
 }
 
 void frmCDList::FillArtistNode(RecordTree &TheTree, const QString &TheKey)

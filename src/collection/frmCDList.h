@@ -9,6 +9,7 @@
 #include <vector>
 
 class DBListViewCTL;
+class ListColumns;
 class ListItem;
 class RecordTree;
 namespace Ui
@@ -47,9 +48,8 @@ private:
         PageIndex page;
         DBListViewCTL *list;
         ADODB::RecordsetPtr (*read)();
-        std::vector<const char *> headers; // keys of the columns behind Id
+        ListColumns *columns;
         const char *countKey;
-        std::vector<int> widths; // kept over a reload
         qsizetype count = 0;
         int index = 1; // of the remembered row, from 1
     };
@@ -57,10 +57,8 @@ private:
     void connectControls();
     void connectList(ListPage &page);
     void setCaptions();
-    void setFirstWidths();
     void LoadLists();
     void loadPage(ListPage &page);
-    void SaveColumnWidths();
     void CDTab_Click();
     void showPage();
     void setTabStops();

@@ -5,6 +5,7 @@
 #include "collection/resultlines.h"
 #include "collection/ui_frmSearchArtistsTitles.h"
 #include "controls/list/DBListViewCTL.h"
+#include "controls/list/listcolumns.h"
 #include "platform/desktop/desktop.h"
 #include "platform/desktop/options.h"
 #include "platform/desktop/throttledpump.h"
@@ -25,12 +26,13 @@ namespace
 /// The columns of the result, in the order of the statement's fields.
 enum Column { Artist, Title, DiscNumber, TrackNumber, CdTitle, Genre, HitYear, Type, columnCount };
 
-struct {
-    const char *head; // key
-    int share;        // of the list's width, in thirteenths
-} const columns[columnCount] = {{"Artiest", 3},  {"Titel", 3}, {"Disc", 1},    {"Track", 1},
-                                {"CD-Titel", 2}, {"Genre", 1}, {"HitYear", 1}, {"Type", 1}};
-constexpr int shares = 13;
+// Widths as thirteenths of the list's width, whatever was dragged before a search.
+const std::vector<ListColumn> columns = {
+    {ListColumn::Text, "Artiest", 3},   {ListColumn::Text, "Titel", 3},
+    {ListColumn::Number, "Disc", 1},    {ListColumn::Number, "Track", 1},
+    {ListColumn::Text, "CD-Titel", 2},  {ListColumn::Text, "Genre", 1},
+    {ListColumn::Number, "HitYear", 1}, {ListColumn::Text, "Type", 1}};
+constexpr int whole = 13;
 constexpr int largeResult = 200'000; // rows
 
 QStringList textsOf(const ListItem &item)
@@ -47,6 +49,7 @@ frmSearchArtistsTitles::frmSearchArtistsTitles()
     : Form(u"frmSearchArtistsTitles"_s), mUi(std::make_unique<Ui::frmSearchArtistsTitles>())
 {
     mUi->setupUi(this);
+    mColumns = new ListColumns(mUi->ResultList, columns, whole, ListColumns::Dragged::Lost);
     setCaptions();
     connectControls();
     setDefaultButton(mUi->cmdSearch);
@@ -86,7 +89,6 @@ void frmSearchArtistsTitles::connectControls()
             &frmSearchArtistsTitles::ResultList_ColumnClick);
     connect(list, &DBListViewCTL::DblClick, this, &frmSearchArtistsTitles::ResultList_Enter);
     list->installEventFilter(this);
-    list->viewport()->installEventFilter(this);
 }
 
 // The columns are there from the start.
@@ -100,15 +102,9 @@ void frmSearchArtistsTitles::Form_Load()
 
 void frmSearchArtistsTitles::showNothing()
 {
-    auto empty = std::make_shared<ADODB::Recordset>();
-    for (const auto &column : columns)
-        empty->appendField(QLatin1String(column.head), ADODB::adVarWChar);
-    empty->Open();
-    mUi->ResultList->setRecordset(empty);
-    mUi->ResultList->Populate();
+    mColumns->showNone();
     mUi->ResultList->setEnabled(false);
     mUi->cmdExport->setEnabled(false);
-    setColumns();
 }
 
 void frmSearchArtistsTitles::cmdSearch_Click()
@@ -176,41 +172,15 @@ void frmSearchArtistsTitles::show(const SearchKey &key)
         showNothing(); // makes room for as many
     const auto found = std::make_shared<ADODB::Recordset>();
     found->Open(searchStatement(key), *gConnection);
-    mUi->ResultList->setRecordset(found);
-    mUi->ResultList->Populate();
-    setColumns();
+    mColumns->show(found);
     showFound(found->RecordCount());
     found->Close();
     releaseFrame();
 }
 
-void frmSearchArtistsTitles::setColumns()
-{
-    auto headers = mUi->ResultList->ColumnHeaders();
-    for (int column = 0; column < columnCount; ++column)
-        headers.Item(column + 1).setText(GetMessage(columns[column].head));
-    setColumnWidths();
-}
-
-void frmSearchArtistsTitles::setColumnWidths()
-{
-    auto headers = mUi->ResultList->ColumnHeaders();
-    const int room = mUi->ResultList->viewport()->width();
-    int used = 0, from = 0;
-    for (int column = 0; column < headers.Count(); ++column) {
-        used += columns[column].share;
-        const int to = room * used / shares;
-        headers.Item(column + 1).setWidth(to - from);
-        from = to;
-    }
-}
-
-// Columns go with the size of the form, and with a scroll bar that comes or goes. Enter on a row is
-// the row's: the list passes it on, and the form would search.
+// Enter on a row is the row's: the list passes it on, and the form would search.
 bool frmSearchArtistsTitles::eventFilter(QObject *watched, QEvent *event)
 {
-    if (watched != mUi->ResultList && event->type() == QEvent::Resize)
-        setColumnWidths();
     if (watched == mUi->ResultList && event->type() == QEvent::KeyPress) {
         const auto *key = static_cast<QKeyEvent *>(event);
         if (key->key() == Qt::Key_Return || key->key() == Qt::Key_Enter) {
@@ -235,8 +205,7 @@ void frmSearchArtistsTitles::showFound(qsizetype count)
 
 void frmSearchArtistsTitles::ResultList_ColumnClick(int column)
 {
-    mUi->ResultList->setSorted(true);
-    mUi->ResultList->setSortKey(column - 1);
+    mUi->ResultList->sortBy(column - 1);
 }
 
 void frmSearchArtistsTitles::ResultList_Enter()

@@ -5,6 +5,7 @@
 
 #include <memory>
 
+class ListColumns;
 class ListItem;
 class QLineEdit;
 namespace Ui
@@ -42,8 +43,6 @@ private:
     void refuse(const char *message, QLineEdit *field);
     void show(const SearchKey &key);
     void showNothing();
-    void setColumns();
-    void setColumnWidths();
     void showFound(qsizetype count);
     void openDisc(const ListItem &item);
 
@@ -52,6 +51,7 @@ private:
     void showProgress(int percent);
 
     std::unique_ptr<Ui::frmSearchArtistsTitles> mUi;
+    ListColumns *mColumns;
     bool mExporting = false;
     bool mCancelled = false;
 };

@@ -1,5 +1,7 @@
 #include "textimport/frmImport.h"
 
+#include "controls/list/DBListViewCTL.h"
+#include "controls/list/listcolumns.h"
 #include "services/captions.h"
 #include "services/frame.h"
 #include "services/globals.h"
@@ -8,28 +10,18 @@
 #include "textimport/importrecords.h"
 #include "textimport/ui_frmImport.h"
 
-#include <QStyle>
-
 using namespace Qt::StringLiterals;
 
 namespace
 {
 
-// The columns, in the order of importfield: the key of the head, and the share of the width that is
-// left when those with a share of 0 have got what their heads and numbers need.
-struct Column {
-    const char *key;
-    int percent;
-};
-constexpr Column columns[] = {{"No", 0},     {"Artiest", 29}, {"Titel", 34},
-                              {"Genre", 14}, {"HitYear", 0},  {"CD-Titel", 23},
-                              {"CD-nr", 0},  {"Disknr", 0},   {"Track", 0}};
-
-int neededWidth(const Column &column, const QFontMetrics &metrics)
-{
-    const int head = metrics.horizontalAdvance(GetMessage(column.key) + u"mm"_s);
-    return qMax(head, metrics.horizontalAdvance(u"000000"_s));
-}
+// In the order of importfield.
+const std::vector<ListColumn> columns = {
+    {ListColumn::Number, "No"},      {ListColumn::Text, "Artiest", 29},
+    {ListColumn::Text, "Titel", 34}, {ListColumn::Text, "Genre", 14},
+    {ListColumn::Number, "HitYear"}, {ListColumn::Text, "CD-Titel", 23},
+    {ListColumn::Number, "CD-nr"},   {ListColumn::Number, "Disknr"},
+    {ListColumn::Number, "Track"}};
 
 } // namespace
 
@@ -58,36 +50,8 @@ void frmImport::fillList()
 {
     if (!gImportRecords)
         gImportRecords = newImportRecords();
-    mUi->ImportListView->setRecordset(gImportRecords);
-    mUi->ImportListView->Populate();
-    int index = 0;
-    for (const Column &column : columns)
-        mUi->ImportListView->ColumnHeaders().Item(++index).setText(GetMessage(column.key));
-    fitColumns();
-}
-
-// The whole width is used, less the room of a scroll bar.
-void frmImport::fitColumns()
-{
-    DBListViewCTL *list = mUi->ImportListView;
-    if (list->ColumnHeaders().Count() == 0)
-        return;
-    const int scrollBar = style()->pixelMetric(QStyle::PM_ScrollBarExtent, nullptr, list);
-    int left = list->width() - 2 * list->frameWidth() - scrollBar;
-    for (const Column &column : columns)
-        left -= column.percent == 0 ? neededWidth(column, list->fontMetrics()) : 0;
-    int index = 0;
-    for (const Column &column : columns) {
-        const int width = column.percent == 0 ? neededWidth(column, list->fontMetrics())
-                                              : left * column.percent / 100;
-        list->ColumnHeaders().Item(++index).setWidth(qMax(1, width));
-    }
-}
-
-void frmImport::resizeEvent(QResizeEvent *event)
-{
-    Form::resizeEvent(event);
-    fitColumns();
+    auto *list = new ListColumns(mUi->ImportListView, columns);
+    list->show(gImportRecords);
 }
 
 // Nothing of this screen may be used behind this: a load that succeeds unloads it.

@@ -22,11 +22,9 @@ public:
 protected:
     void Form_Load() override;
     void Form_Unload() override;
-    void resizeEvent(QResizeEvent *event) override;
 
 private:
     void fillList();
-    void fitColumns();
     void StartDBImport_Click();
 
     std::unique_ptr<Ui::frmImport> mUi;

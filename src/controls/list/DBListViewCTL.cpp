@@ -200,6 +200,12 @@ void DBListViewCTL::setSortKey(int column)
     applyOrder();
 }
 
+void DBListViewCTL::sortBy(int column)
+{
+    mSortKey = column;
+    setSorted(true);
+}
+
 void DBListViewCTL::applyOrder()
 {
     const bool possible = mSortKey >= 0 && mSortKey < mModel->columnCount();

@@ -47,6 +47,7 @@ public:
     void setSorted(bool sorted);
     int SortKey() const { return mSortKey; } // from 0
     void setSortKey(int column);
+    void sortBy(int column); // both, and the rows are sorted once
 
     bool CheckBoxes() const;
     void setCheckBoxes(bool on); // in the first visible column

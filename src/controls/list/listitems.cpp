@@ -120,6 +120,12 @@ void ColumnHeader::setWidth(int width) const
         mList->setColumnWidthOf(mIndex - 1, width);
 }
 
+void ColumnHeader::setAlignment(Qt::Alignment side) const
+{
+    if (exists())
+        mList->mModel->setAlignment(mIndex - 1, side);
+}
+
 int ColumnHeaders::Count() const
 {
     return mList->mModel->columnCount();

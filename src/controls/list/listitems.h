@@ -71,6 +71,9 @@ public:
     int Width() const;
     void setWidth(int width) const;
 
+    /// Of the caption and of all cells; to the left until it is set.
+    void setAlignment(Qt::Alignment side) const;
+
 private:
     bool exists() const;
 

@@ -21,6 +21,7 @@ void ListModel::fill(std::shared_ptr<const ADODB::Rows> rows)
     ++mFilling;
     mRows = std::move(rows);
     mCaptions.clear();
+    mAlignments.clear();
     if (mRows) {
         for (const ADODB::FieldInfo &field : mRows->fields())
             mCaptions.append(field.name);
@@ -109,6 +110,21 @@ void ListModel::setOrder(std::vector<std::uint32_t> order)
     emit layoutChanged({}, VerticalSortHint);
 }
 
+void ListModel::setAlignment(int column, Qt::Alignment side)
+{
+    mAlignments.insert(column, side);
+    emit headerDataChanged(Qt::Horizontal, column, column);
+    if (rowCount() > 0)
+        emit dataChanged(index(0, column), index(rowCount() - 1, column));
+}
+
+QVariant ListModel::alignment(int column) const
+{
+    const auto side = mAlignments.constFind(column);
+    return side == mAlignments.constEnd() ? QVariant()
+                                          : QVariant((*side | Qt::AlignVCenter).toInt());
+}
+
 void ListModel::setCheckColumn(int column)
 {
     if (column == mCheckColumn)
@@ -143,6 +159,8 @@ QVariant ListModel::data(const QModelIndex &index, int role) const
     switch (role) {
     case Qt::DisplayRole:
         return text(record, index.column());
+    case Qt::TextAlignmentRole:
+        return alignment(index.column());
     case Qt::FontRole:
         if (marks(record).bold) {
             QFont font;
@@ -179,6 +197,8 @@ QVariant ListModel::headerData(int section, Qt::Orientation orientation, int rol
 {
     if (orientation == Qt::Horizontal && role == Qt::DisplayRole)
         return mCaptions.value(section);
+    if (orientation == Qt::Horizontal && role == Qt::TextAlignmentRole)
+        return alignment(section);
     return {};
 }
 

@@ -46,6 +46,8 @@ public:
     void sortBy(int column);
     bool hasOrderOf(int column) const { return column == mSortedBy; }
 
+    void setAlignment(int column, Qt::Alignment side); // until the next fill()
+
     void setCheckColumn(int column); // -1: no check boxes
     int checkColumn() const { return mCheckColumn; }
 
@@ -62,6 +64,7 @@ signals:
     void checkToggled(int record); // through setData(), by the user
 
 private:
+    QVariant alignment(int column) const;
     bool startsWith(int record, int column, const QString &start) const;
     void setOrder(std::vector<std::uint32_t> order);
     void rowChanged(int record);
@@ -69,6 +72,7 @@ private:
     std::shared_ptr<const ADODB::Rows> mRows;
     unsigned mFilling = 0;
     QStringList mCaptions;
+    QHash<int, Qt::Alignment> mAlignments;     // by column, where it is not the left
     std::vector<std::uint32_t> mOrder, mRowOf; // empty in the recordset's order
     int mSortedBy = -1;                        // -2: by a column written to since
     int mCheckColumn = -1;

@@ -191,6 +191,18 @@ private slots:
         QCOMPARE(list.horizontalHeader()->sortIndicatorSection(), -1);
     }
 
+    void sortsOnce()
+    {
+        ShownList list;
+        list.setSortKey(2);
+        QSignalSpy ordered(list.model(), &QAbstractItemModel::layoutChanged);
+        list.sortBy(1);
+        QCOMPARE(ordered.size(), 1);
+        list.sortBy(1);
+        QCOMPARE(ordered.size(), 1);
+        QVERIFY(list.Sorted() && list.SortKey() == 1);
+    }
+
     void writesFollowTheRecord()
     {
         ShownList list;
