@@ -132,7 +132,28 @@ QModelIndex DBListViewCTL::shownIndex(int row) const
 
 ListItem DBListViewCTL::SelectedItem()
 {
-    return itemAt(currentIndex().row());
+    return itemAt(selectedRowNear(currentIndex().row()));
+}
+
+int DBListViewCTL::selectedRowNear(int row) const
+{
+    int nearest = row, distance = mModel->rowCount() + 1;
+    for (const QItemSelectionRange &range : selectionModel()->selection()) {
+        const int candidate = std::clamp(row, range.top(), range.bottom());
+        if (std::abs(candidate - row) < distance) {
+            nearest = candidate;
+            distance = std::abs(candidate - row);
+        }
+    }
+    return nearest;
+}
+
+// No click and no key of a person leaves the list without a highlighted row.
+void DBListViewCTL::keepOneSelected()
+{
+    if (currentIndex().isValid() && !selectionModel()->hasSelection())
+        selectionModel()->select(currentIndex(),
+                                 QItemSelectionModel::Select | QItemSelectionModel::Rows);
 }
 
 void DBListViewCTL::setSelectedItem(const ListItem &item)
@@ -211,7 +232,7 @@ void DBListViewCTL::applyOrder()
     const bool possible = mSortKey >= 0 && mSortKey < mModel->columnCount();
     const int column = mSorted && possible ? mSortKey : -1;
     if (!mModel->hasOrderOf(column)) {
-        const ListItem current = SelectedItem();
+        const ListItem current = itemAt(currentIndex().row());
         const QModelIndex cell = currentIndex();
         const std::vector<bool> selected = selectedRecords();
         selectionModel()->reset();

@@ -36,7 +36,9 @@ public:
     ::ListItems ListItems() { return ::ListItems(this); }
     ::ColumnHeaders ColumnHeaders() { return ::ColumnHeaders(this); }
 
-    ListItem SelectedItem(); // the current one, selected or not
+    /// The current one. Where a person has put the cursor beside what is selected, it is the
+    /// selected one nearest to it: what a person sees highlighted is what a command acts on.
+    ListItem SelectedItem();
     void setSelectedItem(const ListItem &item);
     void setDropHighlight(const ListItem &item);
     ListItem HitTest(int x, int y);
@@ -103,7 +105,9 @@ private:
     ListItem itemAt(int row);
     int rowOf(const ListItem &item) const; // -1 for nothing
     QModelIndex shownIndex(int row) const; // a cell of the row in a visible column
-    void makeCurrent(int row);             // and selected alone
+    int selectedRowNear(int row) const;    // the row itself if none is selected
+    void keepOneSelected();
+    void makeCurrent(int row); // and selected alone
     void setRowSelected(int row, bool selected);
     int columnWidthOf(int column) const;
     void setColumnWidthOf(int column, int width);

@@ -56,8 +56,10 @@ void DBListViewCTL::keyPressEvent(QKeyEvent *event)
     }
     if (const int code = keyCodeOf(event->key()))
         emit KeyDown(code, shiftStateOf(event->modifiers()));
-    if (self && isEnabled() && !actOnKey(event))
+    if (self && isEnabled() && !actOnKey(event)) {
         QTableView::keyPressEvent(event);
+        keepOneSelected();
+    }
 }
 
 // So that lists can be sorted without a mouse.
@@ -174,6 +176,7 @@ void DBListViewCTL::mousePressEvent(QMouseEvent *event)
         return;
     }
     QTableView::mousePressEvent(event);
+    keepOneSelected();
     if (index.isValid())
         emit ItemClick(itemAt(index.row()));
 }
@@ -192,6 +195,7 @@ void DBListViewCTL::mouseReleaseEvent(QMouseEvent *event)
         mDrag->released(event->position().toPoint());
     else if (!mCheckPressed)
         QTableView::mouseReleaseEvent(event);
+    keepOneSelected();
     mCheckPressed = false;
 }
 

@@ -329,6 +329,25 @@ private slots:
         QCOMPARE(clicks.last(), QVariantList{3});
     }
 
+    void whatIsHighlightedIsTheSelectedItem()
+    {
+        ShownList list;
+        list.click(3);
+        list.click(3, Qt::ControlModifier); // the only one stays
+        QCOMPARE(shown(list), u"11 9 30*< 4 5"_s);
+        QTest::keyClick(&list, Qt::Key_Space, Qt::ControlModifier);
+        QCOMPARE(shown(list), u"11 9 30*< 4 5"_s);
+        list.click(5, Qt::ControlModifier);
+        list.click(5, Qt::ControlModifier); // the cursor is there, the highlight is not
+        QCOMPARE(shown(list), u"11 9 30*< 4 5"_s);
+        QTest::keyClick(&list, Qt::Key_Up, Qt::ControlModifier);
+        QCOMPARE(list.currentIndex().row(), 3);
+        QCOMPARE(shown(list), u"11 9 30*< 4 5"_s);
+        const QPoint below(50, list.viewport()->height() - 3);
+        QTest::mouseClick(list.viewport(), Qt::LeftButton, {}, below);
+        QCOMPARE(shown(list), u"11 9 30 4*< 5"_s);
+    }
+
     void tellsClicks()
     {
         ShownList list;
