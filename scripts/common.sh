@@ -30,6 +30,7 @@ need() {
 build() {
     local preset=$1
     shift
+    mkdir -p build
     [ -f "build/$preset/build.ninja" ] || cmake --preset "$preset" >"build/$preset.log" 2>&1 || { cat "build/$preset.log"; return 1; }
     if [ $# -gt 0 ]; then set -- --target "$@"; fi
     cmake --build --preset "$preset" -j "$jobs" "$@" >"build/$preset.log" 2>&1 || { grep -E "error|warning|FAILED|\*\*\*" "build/$preset.log" | head -60 || tail -40 "build/$preset.log"; return 1; }

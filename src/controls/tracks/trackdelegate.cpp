@@ -1,6 +1,6 @@
 #include "controls/tracks/trackdelegate.h"
 
-#include <QEvent>
+#include <QKeyEvent>
 
 TrackDelegate::TrackDelegate(Describe describe, QObject *parent)
     : RowDelegate(parent), mDescribe(std::move(describe))
