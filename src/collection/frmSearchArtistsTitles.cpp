@@ -8,7 +8,7 @@
 #include "controls/list/listcolumns.h"
 #include "platform/desktop/desktop.h"
 #include "platform/desktop/options.h"
-#include "platform/desktop/throttledpump.h"
+#include "platform/work/longwork.h"
 #include "services/captions.h"
 #include "services/fileutilities.h"
 #include "services/frame.h"
@@ -17,6 +17,7 @@
 #include "services/textfiles.h"
 
 #include <QKeyEvent>
+#include <QScopedValueRollback>
 
 using namespace Qt::StringLiterals;
 
@@ -233,19 +234,27 @@ void frmSearchArtistsTitles::openDisc(const ListItem &item)
 
 void frmSearchArtistsTitles::cmdExport_Click()
 {
-    if (Form::busyForm()) {
-        informationBox(GetMessage("xBusy"));
+    if (!LongWork::mayBegin(*this))
         return;
-    }
     const QString name =
         Desktop::current().saveFileName({GetMessage("xExportTitle"), saveFolder(), {}, {}});
     if (name.isEmpty() || !mayWrite(name))
         return;
     rememberSaveFolder(name);
+    exportTo(name);
+}
+
+void frmSearchArtistsTitles::exportTo(const QString &name)
+{
+    LongWork work(*this);
+    work.showPercent = [this](int percent) {
+        mUi->StatusBar->showMessage(GetMessage("xExporting") + QString::number(percent) + u'%');
+    };
+    const QScopedValueRollback<LongWork *> cancellable(mExport, &work);
     setExporting(true);
-    const bool written = writeResult(name);
+    const bool written = writeResult(name, work);
     setExporting(false);
-    if (mCancelled)
+    if (work.isCancelled())
         mUi->StatusBar->showMessage(GetMessage("xExportCancelled"));
     else if (written)
         mUi->StatusBar->showMessage(GetMessage("xExported") + name);
@@ -253,7 +262,7 @@ void frmSearchArtistsTitles::cmdExport_Click()
 
 // A file that cannot be opened says no more than the panel does; what cannot be written to its end
 // does: it would pass for done.
-bool frmSearchArtistsTitles::writeResult(const QString &name)
+bool frmSearchArtistsTitles::writeResult(const QString &name, LongWork &work)
 {
     const QString failure = GetMessage("xNotExported") + name;
     OutputTextFile file;
@@ -263,17 +272,12 @@ bool frmSearchArtistsTitles::writeResult(const QString &name)
     }
     auto items = mUi->ResultList->ListItems();
     const int count = items.Count();
-    ThrottledPump pump;
-    int percent = 0;
     bool written = true;
-    for (int index = 1; index <= count && written && !mCancelled; ++index) {
+    for (int index = 1; index <= count && written; ++index) {
         written = WriteTextLine(file, resultLine(textsOf(items.Item(index))));
-        if (const int now = int(index * 100LL / count); now != percent)
-            showProgress(percent = now);
-        pump();
+        if (!work.step(index, count))
+            return false;
     }
-    if (mCancelled)
-        return false;
     written = written && CloseTextFile(file);
     if (!written) {
         mUi->StatusBar->showMessage(failure);
@@ -285,11 +289,8 @@ bool frmSearchArtistsTitles::writeResult(const QString &name)
 // What is shown is what is written: nothing may change it meanwhile.
 void frmSearchArtistsTitles::setExporting(bool exporting)
 {
-    mExporting = exporting;
-    if (exporting) {
-        mCancelled = false;
+    if (exporting)
         mUi->txtArtistKey->setFocus(); // the button's would go to the one that cancels
-    }
     mUi->cmdSearch->setEnabled(!exporting);
     mUi->cmdExport->setEnabled(!exporting);
     mUi->ResultList->setEnabled(!exporting);
@@ -298,16 +299,11 @@ void frmSearchArtistsTitles::setExporting(bool exporting)
         mUi->cmdExport->setFocus();
 }
 
-void frmSearchArtistsTitles::showProgress(int percent)
-{
-    mUi->StatusBar->showMessage(GetMessage("xExporting") + QString::number(percent) + u'%');
-}
-
 // An export is ended by it, and the form stays.
 void frmSearchArtistsTitles::cmdCancel_Click()
 {
-    if (mExporting)
-        mCancelled = true;
+    if (mExport)
+        mExport->cancel();
     else
         Unload();
 }

@@ -7,6 +7,7 @@
 
 class ListColumns;
 class ListItem;
+class LongWork;
 class QLineEdit;
 namespace Ui
 {
@@ -22,8 +23,6 @@ class frmSearchArtistsTitles : public Form
 public:
     frmSearchArtistsTitles();
     ~frmSearchArtistsTitles() override;
-
-    bool isBusy() const override { return mExporting; }
 
 protected:
     void Form_Load() override;
@@ -46,12 +45,11 @@ private:
     void showFound(qsizetype count);
     void openDisc(const ListItem &item);
 
-    bool writeResult(const QString &name);
+    void exportTo(const QString &name);
+    bool writeResult(const QString &name, LongWork &work);
     void setExporting(bool exporting);
-    void showProgress(int percent);
 
     std::unique_ptr<Ui::frmSearchArtistsTitles> mUi;
     ListColumns *mColumns;
-    bool mExporting = false;
-    bool mCancelled = false;
+    LongWork *mExport = nullptr; // while it runs
 };

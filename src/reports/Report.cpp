@@ -1,6 +1,6 @@
 #include "reports/Report.h"
 
-#include "platform/desktop/throttledpump.h"
+#include "platform/work/longwork.h"
 #include "reports/frmPageSetup.h"
 #include "reports/reportpaper.h"
 #include "reports/ui_Report.h"
@@ -175,7 +175,7 @@ void Report::layOut()
     mContent =
         std::make_shared<ReportContent>(mSource, windowTitle(), Desktop::current().now().date());
     mUi->Preview->setReport(painter());
-    if (!mBusy)
+    if (!mWork)
         mUi->TheStatusBar->showMessage(mContent->count());
     showPage();
 }
@@ -225,13 +225,9 @@ void Report::showZoom()
 // One at a time; the screen stays meanwhile, also below a dialog.
 void Report::command(void (Report::*routine)())
 {
-    if (mBusy || !mContent)
+    if (!mContent || !LongWork::mayBegin(*this))
         return;
-    if (Form::busyForm()) {
-        informationBox(GetMessage("xBusy"));
-        return;
-    }
-    const QScopedValueRollback<bool> busy(mBusy, true);
+    const Busy stays(*this);
     (this->*routine)();
 }
 
@@ -271,16 +267,14 @@ void Report::writePdf()
 // A failure is told with these words and the reason behind them.
 void Report::run(const QString &failure, const char *stopped, const Work &work)
 {
-    mStopped = false;
+    LongWork running(*this);
+    running.showPercent = [this](int percent) { mProgress->setValue(percent); };
+    const QScopedValueRollback<LongWork *> cancellable(mWork, &running);
     showBusy(true);
     qsizetype written = 0;
-    ThrottledPump pump;
     const auto result = work([&](qsizetype done, qsizetype all) {
         written = done;
-        if (const int percent = int(done * 100 / all); percent != mProgress->value())
-            mProgress->setValue(percent);
-        pump();
-        return !mStopped;
+        return running.step(done, all);
     });
     showBusy(false);
     const bool whole = result.outcome == reportoutput::Outcome::Done;
@@ -315,8 +309,8 @@ void Report::setUpPage()
 
 void Report::cmdCancel_Click()
 {
-    if (mBusy)
-        mStopped = true;
+    if (mWork)
+        mWork->cancel();
     else
         Unload();
 }

@@ -10,6 +10,7 @@
 
 class QAbstractButton;
 class QKeySequence;
+class LongWork;
 class QProgressBar;
 namespace Ui
 {
@@ -29,7 +30,6 @@ public:
     /// Error if it is not that of a report.
     void setDataSource(const ADODB::Recordset &source);
     void setCaption(const QString &caption);
-    bool isBusy() const override { return mBusy; }
 
 protected:
     explicit Report(const QString &name);
@@ -63,5 +63,5 @@ private:
     std::shared_ptr<const ReportContent> mContent;
     ADODB::Recordset mSource;
     QPageLayout mPaper;
-    bool mBusy = false, mStopped = false;
+    LongWork *mWork = nullptr; // the output, while one runs
 };

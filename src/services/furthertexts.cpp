@@ -54,7 +54,7 @@ const Message furtherTexts[] = {
     {"xReportBusy", "The pages are being written...", "De pagina's worden geschreven..."},
     {"xReportDone", "Pages written: ", "Geschreven pagina's: "},
     {"xPdfStopped", "Nothing has been written.", "Er is niets geschreven."},
-    {"xBusy", "A list is still being written. Please wait until it is done, or cancel it first.", "Er wordt nog een lijst geschreven. Wacht tot dit klaar is of breek het eerst af."},
+    {"xBusy", "The program is still busy with something else. Please wait until it is done, or cancel it first.", "Het programma is nog met iets anders bezig. Wacht tot dit klaar is of breek het eerst af."},
     {"xReportStopped", "Not all pages have been written.", "Niet alle pagina's zijn geschreven."},
     {"xPreview", "Preview", "Afdrukvoorbeeld"},
     {"xZoom", "Zoom", "Zoom"},

@@ -1,6 +1,6 @@
 #include "services/messages.h"
 
-#include "platform/error/error.h"
+#include "platform/text/messagetexts.h"
 #include "services/globals.h"
 #include "services/messagetable.h"
 
@@ -27,9 +27,9 @@ const Table &table()
     return byKey;
 }
 
-// The rooms below this one have their errors' words in the table, too.
-[[maybe_unused]] const bool errorsHaveTexts = [] {
-    setErrorTexts([](const char *key) { return GetMessage(key); });
+// The rooms below this one have their words in the table, too.
+[[maybe_unused]] const bool lowerRoomsHaveTexts = [] {
+    text::setKeys([](const char *key) { return GetMessage(key); });
     return true;
 }();
 

@@ -173,24 +173,13 @@ CatalogueLoad::Outcome CatalogueLoad::run()
     mLastCdIndex = 0;
     const auto rows = gImportRecords->rows();
     for (qsizetype row = 0; row < rows->rowCount(); ++row) {
-        tell(row + 1, rows->rowCount());
-        if (!load(Track(*rows, row))) {
+        if (!step(row + 1, rows->rowCount()) || !load(Track(*rows, row))) {
             transaction.RollbackTrans();
             return Outcome::Cancelled;
         }
     }
     transaction.CommitTrans();
     return Outcome::Committed;
-}
-
-void CatalogueLoad::tell(qsizetype number, qsizetype count)
-{
-    const int percent = int(number * 100 / count);
-    if (show && percent != mPercentShown)
-        show(percent, QString::number(percent) + GetMessage("PercentImported"));
-    mPercentShown = percent;
-    if (nextTrack)
-        nextTrack();
 }
 
 // By design: artist and track come before the question about their CD and stay when it is answered

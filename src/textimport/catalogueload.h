@@ -13,11 +13,9 @@ class CatalogueLoad
 public:
     enum class Outcome { Committed, Cancelled };
 
-    /// What to show of the progress, whenever it has changed; percent of the tracks.
-    std::function<void(int percent, const QString &label)> show;
-
-    /// Before each track, for what has to happen meanwhile.
-    std::function<void()> nextTrack;
+    /// Told before each track which one of how many it is, counted from 1; false takes everything
+    /// back.
+    std::function<bool(qint64 number, qint64 count)> step = [](qint64, qint64) { return true; };
 
     /// Asked for a CD that is there already: Yes imports it once more, No leaves it out, Cancel
     /// takes everything back.
@@ -32,7 +30,6 @@ public:
 
 private:
     struct Track;
-    void tell(qsizetype number, qsizetype count);
     bool load(const Track &track); // false: cancelled
     bool beginCd(const Track &track, const QString &artistId);
     BoxAnswer answerFor(const Track &track, const QString &artistId) const;
@@ -40,5 +37,4 @@ private:
     qsizetype mImportedCount = 0;
     qint64 mLastCdIndex = 0;
     BoxAnswer mCdAnswer = vbYes; // holds for the CD in work
-    int mPercentShown = -1;
 };

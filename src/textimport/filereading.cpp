@@ -34,7 +34,7 @@ void FileReading::run()
     if (!OpenInputFile(gImportFile, file))
         throw makeError(errCannotUse, gImportFile);
     mLineTotal = file.countLines();
-    tell(FilePart::Head);
+    lineRead(0, FilePart::Head);
     if (mLineTotal == 0)
         return;
     TrackRows rows(*gImportRecords, discRow, cd);
@@ -45,12 +45,7 @@ void FileReading::run()
 
 void FileReading::readLines(InputTextFile &file, TrackRows &rows)
 {
-    ImportLines lines(file, [this](int lineNumber, FilePart part) {
-        mLineNumber = lineNumber;
-        tell(part);
-        if (lineRead)
-            lineRead();
-    });
+    ImportLines lines(file, [this](int lineNumber, FilePart part) { lineRead(lineNumber, part); });
     if (gImportCompilationNested)
         ReadCompilationNested(lines, rows);
     else if (gImportCompilationFlat)
@@ -61,15 +56,16 @@ void FileReading::readLines(InputTextFile &file, TrackRows &rows)
         ReadAlbumFlat(lines, rows);
 }
 
-void FileReading::tell(FilePart part)
+void FileReading::lineRead(int lineNumber, FilePart part)
 {
-    const int percent =
-        mLineTotal == 0 ? 100 : int(qMin<qint64>(100, qint64(mLineNumber) * 100 / mLineTotal));
-    const bool fromTable = wordIsFromTable(part);
-    if (!show || (percent == mPercentShown && fromTable == mFromTableShown))
-        return;
-    mPercentShown = percent;
-    mFromTableShown = fromTable;
-    show(percent,
-         QString::number(percent) + (fromTable ? GetMessage("lblRead") : u"% ingelezen"_s));
+    mLineNumber = lineNumber;
+    mPart = part;
+    if (!step(mLineNumber, mLineTotal))
+        throw Stopped();
+}
+
+QString FileReading::label(int percent) const
+{
+    return QString::number(percent) +
+           (wordIsFromTable(mPart) ? GetMessage("lblRead") : u"% ingelezen"_s);
 }

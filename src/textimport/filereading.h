@@ -7,24 +7,26 @@
 class FileReading
 {
 public:
-    /// What to show of the progress, whenever it has changed; percent of the lines.
-    std::function<void(int percent, const QString &label)> show;
+    /// Told after each line how many of them are done; false stops there.
+    std::function<bool(qint64 done, qint64 all)> step = [](qint64, qint64) { return true; };
 
-    /// After each line, for what has to happen meanwhile.
-    std::function<void()> lineRead;
+    /// What to show of the progress where the reading stands now.
+    QString label(int percent) const;
 
-    /// A missing file and one without a line give no rows. Throws DataError, and any
+    /// A missing file and one without a line give no rows. Throws DataError, Stopped, and any other
     /// std::exception for what is no text file of tracks at all; the rows read so far stay.
     void run();
+    struct Stopped {
+    };
 
     /// The number of lines read so far: where it failed.
     int lineNumber() const { return mLineNumber; }
 
 private:
     void readLines(InputTextFile &file, TrackRows &rows);
-    void tell(FilePart part);
+
+    void lineRead(int lineNumber, FilePart part);
 
     int mLineNumber = 0, mLineTotal = 0;
-    int mPercentShown = -1;
-    bool mFromTableShown = false;
+    FilePart mPart = FilePart::Head;
 };

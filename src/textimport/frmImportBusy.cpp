@@ -1,6 +1,6 @@
 #include "textimport/frmImportBusy.h"
 
-#include "platform/desktop/throttledpump.h"
+#include "platform/work/longwork.h"
 #include "services/captions.h"
 #include "services/frame.h"
 #include "services/globals.h"
@@ -57,40 +57,47 @@ void frmImportBusy::Form_Unload()
 void frmImportBusy::StartReading_Timer()
 {
     mStartReading->stop();
-    mReading = true;
     setFramePointer(vbHourglass);
     Desktop::current().setPointer(this, vbHourglass);
     setWindowTitle(GetMessage("BusyReadingFile") + gImportFile);
-    ThrottledPump pump;
     FileReading reading;
-    reading.lineRead = std::ref(pump);
-    reading.show = [this](int percent, const QString &label) {
-        mUi->ImportProgressBar->setValue(percent);
-        mUi->lblRead->setText(label);
-    };
-    if (read(reading))
+    switch (read(reading)) {
+    case Outcome::Read:
         showReview();
-    else
+        break;
+    case Outcome::Refused:
         refuse(reading.lineNumber());
+        break;
+    case Outcome::Stopped:
+        setImportEnabled(true);
+        Unload();
+    }
 }
 
-bool frmImportBusy::read(FileReading &reading)
+frmImportBusy::Outcome frmImportBusy::read(FileReading &reading)
 {
+    LongWork work(*this);
+    work.showPercent = [&](int percent) {
+        mUi->ImportProgressBar->setValue(percent);
+        mUi->lblRead->setText(reading.label(percent));
+    };
+    reading.step = [&](qint64 done, qint64 all) { return work.step(done, all); };
     try {
         reading.run();
-        return true;
+        return Outcome::Read;
+    } catch (const FileReading::Stopped &) {
+        return Outcome::Stopped; // the program ends
     } catch (const DataError &error) {
         errorBox(atLine(error.line, u": "_s + error.reason), GetMessage("FileError"));
     } catch (const std::exception &) {
         // What cannot be taken apart has no reason but the general one.
     }
-    return false;
+    return Outcome::Refused;
 }
 
 // The pointers stay as they are until the review has loaded.
 void frmImportBusy::showReview()
 {
-    mReading = false;
     mUi->lblRead->setText(GetMessage("BusyCreatingList"));
     Unload();
     freezeFrame();
@@ -103,6 +110,5 @@ void frmImportBusy::refuse(int lineNumber)
     Desktop::current().setPointer(this, vbDefault);
     setImportEnabled(true);
     errorBox(atLine(lineNumber, GetMessage("InvalidFileFormat")));
-    mReading = false;
     Unload();
 }

@@ -23,16 +23,15 @@ public:
 
 protected:
     void Form_Load() override;
-    bool QueryUnload() override { return !mReading; }
     void Form_Unload() override;
 
 private:
     void StartReading_Timer();
-    bool read(FileReading &reading); // false: refused, the reason was shown
+    enum class Outcome { Read, Refused, Stopped };
+    Outcome read(FileReading &reading); // a reason for a refusal was shown, if there is one
     void showReview();
     void refuse(int lineNumber);
 
     std::unique_ptr<Ui::frmImportBusy> mUi;
     QTimer *mStartReading;
-    bool mReading = false;
 };

@@ -2,7 +2,7 @@
 
 #include "catalogue/errorboxes.h"
 #include "platform/ado/connection.h"
-#include "platform/desktop/throttledpump.h"
+#include "platform/work/longwork.h"
 #include "services/browser.h"
 #include "services/captions.h"
 #include "services/frame.h"
@@ -60,7 +60,6 @@ void frmImportDBBusy::Form_Unload()
 void frmImportDBBusy::StartImporting_Timer()
 {
     mStartImporting->stop();
-    mLoading = true;
     setFramePointer(vbHourglass);
     Desktop::current().setPointer(this, vbHourglass);
     try {
@@ -68,24 +67,32 @@ void frmImportDBBusy::StartImporting_Timer()
     } catch (const Error &error) {
         showDatabaseErrors(error);
         gConnection->RollbackTrans();
-        leave();
+        Unload();
     }
 }
 
 void frmImportDBBusy::load()
 {
-    ThrottledPump pump;
     CatalogueLoad load;
-    load.nextTrack = std::ref(pump);
-    load.show = [this](int percent, const QString &label) {
-        mUi->DBImportProgressBar->setValue(percent);
-        mUi->lblRead->setText(label);
-    };
-    load.ask = [](const QString &question) { return askYesNoCancel(question); };
-    if (load.run() == CatalogueLoad::Outcome::Committed)
+    switch (run(load)) {
+    case CatalogueLoad::Outcome::Committed:
         tellImported(load.importedCount());
-    else
+        break;
+    case CatalogueLoad::Outcome::Cancelled:
         tellCancelled();
+    }
+}
+
+CatalogueLoad::Outcome frmImportDBBusy::run(CatalogueLoad &load)
+{
+    LongWork work(*this);
+    work.showPercent = [this](int percent) {
+        mUi->DBImportProgressBar->setValue(percent);
+        mUi->lblRead->setText(QString::number(percent) + GetMessage("PercentImported"));
+    };
+    load.step = [&](qint64 number, qint64 count) { return work.step(number, count); };
+    load.ask = [](const QString &question) { return askYesNoCancel(question); };
+    return load.run();
 }
 
 void frmImportDBBusy::tellImported(qsizetype count)
@@ -94,7 +101,7 @@ void frmImportDBBusy::tellImported(qsizetype count)
     resetPointers();
     informationBox(GetMessage("MsgNumImpTracks") + QString::number(count));
     Desktop::current().pump();
-    leave();
+    Unload();
     unloadReview();
     Desktop::current().pump();
     refreshBrowser();
@@ -106,17 +113,11 @@ void frmImportDBBusy::tellCancelled()
 {
     resetPointers();
     informationBox(GetMessage("MsgImpCancel"));
-    leave();
+    Unload();
 }
 
 void frmImportDBBusy::resetPointers()
 {
     setFramePointer(vbDefault);
     Desktop::current().setPointer(this, vbDefault);
-}
-
-void frmImportDBBusy::leave()
-{
-    mLoading = false;
-    Unload();
 }

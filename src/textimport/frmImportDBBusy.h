@@ -1,6 +1,7 @@
 #pragma once
 
 #include "platform/desktop/form.h"
+#include "textimport/catalogueload.h"
 
 #include <memory>
 
@@ -22,18 +23,16 @@ public:
 
 protected:
     void Form_Load() override;
-    bool QueryUnload() override { return !mLoading; }
     void Form_Unload() override;
 
 private:
     void StartImporting_Timer();
     void load();
+    CatalogueLoad::Outcome run(CatalogueLoad &load);
     void tellImported(qsizetype count);
     void tellCancelled();
     void resetPointers();
-    void leave();
 
     std::unique_ptr<Ui::frmImportDBBusy> mUi;
     QTimer *mStartImporting;
-    bool mLoading = false;
 };

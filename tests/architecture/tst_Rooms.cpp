@@ -32,7 +32,7 @@ const QStringList rooms = readRooms();
 // themselves.
 const QHash<QString, QStringList> valueRooms{
     {u"platform/text"_s, {}},
-    {u"platform/error"_s, {}},
+    {u"platform/error"_s, {u"platform/text"_s}},
     {u"tags"_s, {u"platform/text"_s, u"platform/error"_s}},
     {u"discs"_s, {u"platform/text"_s, u"platform/error"_s}},
     {u"helpers"_s, {u"platform/text"_s, u"platform/error"_s, u"discs"_s}},
@@ -123,8 +123,7 @@ private slots:
         row("^discid/", "discdata/");
         row("^QSql|^QtSql", "nowhere");
         row("^QMessageBox|^QFileDialog|^QDesktopServices", "platform/desktop/");
-        row("^thread$|^future$|^QThread|^QFuture|^QtConcurrent|^QProcess",
-            "platform/work/|platform/desktop/drawingfreeze");
+        row("^thread$|^future$|^QThread|^QFuture|^QtConcurrent|^QProcess", "platform/work/");
         row("^Q(Tcp|Udp|Ssl)|^QNetwork", "platform/work/|discdata/");
         row("^QtTest|^QTest|^benchmark/", "nowhere");
     }

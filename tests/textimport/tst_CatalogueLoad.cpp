@@ -33,7 +33,6 @@ private:
     QString load()
     {
         CatalogueLoad load;
-        load.show = [this](int, const QString &label) { mLabels.append(label); };
         load.ask = [this](const QString &question) {
             mQuestions.append(question);
             const BoxAnswer answer = mAnswers.empty() ? vbYes : mAnswers.front();
@@ -65,7 +64,7 @@ private:
 
     std::unique_ptr<TestCatalogue> mCatalogue;
     std::deque<BoxAnswer> mAnswers; // Yes when there are none left
-    QStringList mQuestions, mLabels;
+    QStringList mQuestions;
 
 private slots:
     void init()
@@ -75,7 +74,6 @@ private slots:
         mCatalogue = std::make_unique<TestCatalogue>();
         mAnswers.clear();
         mQuestions.clear();
-        mLabels.clear();
     }
 
     // A double quote has become two single ones: the genre, which is not doubled, keeps one of

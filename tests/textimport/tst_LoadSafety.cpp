@@ -43,9 +43,10 @@ int loadAndStop(const QString &catalogue, const QString &file, int track)
         std::fflush(stdout);
         pause();
     };
-    load.nextTrack = [&] {
+    load.step = [&](qint64, qint64) {
         if (++number == track)
             stop();
+        return true;
     };
     load.run();
     stop();

@@ -1,7 +1,8 @@
 #include "platform/desktop/drawingfreeze.h"
 
+#include "platform/desktop/nestedloop.h"
+
 #include <QPointer>
-#include <QThread>
 #include <QTimer>
 #include <QWidget>
 
@@ -12,7 +13,6 @@ namespace
 {
 
 QPointer<QWidget> gFrozen;
-int gPumps = 0;
 bool gWatching = false;
 
 void release()
@@ -31,8 +31,7 @@ void lookAgain()
     gWatching = false;
     if (!gFrozen)
         return;
-    const bool inMainLoop = gPumps == 0 && QThread::currentThread()->loopLevel() <= 1;
-    if (inMainLoop)
+    if (NestedLoop::none())
         release();
     else
         watch(again);
@@ -56,16 +55,6 @@ void freeze(QWidget *window)
     gFrozen = window;
     window->setUpdatesEnabled(false);
     watch(0);
-}
-
-Pumping::Pumping()
-{
-    ++gPumps;
-}
-
-Pumping::~Pumping()
-{
-    --gPumps;
 }
 
 } // namespace drawingfreeze

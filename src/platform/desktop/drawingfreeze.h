@@ -10,12 +10,4 @@ namespace drawingfreeze
 
 void freeze(QWidget *window); // nullptr releases; freezes are not counted
 
-/// Around every pump: what comes round inside one is not the main event loop.
-class Pumping
-{
-public:
-    Pumping();
-    ~Pumping();
-};
-
 } // namespace drawingfreeze

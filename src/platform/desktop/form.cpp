@@ -1,17 +1,30 @@
 #include "platform/desktop/form.h"
 
 #include "platform/desktop/desktop.h"
+#include "platform/desktop/nestedloop.h"
 
 #include <QApplication>
 #include <QCloseEvent>
 #include <QKeyEvent>
 #include <QPushButton>
+#include <QTimer>
 
 namespace
 {
 
 QList<Form *> gOpenForms;
 Form::Host *gHost = nullptr;
+
+// Deletes a widget once no routine waits, whose it may be. Looked after again and again: a box may
+// be open for long.
+void deleteInMainLoop(QWidget *widget)
+{
+    constexpr int again = 20; // milliseconds
+    if (NestedLoop::none())
+        widget->deleteLater();
+    else
+        QTimer::singleShot(again, widget, [widget] { deleteInMainLoop(widget); });
+}
 
 } // namespace
 
@@ -110,10 +123,39 @@ bool Form::Unload()
 {
     if (mUnloaded)
         return true;
-    if (isBusy() || !QueryUnload())
+    if (!agreesToGo())
         return false;
     finishUnload();
     return true;
+}
+
+// While one is asked others may come and go.
+bool Form::UnloadAll(const QString &except, bool forced)
+{
+    QSet<Form *> asked;
+    const auto nextToAsk = [&]() -> Form * {
+        const auto next = std::find_if(gOpenForms.begin(), gOpenForms.end(), [&](Form *form) {
+            return form->Name() != except && !asked.contains(form);
+        });
+        return next == gOpenForms.end() ? nullptr : *next;
+    };
+    while (Form *form = nextToAsk()) {
+        asked.insert(form);
+        if (!forced && !form->agreesToGo())
+            return false;
+    }
+    const auto forms = gOpenForms;
+    for (Form *form : forms) {
+        if (form->Name() != except && !form->mUnloaded)
+            form->finishUnload();
+    }
+    return true;
+}
+
+Form::Busy::~Busy()
+{
+    if (mForm)
+        --mForm->mWorks;
 }
 
 bool Form::Reload()
@@ -131,7 +173,8 @@ bool Form::Reload()
     return goes && !mUnloaded;
 }
 
-// The widget itself lives until the event loop comes round: its own handlers may still be running.
+// The widget itself lives until the main event loop comes round: its own handlers may still be
+// running, also those that wait for an answer.
 void Form::finishUnload()
 {
     mUnloaded = true;
@@ -139,9 +182,10 @@ void Form::finishUnload()
     Form_Unload();
     hide();
     if (QWidget *host = parentWidget(); host && host->inherits("QMdiSubWindow"))
-        host->deleteLater();
+        deleteInMainLoop(host); // and the form in it
+    else
+        deleteInMainLoop(this);
     emit unloaded();
-    deleteLater();
 }
 
 void Form::closeEvent(QCloseEvent *event)

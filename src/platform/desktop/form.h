@@ -8,7 +8,9 @@ class QPushButton;
 
 /// What every screen is: a widget with a name, a load, an unload that may be refused, and default
 /// (Enter) and cancel (Esc) buttons of its own. It stands in the frame, or by itself, or modal; it
-/// is deleted when it has been unloaded.
+/// is deleted when it has been unloaded and no routine waits any more: a routine of a form may open
+/// a box or handle events without asking afterwards whether it still lives. That the form has been
+/// unloaded meanwhile it must be ready for.
 ///
 /// Order of life: constructor (controls, texts), Show() or ShowModal() (Form_Load once, then on the
 /// screen), Form_Activate at each activation, Unload() (QueryUnload, then Form_Unload, then gone).
@@ -31,9 +33,26 @@ public:
     /// False if the form refuses, as a busy one does.
     bool Unload();
 
-    /// Whether the form is in the middle of something long that lets events through.
-    virtual bool isBusy() const { return false; }
+    /// The same for several: all are asked, and only when all agree does one go. `Forced` ones are
+    /// not asked.
+    static bool UnloadAll(const QString &except, bool forced = false);
+
+    /// Whether the form is in the middle of something that lets events through.
+    bool isBusy() const { return mWorks > 0; }
     static Form *busyForm(); // nullptr if none is
+
+    /// Makes a form busy for as long as it lives.
+    class Busy
+    {
+    public:
+        explicit Busy(Form &form) : mForm(&form) { ++form.mWorks; }
+        ~Busy();
+        Busy(const Busy &) = delete;
+        Busy &operator=(const Busy &) = delete;
+
+    private:
+        QPointer<Form> mForm;
+    };
     bool isUnloaded() const { return mUnloaded; }
 
     /// Where the form wants to stand, from the corner of its host; to be set in its load.
@@ -78,10 +97,12 @@ protected:
 
 private:
     friend class FormActivation;
+    bool agreesToGo() { return !isBusy() && QueryUnload(); }
     void finishUnload();
 
     QPointer<QPushButton> mDefault, mCancel;
     std::optional<QPoint> mPlace;
+    int mWorks = 0;
     bool mLoaded = false, mUnloaded = false;
 };
 

@@ -1,8 +1,12 @@
 #include "platform/desktop/modalloop.h"
 
 #include "platform/desktop/form.h"
+#include "platform/desktop/nestedloop.h"
 
+#include <QApplication>
 #include <QEventLoop>
+#include <QMessageBox>
+#include <QPushButton>
 
 void runModal(Form &form)
 {
@@ -17,5 +21,32 @@ void runModal(Form &form)
     if (!alive || !form.isVisible())
         return;
     form.activateWindow();
+    const NestedLoop nested;
     loop.exec();
+}
+
+namespace
+{
+
+void refuse(const QMessageBox &box)
+{
+    for (const auto answer : {QMessageBox::Cancel, QMessageBox::No, QMessageBox::Ok}) {
+        if (QAbstractButton *button = box.button(answer)) {
+            button->click();
+            return;
+        }
+    }
+}
+
+} // namespace
+
+void refuseModal()
+{
+    QWidget *top = QApplication::activeModalWidget();
+    if (const auto *box = qobject_cast<QMessageBox *>(top))
+        refuse(*box);
+    else if (auto *dialog = qobject_cast<QDialog *>(top))
+        dialog->reject();
+    else if (auto *form = qobject_cast<Form *>(top))
+        form->Unload();
 }

@@ -2,6 +2,7 @@
 
 #include "platform/desktop/drawingfreeze.h"
 #include "platform/desktop/modalloop.h"
+#include "platform/desktop/nestedloop.h"
 #include "platform/desktop/programfolder.h"
 #include "platform/text/textrules.h"
 
@@ -84,9 +85,15 @@ BoxAnswer answerOf(int pressed)
     }
 }
 
+int run(QDialog &dialog)
+{
+    const NestedLoop nested;
+    return dialog.exec();
+}
+
 QString chosen(QFileDialog &dialog)
 {
-    return dialog.exec() == QDialog::Accepted ? dialog.selectedFiles().value(0) : QString();
+    return run(dialog) == QDialog::Accepted ? dialog.selectedFiles().value(0) : QString();
 }
 
 void prepare(QFileDialog &dialog, const FileQuestion &question)
@@ -122,7 +129,7 @@ BoxAnswer QtDesktop::messageBox(BoxKind kind, BoxButtons buttons, const QString 
     if (buttons == BoxButtons::YesNo)
         box.onlyButtons();
     box.setDefaultButton(buttons == BoxButtons::Ok ? QMessageBox::Ok : QMessageBox::Yes);
-    return answerOf(box.exec());
+    return answerOf(run(box));
 }
 
 void QtDesktop::showModal(Form &form)
@@ -167,7 +174,7 @@ PrinterChoice QtDesktop::choosePrinter(QPrinter &printer, int pages)
     dialog.setMinMax(1, pages);
     dialog.setFromTo(1, pages);
     hideDoubledChoice(dialog);
-    return dialog.exec() == QDialog::Accepted ? PrinterChoice::Chosen : PrinterChoice::Cancelled;
+    return run(dialog) == QDialog::Accepted ? PrinterChoice::Chosen : PrinterChoice::Cancelled;
 }
 
 QDateTime QtDesktop::now()
@@ -190,7 +197,7 @@ void QtDesktop::freeze(QWidget *window)
 
 void QtDesktop::pump()
 {
-    const drawingfreeze::Pumping pumping;
+    const NestedLoop pumping;
     QApplication::processEvents();
 }
 

@@ -1,5 +1,7 @@
 #include "platform/error/error.h"
 
+#include "platform/text/messagetexts.h"
+
 #include <algorithm>
 #include <iterator>
 
@@ -8,19 +10,12 @@ using namespace Qt::StringLiterals;
 namespace
 {
 
-QString keyItself(const char *key)
-{
-    return QString::fromLatin1(key);
-}
-
-constinit TextOfKey gTexts = keyItself;
-
 struct Words {
     ErrorNumber number;
     const char *key;
 };
 
-constexpr Words words[] = {
+constexpr Words errorWords[] = {
     {errOverflow, "xErrOverflow"},
     {errTypeMismatch, "xErrTypeMismatch"},
     {errItemNotFound, "xErrItemNotFound"},
@@ -46,20 +41,15 @@ const char *Error::what() const noexcept
     return mWhat.constData();
 }
 
-void setErrorTexts(TextOfKey texts)
-{
-    gTexts = texts;
-}
-
 QString errorText(const char *key, const QString &detail)
 {
-    const QString text = gTexts(key);
-    return detail.isEmpty() ? text : text + u" ("_s + detail + u')';
+    const QString words = text::ofKey(key);
+    return detail.isEmpty() ? words : words + u" ("_s + detail + u')';
 }
 
 Error makeError(ErrorNumber number, const QString &detail)
 {
-    const auto *found = std::find_if(std::begin(words), std::end(words),
+    const auto *found = std::find_if(std::begin(errorWords), std::end(errorWords),
                                      [&](const Words &w) { return w.number == number; });
     return {number, u"ADODB"_s, errorText(found->key, detail)};
 }

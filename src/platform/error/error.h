@@ -46,8 +46,3 @@ Error makeError(ErrorNumber number, const QString &detail = {});
 
 /// The text of a key of the message table, with detail behind it.
 QString errorText(const char *key, const QString &detail);
-
-/// Where the texts come from: the message table, which stands in a higher room. Until it is there
-/// a text is its key.
-using TextOfKey = QString (*)(const char *key);
-void setErrorTexts(TextOfKey texts);

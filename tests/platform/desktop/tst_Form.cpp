@@ -1,6 +1,7 @@
 // Label: unit
 #include "platform/desktop/drawingfreeze.h"
 #include "platform/desktop/form.h"
+#include "platform/desktop/nestedloop.h"
 #include "platform/desktop/qtdesktop.h"
 #include "support/datarows.h"
 #include "support/scripteddesktop.h"
@@ -223,6 +224,7 @@ private slots:
         bool during = true, after = true;
         inMainLoop([&] {
             const Freeze freeze(&window);
+            const NestedLoop nested;
             QEventLoop modal;
             QTimer::singleShot(60, &modal, &QEventLoop::quit); // longer than the freeze looks away
             modal.exec();
