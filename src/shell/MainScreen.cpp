@@ -20,6 +20,7 @@
 #include <QCloseEvent>
 #include <QDir>
 #include <QMdiSubWindow>
+#include <QScopedValueRollback>
 #include <QTimer>
 #include <QToolButton>
 #include <algorithm>
@@ -289,26 +290,25 @@ void MainScreen::closeEvent(QCloseEvent *event)
 }
 
 // A screen that is busy keeps all others open: nothing is lost before the user has decided.
-bool MainScreen::unloadChildren()
+bool MainScreen::unloadChildren(bool forced)
 {
-    if (Form *busy = Form::busyForm()) {
+    Form *busy = forced ? nullptr : Form::busyForm();
+    if (busy) {
         bringUp(busy);
         informationBox(GetMessage("xBusy"));
         return false;
     }
-    const auto forms = Form::openForms();
-    for (Form *form : forms) {
-        if (form->Name() != "frmSplash"_L1 && !form->Unload())
-            return false;
-    }
-    return true;
+    return Form::UnloadAll(u"frmSplash"_s, forced);
 }
 
-bool MainScreen::Unload()
+bool MainScreen::Unload(bool forced)
 {
     if (mUnloaded)
         return true;
-    if (!unloadChildren())
+    if (mUnloading)
+        return false; // a screen is being asked
+    const QScopedValueRollback<bool> unloading(mUnloading, true);
+    if (!unloadChildren(forced))
         return false;
     mUnloaded = true;
     mTimer1->stop();

@@ -28,7 +28,10 @@ public:
 
     /// All of the start but the timer step. False if the program is to end at once.
     bool Load();
-    bool Unload(); // false if a child refuses
+
+    /// All screens are asked, and only when all agree is anything unloaded; false if one refuses.
+    /// `Forced` asks none.
+    bool Unload(bool forced = false);
     void bringToFront();
 
     // Frame
@@ -59,7 +62,7 @@ private:
     void openBrowser();
     void ChangeLanguage(int language);
     void Over_Click();
-    bool unloadChildren();
+    bool unloadChildren(bool forced);
     void closeCatalogue();
     QMdiSubWindow *subWindowOf(Form *form) const;
 
@@ -68,5 +71,5 @@ private:
     bool mDatabaseMissing = false;
     startup::Found mStart;
     bool mLastRunBroken;
-    bool mUnloaded = false;
+    bool mUnloading = false, mUnloaded = false;
 };

@@ -5,6 +5,7 @@
 #include "services/messages.h"
 #include "shell/MainScreen.h"
 #include "shell/application.h"
+#include "shell/endofprogram.h"
 #include "shell/endsignals.h"
 #include "shell/frmSplash.h"
 #include "shell/singleinstance.h"
@@ -53,7 +54,10 @@ int runProgram(int argc, char **argv)
     QObject::connect(&mainScreen, &MainScreen::languageKnown, &application,
                      &Application::translateQt);
     EndSignals endSignals;
-    QObject::connect(&endSignals, &EndSignals::endRequested, &mainScreen, &MainScreen::Unload);
+    EndOfProgram end(mainScreen);
+    QObject::connect(&endSignals, &EndSignals::endRequested, &end, &EndOfProgram::request);
+    QObject::connect(&application, &QGuiApplication::commitDataRequest, &end,
+                     &EndOfProgram::request);
     if (!mainScreen.Load())
         return 1;
     return application.exec();
