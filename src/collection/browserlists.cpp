@@ -1,5 +1,6 @@
 #include "collection/browserlists.h"
 
+#include "collection/editors.h"
 #include "services/globals.h"
 
 using namespace Qt::StringLiterals;
@@ -84,7 +85,9 @@ qint64 trackCount()
 
 void deleteTitle(qint64 id)
 {
+    editors::aboutToDelete(id);
     executeBoth(deleteDiscsOf(id), deleteTitleRow(id));
+    editors::deleted(id);
 }
 
 void deleteMP3Collection(qint64 id)

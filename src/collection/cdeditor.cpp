@@ -1,11 +1,12 @@
 #include "collection/cdeditor.h"
 
 #include "catalogue/cleanorphans.h"
-#include "catalogue/ids.h"
 #include "collection/disctabs.h"
+#include "collection/trackbuttons.h"
 #include "controls/tracks/trackgrid.h"
 #include "platform/ado/recordset.h"
 #include "platform/desktop/desktop.h"
+#include "platform/work/longwork.h"
 #include "services/browser.h"
 #include "services/captions.h"
 #include "services/frame.h"
@@ -25,23 +26,9 @@ using namespace Qt::StringLiterals;
 namespace
 {
 
-const auto modeNew = "I"_L1, modeExisting = "U"_L1;
-
-const auto nextTitleId = u"Select max(id) + 1 as N from CDTitels"_s;
-const auto idField = "N"_L1;
-
-// Buttons of the toolbar, counted from 0, that need the focus in the grid.
-constexpr int insertTrack = 3, deleteTrack = 4, previousTrack = 10;
-
 void pump()
 {
     Desktop::current().pump();
-}
-
-// To the control that has the focus, which need not be the grid.
-void send(const char *keys)
-{
-    Desktop::current().sendKeys(QLatin1String(keys));
 }
 
 } // namespace
@@ -53,6 +40,8 @@ void CdEditor::setUp(const Controls &controls, const Kind &kind)
     mControls = controls;
     mKind = kind;
     mFields = new HeaderFields(controls.fields, this);
+    mTracks = new TrackButtons(controls.disk, controls.toolbar, this);
+    mPosition.setDisk(controls.disk);
     setCancelButton(controls.cancel);
     (controls.fields.artist ? controls.fields.artist : controls.fields.title)->setFocus();
     controls.toolbar->setAccessibleName(GetMessage("xToolbar"));
@@ -65,26 +54,25 @@ void CdEditor::setUp(const Controls &controls, const Kind &kind)
 
 void CdEditor::connectFields()
 {
-    connect(mFields, &HeaderFields::firstTrackWanted, this, &CdEditor::GoToFirstTrack);
-    connect(mFields, &HeaderFields::lastTrackWanted, this, &CdEditor::GoToLastTrack);
-    connect(mFields, &HeaderFields::newDiscWanted, this, [this] { command(&CdEditor::AddDisc); });
+    connect(mFields, &HeaderFields::firstTrackWanted, mTracks, &TrackButtons::GoToFirstTrack);
+    connect(mFields, &HeaderFields::lastTrackWanted, mTracks, &TrackButtons::GoToLastTrack);
+    connect(mFields, &HeaderFields::newDiscWanted, this,
+            [this] { command([this] { AddDisc(); }); });
     connect(mFields, &HeaderFields::discDeletionWanted, this,
-            [this] { command(&CdEditor::DeleteDiscLocked); });
+            [this] { command([this] { DeleteDiscLocked(); }); });
 }
 
 void CdEditor::connectDisk()
 {
     TrackGrid *disk = mControls.disk;
-    connect(disk, &TrackGrid::GotFocus, this, [this] { setDiskHasFocus(true); });
-    connect(disk, &TrackGrid::LostFocus, this, [this] { setDiskHasFocus(false); });
     connect(disk, &TrackGrid::LockScreen, this, &freezeFrame);
     connect(disk, &TrackGrid::UnlockScreen, this, &releaseFrame);
     connect(disk, &TrackGrid::LeaveForward, this, [this] { behindLastTrack()->setFocus(); });
     connect(disk, &TrackGrid::LeaveBackward, this, [this] { mControls.fields.year->setFocus(); });
     connect(disk, &TrackGrid::RequestSave, this, &CdEditor::SaveKeepingPosition);
-    connect(disk, &TrackGrid::RequestAddDisc, this, [this] { command(&CdEditor::AddDisc); });
+    connect(disk, &TrackGrid::RequestAddDisc, this, [this] { command([this] { AddDisc(); }); });
     connect(disk, &TrackGrid::RequestDeleteDisc, this,
-            [this] { command(&CdEditor::DeleteDiscLocked); });
+            [this] { command([this] { DeleteDiscLocked(); }); });
 }
 
 // The toolbar lines up with the fields. Its buttons take no focus: the keys that they send go to
@@ -109,27 +97,19 @@ void CdEditor::connectToolbar()
     const auto on = [this, &actions](int button, auto routine) {
         connect(actions.at(button), &QAction::triggered, this, routine);
     };
-    on(0, [this] { command(&CdEditor::AddDisc); });
-    on(1, [this] { command(&CdEditor::DeleteDiscLocked); });
-    on(2, &CdEditor::SaveKeepingPosition);
-    on(insertTrack, [] { send("Ins"); });
-    on(deleteTrack, [] { send("End"); });
-    on(5, &CdEditor::GoToFirstTrack);
-    on(6, &CdEditor::GoToLastTrack);
-    on(7, [] { send("Tab"); });
-    on(8, [] { send("Shift+Tab"); });
-    on(9, &CdEditor::GoToNextTrack);
-    on(previousTrack, [] { send("Up"); });
+    on(0, [this] { command([this] { AddDisc(); }); });
+    on(1, [this] { command([this] { DeleteDiscLocked(); }); });
+    on(2, &CdEditor::SaveKeepingPosition); // those behind it are mTracks'
 }
 
 // A command of the user; none is begun while another handles events.
-void CdEditor::command(Routine routine)
+void CdEditor::command(const std::function<void()> &routine)
 {
-    if (mBusy)
+    if (!LongWork::mayBegin(*this))
         return;
-    const QScopedValueRollback<bool> busy(mBusy, true);
+    const LongWork work(*this);
     try {
-        (this->*routine)();
+        routine();
     } catch (const Error &error) {
         if (gConnection)
             gConnection->RollbackTrans();
@@ -140,8 +120,9 @@ void CdEditor::command(Routine routine)
 
 void CdEditor::Form_Load()
 {
-    setDiskHasFocus(false);
-    mPositionSaved = mCloseSilently = false;
+    mTracks->setDiskHasFocus(false);
+    mPosition.forget();
+    mCloseSilently = false;
     makeRoomInFrame(this);
     placeInFrame(this, mKind.left, 0);
     mControls.disk->setLanguage(gLanguage);
@@ -178,6 +159,7 @@ void CdEditor::refuseToLoad(const QString &why)
 void CdEditor::loadNew()
 {
     mSaved = {};
+    mRecord.begin();
     mFields->show(mSaved);
     mControls.discs->setCount(1);
     mControls.disk->setConnection(gConnection.get());
@@ -194,6 +176,7 @@ void CdEditor::loadRecord()
     ShowDisc(1);
     ADODB::Recordset record;
     record.Open(selectRecord(CdId), *gConnection);
+    mRecord.know(CdId);
     mSaved = headerOf(record);
     mFields->show(mSaved);
     const qint64 discs = record.Fields(u"DiscNum").Value().toLong();
@@ -219,149 +202,29 @@ void CdEditor::ShowDisc(int number)
 
 void CdEditor::RememberDiskPosition()
 {
-    mPositionSaved = mDiskHasFocus;
-    if (!mDiskHasFocus)
-        return;
-    pump();
-    mSavedColumn = mControls.disk->CurrentColumn();
-    mSavedRow = mControls.disk->CurrentRow();
+    mPosition.forget();
+    if (mTracks->diskHasFocus())
+        mPosition.remember();
 }
 
 void CdEditor::RestoreDiskPosition()
 {
-    if (!std::exchange(mPositionSaved, false))
-        return;
     if (mSaveFailed && mControls.disk->HasError())
-        return; // the grid has put the cursor on the cell that it refused
-    mSavedRow = std::max(1, mSavedRow);
-    mSavedColumn = std::max(1, mSavedColumn);
-    mControls.disk->setCurrentRow(mSavedRow);
-    pump();
-    mControls.disk->setCurrentColumn(mSavedColumn);
-    pump();
+        mPosition.forget(); // the grid has put the cursor on the cell that it refused
+    mPosition.restore();
 }
 
 QString CdEditor::withPosition(const Error &error) const
 {
-    return QString::number(error.Number) + u'-' + error.Description + u" ( "_s +
-           QString::number(mSavedColumn) + u" - "_s + QString::number(mSavedRow) + u')';
+    return QString::number(error.Number) + u'-' + error.Description + mPosition.text();
 }
 
 void CdEditor::SaveAtUserRequest(bool Reload)
 {
-    if (mBusy)
+    if (!LongWork::mayBegin(*this))
         return;
-    const QScopedValueRollback<bool> busy(mBusy, true);
+    const LongWork work(*this);
     save(Reload);
-}
-
-// By design: an error of the database does not set mSaveFailed. It has been told, and who called
-// goes on as after a success.
-void CdEditor::save(bool reload)
-{
-    mSaveFailed = false;
-    const auto setPointer = [this](PointerShape shape) {
-        Desktop::current().setPointer(this, shape);
-    };
-    setPointer(vbHourglass);
-    try {
-        const Header header = mFields->shown();
-        mSaveFailed = !canBeSaved(header);
-        if (!mSaveFailed)
-            write(header, reload);
-        setPointer(vbDefault);
-    } catch (const Error &error) {
-        setPointer(vbDefault);
-        releaseFrame();
-        errorBox(error.numbered(), GetMessage("MsgSysErr"));
-        if (gConnection)
-            gConnection->RollbackTrans();
-    }
-}
-
-bool CdEditor::canBeSaved(const Header &header)
-{
-    if (const char *gap = gapIn(header)) {
-        Desktop::current().setPointer(this, vbDefault);
-        errorBox(GetMessage(gap));
-        return false;
-    }
-    return header.year.isEmpty() || mFields->ValidateYear();
-}
-
-// The head and the tracks go in one transaction; the clean-up has its own, and follows a save that
-// was taken back as well.
-void CdEditor::write(const Header &header, bool reload)
-{
-    const bool isNew = Mode == modeNew;
-    if (!isNew && Mode != modeExisting)
-        throw Error(0, Name(), QString());
-    if (!gConnection)
-        throw makeError(errObjectClosed);
-    const qint64 earlyId = isNew && mKind.idBeforeTransaction ? nextId(nextTitleId, idField) : 0;
-    ADODB::Transaction transaction(*gConnection);
-    const TitleRow row = isNew ? TitleRow::New : findTitleRow();
-    bool listsChange =
-        row == TitleRow::Gone || header.title != mSaved.title || header.artist != mSaved.artist;
-    mSaveFailed = row == TitleRow::Anothers;
-    if (!mSaveFailed) {
-        writeTitle(row, earlyId, header);
-        listsChange |= mControls.disk->IsChanged();
-        pump();
-        mControls.disk->SaveDisc();
-        mSaveFailed = mControls.disk->HasError();
-    }
-    if (mSaveFailed) {
-        transaction.RollbackTrans();
-    } else {
-        transaction.CommitTrans();
-        committed(header, listsChange, reload);
-    }
-    if (row == TitleRow::Anothers)
-        errorBox(GetMessage("xOtherRecord"));
-    CleanOrphans();
-}
-
-// The row may have been deleted by the browser, or swept after a save without tracks, and its id
-// given to another record. One that says what was last saved here is ours.
-CdEditor::TitleRow CdEditor::findTitleRow() const
-{
-    ADODB::Recordset answer;
-    answer.Open(selectIsOwn(CdId, mSaved), *gConnection);
-    if (answer.isEOF())
-        return TitleRow::Gone;
-    return answer.Fields(0).Value().toLong() ? TitleRow::Ours : TitleRow::Anothers;
-}
-
-// A row that has gone is put back under its id: links without a title must not arise.
-void CdEditor::writeTitle(TitleRow row, qint64 newId, const Header &header)
-{
-    beforeTitle(header);
-    if (row == TitleRow::New)
-        CdId = newId ? newId : nextId(nextTitleId, idField);
-    if (row != TitleRow::Ours)
-        gConnection->Execute(insertTitle(CdId, header));
-    else if (header != mSaved)
-        gConnection->Execute(updateTitle(CdId, header));
-    if (row == TitleRow::New)
-        mControls.disk->setCdId(CdId);
-    else
-        afterTitle(header, mSaved);
-}
-
-// By design: genre and year stand in no list, so a change of theirs alone refreshes none.
-void CdEditor::committed(const Header &header, bool listsChange, bool reload)
-{
-    Mode = modeExisting;
-    if (reload)
-        mControls.disk->LoadDisc();
-    if (listsChange) {
-        refreshBrowser();
-        takeFocus();
-        pump();
-    }
-    mSaved = header;
-    takeFocus();
 }
 
 void CdEditor::takeFocus()
@@ -372,7 +235,7 @@ void CdEditor::takeFocus()
 
 void CdEditor::SaveKeepingPosition()
 {
-    command(&CdEditor::saveCommand);
+    command([this] { saveCommand(); });
 }
 
 void CdEditor::saveCommand()
@@ -380,9 +243,7 @@ void CdEditor::saveCommand()
     freezeFrame();
     try {
         RememberDiskPosition();
-        pump();
         save(true);
-        pump();
         RestoreDiskPosition();
     } catch (const Error &error) {
         errorBox(withPosition(error), mKind.positionTitle);
@@ -393,11 +254,11 @@ void CdEditor::saveCommand()
 // The user's own; one that comes in while another's events are handled is taken back.
 void CdEditor::DiscsTab_Click(int leftBehind)
 {
-    if (mBusy) {
+    if (!LongWork::mayBegin(*this)) {
         mControls.discs->showTab(leftBehind);
         return;
     }
-    const QScopedValueRollback<bool> busy(mBusy, true);
+    const LongWork work(*this);
     changeDisc(leftBehind);
 }
 
@@ -413,15 +274,15 @@ void CdEditor::goToTab(int tab)
 
 void CdEditor::GoToTrack(int disc, int track)
 {
-    if (mBusy || disc < 1 || disc > mControls.discs->count())
+    if (disc < 1 || disc > mControls.discs->count() || !LongWork::mayBegin(*this))
         return;
-    const QScopedValueRollback<bool> busy(mBusy, true);
+    const LongWork work(*this);
     goToTab(disc - 1);
     if (mControls.discs->currentIndex() != disc - 1)
         return; // the disc that showed could not be saved, and stays
     mControls.disk->setCurrentRow(track);
     mControls.disk->setCurrentColumn(1);
-    focusDisk();
+    mTracks->focusDisk();
 }
 
 // By design: the disc left behind is saved without a question; and after an error the hourglass
@@ -454,19 +315,16 @@ void CdEditor::changeDisc(int leftBehind)
 void CdEditor::AddDisc()
 {
     freezeFrame();
-    pump();
     RememberDiskPosition();
     save(true);
-    pump();
     if (mSaveFailed) {
         informationBox(GetMessage("MsgAddDisc"));
         RestoreDiskPosition();
-        pump();
     } else {
         mControls.discs->add();
         goToTab(mControls.discs->count() - 1); // which shows the disc
-        pump();
     }
+    pump();
     releaseFrame();
 }
 
@@ -475,7 +333,6 @@ void CdEditor::DeleteDiscLocked()
     freezeFrame();
     pump();
     DeleteDisc();
-    pump();
     releaseFrame();
 }
 
@@ -489,66 +346,30 @@ void CdEditor::DeleteDisc()
         return;
     }
     const QScopedValueRollback<bool> deleting(mDeletingDisc, true);
-    const bool inDisk = mDiskHasFocus;
+    const bool inDisk = mTracks->diskHasFocus();
     const int tab = mControls.discs->currentIndex();
-    mControls.disk->RemoveDisc();
+    if (!removeDisc())
+        return;
     mCloseSilently = true;
     Reload();
     if (inDisk)
-        focusDisk();
+        mTracks->focusDisk();
     goToTab(std::min(tab, mControls.discs->count() - 1));
-    if (mDiskHasFocus) {
+    if (mTracks->diskHasFocus()) {
         mControls.disk->setCurrentRow(1);
         mControls.disk->setCurrentColumn(1);
     }
     CleanOrphans();
+    mRecord.know(CdId);
     refreshBrowser();
     pump();
     takeFocus();
-    pump();
-}
-
-// A reason that does not stop at an empty year.
-void CdEditor::focusDisk()
-{
-    mControls.disk->setFocus(Qt::ShortcutFocusReason);
-}
-
-void CdEditor::GoToFirstTrack()
-{
-    if (!mDiskHasFocus)
-        focusDisk();
-    send("PgUp");
-}
-
-void CdEditor::GoToLastTrack()
-{
-    if (!mDiskHasFocus)
-        focusDisk();
-    send("PgDown");
-}
-
-// By design: without the focus in the grid this only moves it there.
-void CdEditor::GoToNextTrack()
-{
-    if (mDiskHasFocus)
-        send("Down");
-    else
-        focusDisk();
-}
-
-void CdEditor::setDiskHasFocus(bool has)
-{
-    mDiskHasFocus = has;
-    const auto actions = mControls.toolbar->actions();
-    for (const int button : {insertTrack, deleteTrack, previousTrack})
-        actions.at(button)->setEnabled(has);
 }
 
 // By design: nothing is asked here, whatever has changed.
 void CdEditor::cmdCancel_Click()
 {
-    if (mBusy)
+    if (isBusy())
         return;
     mCloseSilently = true;
     Unload();
@@ -561,9 +382,9 @@ bool CdEditor::isChanged() const
 
 bool CdEditor::QueryUnload()
 {
-    if (mBusy && !mDeletingDisc)
+    if (!mCloseSilently && isChanged() && !LongWork::mayBegin(*this))
         return false;
-    const QScopedValueRollback<bool> busy(mBusy, true);
+    const Busy asking(*this);
     RememberDiskPosition();
     if (!mCloseSilently && !saveBeforeClosing())
         return false;
@@ -578,7 +399,7 @@ bool CdEditor::saveBeforeClosing()
     freezeFrame();
     if (!isChanged() || askYesNo(GetMessage("QuestSaveChanges")) != vbYes)
         return true;
-    if (mDiskHasFocus)
+    if (mTracks->diskHasFocus())
         mControls.disk->CommitEdit();
     save(false);
     if (!mSaveFailed)

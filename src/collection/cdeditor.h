@@ -1,16 +1,22 @@
 #pragma once
 
+#include "collection/diskposition.h"
 #include "collection/headerfields.h"
+#include "collection/heldrecord.h"
 #include "platform/desktop/form.h"
+
+#include <functional>
 
 class DiscTabs;
 class QToolBar;
+class TrackButtons;
 class TrackGrid;
 class Error;
 namespace ADODB
 {
 class Recordset;
-}
+class Transaction;
+} // namespace ADODB
 
 /// What the editors of compilations and albums have in common, which is nearly all: a head that the
 /// form reads and writes, a tab for each disc, and a grid with the tracks of the disc that shows.
@@ -38,7 +44,15 @@ public:
     /// what is not there is left alone.
     void GoToTrack(int disc, int track);
 
+    // Of a record that somebody else deletes: whether it is the one here, what is to be kept of it
+    // before, and that it has gone.
+    bool holds(qint64 id) const;
+    void keepForAnew();
+    void recordDeleted();
+
 protected:
+    static constexpr QLatin1String modeNew{"I"}, modeExisting{"U"};
+
     struct Controls {
         HeaderFields::Fields fields;
         DiscTabs *discs;
@@ -60,7 +74,6 @@ protected:
     // What the two kinds differ in. All statements are about the row of CDTitels with this id.
     virtual const char *gapIn(const Header &header) const = 0; // key of what to say, or nullptr
     virtual QString selectRecord(qint64 id) const = 0; // CDTitle, Genre, hitjaar, DiscNum; Artiest
-    virtual QString selectIsOwn(qint64 id, const Header &saved) const = 0; // 0 or 1, or no row
     virtual QString insertTitle(qint64 id, const Header &header) const = 0;
     virtual QString updateTitle(qint64 id, const Header &header) const = 0;
     virtual void beforeTitle(const Header &) {}                          // in the transaction
@@ -72,12 +85,10 @@ protected:
     bool QueryUnload() override;
 
 private:
-    using Routine = void (CdEditor::*)();
-
     void connectFields();
     void connectDisk();
     void connectToolbar();
-    void command(Routine routine);
+    void command(const std::function<void()> &routine);
 
     void load();
     void refuseToLoad(const QString &why);
@@ -86,13 +97,12 @@ private:
     Header headerOf(ADODB::Recordset &record) const;
     void ShowDisc(int number);
 
-    enum class TitleRow { New, Ours, Gone, Anothers };
-
     bool canBeSaved(const Header &header);
     void save(bool reload);
     void write(const Header &header, bool reload);
-    TitleRow findTitleRow() const;
-    void writeTitle(TitleRow row, qint64 newId, const Header &header);
+    void writeTitle(bool anew, qint64 newId, const Header &header);
+    void commit(ADODB::Transaction &transaction, const Header &header, bool reload,
+                bool tracksChanged);
     void committed(const Header &header, bool listsChange, bool reload);
     void saveCommand();
 
@@ -104,11 +114,10 @@ private:
     void AddDisc();
     void DeleteDisc();
     void DeleteDiscLocked();
-    void GoToFirstTrack();
-    void GoToLastTrack();
-    void GoToNextTrack();
-    void focusDisk();
-    void setDiskHasFocus(bool has);
+    bool removeDisc();
+    void loseRecord(const char *message);
+    void showLost(bool lost);
+    TrackStore::Artists artists() const;
     void cmdCancel_Click();
     bool saveBeforeClosing();
     bool isChanged() const;
@@ -117,12 +126,11 @@ private:
     Controls mControls{};
     Kind mKind{};
     HeaderFields *mFields = nullptr;
+    TrackButtons *mTracks = nullptr;
     Header mSaved; // as last loaded or saved
-    int mSavedRow = 0, mSavedColumn = 0;
-    bool mPositionSaved = false;
-    bool mDiskHasFocus = false;
+    HeldRecord mRecord;
+    DiskPosition mPosition;
     bool mCloseSilently = false;
     bool mSaveFailed = false;
     bool mDeletingDisc = false;
-    bool mBusy = false;
 };

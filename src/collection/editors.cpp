@@ -21,12 +21,11 @@ template <typename Editor> CdEditor *open(const QString &mode, qint64 id)
     return editor;
 }
 
-// A new record may still carry the id of a save that was taken back; it is not that record.
 template <typename Editor> Editor *find(qint64 id)
 {
     for (Form *form : Form::openForms()) {
         auto *editor = qobject_cast<Editor *>(form);
-        if (editor && editor->CdId == id && editor->Mode != "I"_L1)
+        if (editor && editor->holds(id))
             return editor;
     }
     return nullptr;
@@ -68,6 +67,18 @@ void editTrack(bool isCompilation, qint64 id, int disc, int track)
     CdEditor *editor = isCompilation ? edit<frmCDRoot>(id) : edit<frmCDRootE>(id);
     if (!editor->isUnloaded())
         editor->GoToTrack(disc, track);
+}
+
+void aboutToDelete(qint64 id)
+{
+    if (auto *editor = find<CdEditor>(id))
+        editor->keepForAnew();
+}
+
+void deleted(qint64 id)
+{
+    if (auto *editor = find<CdEditor>(id))
+        editor->recordDeleted();
 }
 
 // One may go while the events of another are handled.

@@ -16,6 +16,11 @@ void editAlbum(qint64 id);
 /// Brings up the editor of a record at one of its tracks, both counted from 1.
 void editTrack(bool isCompilation, qint64 id, int disc, int track);
 
+/// Before a record is deleted, in the same transaction, and behind it: its editor keeps what it
+/// does not show, and knows that the record is gone. Throws Error.
+void aboutToDelete(qint64 id);
+void deleted(qint64 id);
+
 /// Saves what is open in editors, in the order in which they were opened.
 void saveAll();
 

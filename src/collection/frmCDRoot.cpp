@@ -54,12 +54,6 @@ QString frmCDRoot::selectRecord(qint64 id) const
            QString::number(id) + u" group by cdt.id,cdt.titel,cdt.genre,cdt.hitjaar"_s;
 }
 
-QString frmCDRoot::selectIsOwn(qint64 id, const Header &saved) const
-{
-    return u"select iif(cd_type = 'V' and titel = "_s + quoted(saved.title) +
-           u", 1, 0) as Own from CDTitels where id = "_s + QString::number(id);
-}
-
 QString frmCDRoot::insertTitle(qint64 id, const Header &header) const
 {
     return u"Insert into CDTitels(id,titel,cd_type,genre,hitjaar) "

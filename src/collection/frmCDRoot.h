@@ -22,7 +22,6 @@ public:
 protected:
     const char *gapIn(const Header &header) const override;
     QString selectRecord(qint64 id) const override;
-    QString selectIsOwn(qint64 id, const Header &saved) const override;
     QString insertTitle(qint64 id, const Header &header) const override;
     QString updateTitle(qint64 id, const Header &header) const override;
     QWidget *behindLastTrack() const override;

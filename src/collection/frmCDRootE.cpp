@@ -59,15 +59,6 @@ QString frmCDRootE::selectRecord(qint64 id) const
            QString::number(id) + u" group by cdt.id,art.naam, cdt.titel,cdt.genre,cdt.hitjaar"_s;
 }
 
-QString frmCDRootE::selectIsOwn(qint64 id, const Header &saved) const
-{
-    return u"select iif(cdt.cd_type = 'E' and cdt.titel = "_s + quoted(saved.title) +
-           u" and exists (select '1' from Artiesten art where art.id = "
-           "cdt.artiest_id and art.naam = "_s +
-           quoted(saved.artist) + u"), 1, 0) as Own from CDTitels cdt where cdt.id = "_s +
-           QString::number(id);
-}
-
 QString frmCDRootE::insertTitle(qint64 id, const Header &header) const
 {
     return u"Insert into CDTitels(id,titel,artiest_id,cd_type,genre,hitjaar) "

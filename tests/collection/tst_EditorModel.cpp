@@ -1,5 +1,6 @@
 // Label: screen
 #include "catalogue/cleanorphans.h"
+#include "catalogue/quoting.h"
 #include "collection/browserlists.h"
 #include "collection/frmCDRoot.h"
 #include "collection/frmCDRootE.h"
@@ -50,7 +51,7 @@ private:
         qint64 id = 0;
         if (!mPicture.empty() && random(3) > 0) {
             const auto chosen = std::next(mPicture.begin(), random(int(mPicture.size())));
-            id = chosen->first;
+            id = mShown.id = chosen->first;
             mShown.record = chosen->second;
             mShown.isNew = false;
             mShown.tabs = mShown.record.discs.rbegin()->first;
@@ -127,11 +128,19 @@ private:
         mE->field("txtArtiest")->setText(mShown.record.artist);
     }
 
+    // The next save says that the record was deleted, and offers to enter it anew.
+    void expectAnew()
+    {
+        if (mShown.isLost)
+            mE->desktop.expectBox(GetMessage("xSaveAnew"), vbYes);
+    }
+
     void goToDisc()
     {
         const int tab = random(mShown.tabs);
         if (tab == mShown.discNo - 1)
             return;
+        expectAnew();
         mE->tabs()->setCurrentIndex(tab);
         shownIsSaved();
         mShown.discNo = tab + 1;
@@ -144,6 +153,7 @@ private:
     {
         if (mShown.tabs == 4)
             return;
+        expectAnew();
         mE->button(1)->trigger();
         shownIsSaved();
         mShown.discNo = ++mShown.tabs;
@@ -158,6 +168,12 @@ private:
         if (mShown.tabs == 1) {
             mE->desktop.expectBox(GetMessage("MsgDiscDel"));
             mE->button(2)->trigger();
+            return;
+        }
+        if (mShown.isLost) {
+            mE->desktop.expectBox(GetMessage("xRecordDeleted"));
+            mE->button(2)->trigger();
+            compare();
             return;
         }
         const qint64 id = mE->editor->CdId;
@@ -192,6 +208,7 @@ private:
 
     void saveNow()
     {
+        expectAnew();
         if (random(2))
             mE->editor->SaveKeepingPosition();
         else
@@ -206,6 +223,7 @@ private:
         if (how == 0) {
             mE->editor->findChild<QAbstractButton *>(u"cmdCancel"_s)->click();
         } else {
+            expectAnew();
             mE->editor->SaveAtUserRequest();
             shownIsSaved();
             QVERIFY2(mE->editor->close(), "nothing is left to ask about");
@@ -222,23 +240,48 @@ private:
         const int boxes = int(mE->desktop.boxes.size());
         mE->addTracks({mShown.record.isAlbum ? u"Late"_s : u"Zoe|Late"_s});
         mShown.disc.push_back({u"Zoe"_s, u"Late"_s});
+        expectAnew();
         mE->desktop.expectBox(u"refused"_s);
         mE->editor->SaveAtUserRequest();
-        QCOMPARE(int(mE->desktop.boxes.size()), boxes + 1);
+        QCOMPARE(int(mE->desktop.boxes.size()), boxes + 1 + mShown.isLost);
         mE->catalogue.exec("drop trigger refuse");
         QCOMPARE(stored(), before);
         saveNow();
     }
 
-    // The editor is not told. What it shows comes back with the next save.
+    // All of it comes back with the next save, under an id of its own: the old one may have been
+    // given to somebody who has typed it in again.
     void deleteInBrowser()
     {
-        if (mShown.isNew || random(3) > 0)
+        const qint64 id = mE->editor->CdId;
+        if (mShown.isNew || mShown.isLost || !mPicture.contains(id) || random(3) > 0)
             return;
-        browserlists::deleteTitle(mE->editor->CdId);
+        const Record before = mPicture[id];
+        browserlists::deleteTitle(id);
         CleanOrphans();
-        mPicture.erase(mE->editor->CdId);
-        mShown.record.discs.clear();
+        mPicture.erase(id);
+        mShown.isLost = true;
+        compare();
+        if (!before.isAlbum && random(2))
+            retype(id, before.title);
+    }
+
+    void retype(qint64 id, const QString &title)
+    {
+        const auto highest = [&](const char *table) {
+            return mE->catalogue.rows(
+                QString(u"select ifnull(max(ID), 0) + 1 from "_s + QLatin1String(table)))[0];
+        };
+        const QString zed = mE->catalogue.rows("select ID from Artiesten where Naam='Zed'")
+                                .value(0, highest("Artiesten"));
+        mE->catalogue.exec(u"insert or ignore into Artiesten values (%1, 'Zed'); "
+                           "insert into Tracks values (%2, %1, 'Retyped %4', null, null); "
+                           "insert into CDTitels values (%3, %5, null, 'V', null, null); "
+                           "insert into CompactDiscs values (%6, %3, 1, 1, %2, null)"_s.arg(
+                               zed, highest("Tracks"), QString::number(id),
+                               QString::number(++mRetyped), quoted(title),
+                               highest("CompactDiscs")));
+        mPicture[id] = {false, {}, title, {{1, {{u"Zed"_s, u"Retyped %1"_s.arg(mRetyped)}}}}};
         compare();
     }
 
@@ -249,10 +292,12 @@ private:
         record.discs.erase(mShown.discNo);
         if (!mShown.disc.empty())
             record.discs[mShown.discNo] = mShown.disc;
-        mShown.isNew = false;
-        mPicture.erase(mE->editor->CdId);
+        if (!mShown.isLost)
+            mPicture.erase(mShown.id); // one that was without tracks gets another
+        mShown.isNew = mShown.isLost = false;
+        mShown.id = mE->editor->CdId;
         if (!record.discs.empty())
-            mPicture[mE->editor->CdId] = record;
+            mPicture[mShown.id] = record;
         compare();
     }
 
@@ -315,12 +360,15 @@ private:
         int discNo = 1, tabs = 1;
         Disc disc; // the one in the grid
         bool isNew = true;
+        qint64 id = 0;
+        bool isLost = false; // deleted in the browser
     };
 
     QRandomGenerator mRandom;
     std::unique_ptr<Editing> mE;
     Picture mPicture;
     Shown mShown;
+    int mRetyped = 0;
 
 private slots:
     void randomActions_data()

@@ -1,4 +1,5 @@
 // Label: screen
+#include "collection/browserlists.h"
 #include "collection/frmCDRoot.h"
 #include "platform/ado/connection.h"
 #include "support/editing.h"
@@ -410,10 +411,57 @@ private slots:
             "delete from CompactDiscs where CDTitels_ID=3; delete from CDTitels where "
             "ID=3; delete from Tracks where ID<4; delete from Artiesten where ID<3");
         mE->addTracks(texts("Dora|Five"));
+        mE->desktop.expectBox(u"Nothing was saved"_s);
         editor->SaveKeepingPosition();
-        QCOMPARE(mE->catalogue.rows(titleRow.arg(3)), texts("It's 100%1|V|Rock|1999|NULL"));
-        QCOMPARE(mE->tracks(3), texts("1/1 Anna - One", "1/2 Bob - Two", "1/3 Dora - Five"));
+        QCOMPARE(three(), QStringList());
+        mE->desktop.expectBox(u"save it anew"_s, vbYes);
+        editor->SaveKeepingPosition();
+        QCOMPARE(mE->catalogue.rows(titleRow.arg(5)), texts("It's 100%1|V|Rock|1999|NULL"));
+        QCOMPARE(mE->tracks(5), texts("1/1 Anna - One", "1/2 Bob - Two", "1/3 Dora - Five"));
         QCOMPARE(mE->browser->refreshed, 1);
+    }
+
+    // A click on a tab does not bring it back; agreeing does, with all discs and beside the one
+    // that has its id by now.
+    void aRecordDeletedInTheBrowser()
+    {
+        openThree();
+        browserlists::deleteTitle(3);
+        mE->catalogue.exec("insert into CDTitels values (3,'It''s 100%1',null,'V','Rock',1999);"
+                           "insert into CompactDiscs values (9,3,2,1,1,null)");
+        const QStringList retyped = three();
+        mE->desktop.expectBox(u"save it anew"_s, vbNo);
+        mE->desktop.expectBox(GetMessage("MsgDiscNav"));
+        mE->tabs()->setCurrentIndex(1);
+        QCOMPARE(mE->tabs()->currentIndex(), 0);
+        mE->desktop.expectBox(GetMessage("xRecordDeleted"));
+        mE->button(2)->trigger();
+        QCOMPARE(three(), retyped);
+        mE->desktop.expectBox(u"save it anew"_s, vbYes);
+        mE->tabs()->setCurrentIndex(1);
+        QCOMPARE(three(), retyped);
+        QCOMPARE(mE->tracks(5),
+                 texts("1/1 Anna - One", "1/2 Bob - Two", "2/1 Anna - Three", "3/1 Cleo - Four"));
+        QCOMPARE(mE->cell(1, 3), u"Three"_s);
+    }
+
+    // The one saved without tracks has no row to hold on to: what is saved next is not its.
+    void twoNewOnesOfOneTitle()
+    {
+        CdEditor *first = mE->open<frmCDRoot>("I");
+        mE->field("txtTitel")->setText(u"Twins"_s);
+        first->SaveAtUserRequest();
+        CdEditor *second = mE->open<frmCDRoot>("I");
+        mE->field("txtTitel")->setText(u"Twins"_s);
+        mE->addTracks(texts("Bob|Two"));
+        second->SaveAtUserRequest();
+        mE->show(first);
+        mE->addTracks(texts("Anna|One"));
+        first->SaveAtUserRequest();
+        QVERIFY(first->CdId != second->CdId);
+        QCOMPARE(mE->tracks(first->CdId), texts("1/1 Anna - One"));
+        QCOMPARE(mE->tracks(second->CdId), texts("1/1 Bob - Two"));
+        QVERIFY(second->Unload());
     }
 
     void anIdGivenToAnotherMeanwhile()

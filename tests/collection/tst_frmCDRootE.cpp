@@ -168,11 +168,13 @@ private slots:
                  texts("2|1999"));
         mE->catalogue.exec(
             "delete from CompactDiscs where CDTitels_ID=3; delete from CDTitels where ID=3");
+        mE->desktop.expectBox(GetMessage("xSaveAnew"), vbYes);
         editor->SaveAtUserRequest();
-        QCOMPARE(mE->catalogue.rows(
-                     "select Titel, Artiest_ID, CD_Type, Hitjaar from CDTitels where ID=3"),
+        QCOMPARE(mE->catalogue.rows(u"select Titel, Artiest_ID, CD_Type, Hitjaar from CDTitels "
+                                    "where ID="_s +
+                                    QString::number(editor->CdId)),
                  texts("Album|1|E|2001"));
-        QCOMPARE(mE->tracks(3), texts("1/1 Anna - One", "1/2 Anna - Two"));
+        QCOMPARE(mE->tracks(editor->CdId), texts("1/1 Anna - One", "1/2 Anna - Two"));
     }
 };
 

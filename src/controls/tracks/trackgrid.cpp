@@ -452,6 +452,12 @@ void TrackGrid::RemoveDisc()
     go(0, 1);
 }
 
+void TrackGrid::ForgetSaved()
+{
+    mModel->forgetSaved();
+    mSaveFate.reset();
+}
+
 // What was saved in a transaction that was rolled back afterwards is still to be saved.
 void TrackGrid::settleSave() const
 {

@@ -57,6 +57,9 @@ public:
     /// one transaction of its own. Throws Error.
     void RemoveDisc();
 
+    /// The tracks stand in no catalogue any more: all of them are new.
+    void ForgetSaved();
+
     void CommitEdit(); // what is being typed counts as content
 
     /// Whether there is something that SaveDisc would write, what is being typed included. A save

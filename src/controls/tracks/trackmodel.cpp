@@ -232,6 +232,12 @@ void TrackModel::markSaved(const QList<qint64> &links)
     }
 }
 
+void TrackModel::forgetSaved()
+{
+    mSaved = {};
+    mSavedBefore = {};
+}
+
 void TrackModel::unmarkSaved()
 {
     mSaved = mSavedBefore;

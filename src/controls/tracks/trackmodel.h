@@ -65,6 +65,7 @@ public:
 
     /// The tracks of toSave() stand in the catalogue now, under these links.
     void markSaved(const QList<qint64> &links);
+    void forgetSaved(); // and that they ever stood there
     void unmarkSaved(); // the last markSaved() has not happened
 
     int rowCount(const QModelIndex &parent = {}) const override;
