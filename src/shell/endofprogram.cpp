@@ -35,6 +35,14 @@ void EndOfProgram::step()
         refuseWhatStandsOpen();
         return;
     }
+    // Not from here: a timer does not come round while it is answered.
+    QMetaObject::invokeMethod(this, &EndOfProgram::close, Qt::QueuedConnection);
+}
+
+void EndOfProgram::close()
+{
+    if (!NestedLoop::none())
+        return;
     const bool refused = std::exchange(mAsking, true);
     if (mFrame.Unload(refused))
         mStep.stop();

@@ -23,6 +23,7 @@ public:
 
 private:
     void step();
+    void close();
     void refuseWhatStandsOpen();
 
     MainScreen &mFrame;

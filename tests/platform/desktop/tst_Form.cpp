@@ -1,6 +1,7 @@
 // Label: unit
 #include "platform/desktop/drawingfreeze.h"
 #include "platform/desktop/form.h"
+#include "platform/desktop/modalloop.h"
 #include "platform/desktop/nestedloop.h"
 #include "platform/desktop/qtdesktop.h"
 #include "support/datarows.h"
@@ -272,6 +273,41 @@ private slots:
         QCOMPARE(answer(BoxButtons::YesNo), vbYes);
         QCOMPARE(answer(BoxButtons::YesNoCancel), vbCancel);
         QCOMPARE(text, u"<b>\nnext"_s);
+    }
+
+    // A box is open over its form, and the form is unloaded below it.
+    void nothingGoesUnderARoutineThatWaits()
+    {
+        QtDesktop real;
+        QPointer<TestForm> form = new TestForm;
+        form->Show();
+        bool aliveBehindBox = false;
+        inMainLoop([&] {
+            QTimer::singleShot(0, form, [&] {
+                QVERIFY(form->Unload());
+                QTimer::singleShot(60, qApp, [] { refuseModal(); }); // longer than it is looked at
+            });
+            real.messageBox(BoxKind::Error, BoxButtons::Ok, u"wrong"_s, u"t"_s);
+            aliveBehindBox = form;
+        });
+        QVERIFY(aliveBehindBox);
+        QTRY_VERIFY(!form);
+    }
+
+    void allAreAskedBeforeOneGoes()
+    {
+        QPointer<TestForm> willing = new TestForm, refusing = new TestForm;
+        refusing->stays = true;
+        QVERIFY(!Form::UnloadAll({}));
+        QCOMPARE(TestForm::log, u"query query "_s);
+        refusing->stays = false;
+        {
+            const Form::Busy busy(*refusing);
+            QVERIFY(!Form::UnloadAll({}));
+        }
+        TestForm::log.clear();
+        QVERIFY(Form::UnloadAll({}));
+        QCOMPARE(TestForm::log, u"query query unload unloaded unload unloaded "_s);
     }
 };
 
