@@ -6,6 +6,7 @@
 #include "controls/tracks/trackgrid.h"
 #include "platform/ado/recordset.h"
 #include "platform/desktop/desktop.h"
+#include "platform/desktop/modalloop.h"
 #include "platform/work/longwork.h"
 #include "services/browser.h"
 #include "services/captions.h"
@@ -18,6 +19,7 @@
 #include <QLineEdit>
 #include <QPushButton>
 #include <QScopedValueRollback>
+#include <QTimer>
 #include <QToolBar>
 #include <QToolButton>
 
@@ -26,6 +28,8 @@ using namespace Qt::StringLiterals;
 namespace
 {
 
+constexpr int copyInterval = 1000; // milliseconds
+
 void pump()
 {
     Desktop::current().pump();
@@ -33,7 +37,12 @@ void pump()
 
 } // namespace
 
-CdEditor::CdEditor(const QString &name) : Form(name) {}
+CdEditor::CdEditor(const QString &name) : Form(name), mCopyTimer(new QTimer(this))
+{
+    mCopyTimer->setObjectName(u"RecoveryTimer"_s);
+    mCopyTimer->setInterval(copyInterval);
+    connect(mCopyTimer, &QTimer::timeout, this, &CdEditor::keepCopy);
+}
 
 void CdEditor::setUp(const Controls &controls, const Kind &kind)
 {
@@ -125,6 +134,8 @@ void CdEditor::Form_Load()
     mCloseSilently = false;
     makeRoomInFrame(this);
     placeInFrame(this, mKind.left, 0);
+    mCopyTimer->start();
+    mDropCopy = false;
     mControls.disk->setLanguage(gLanguage);
     mFields->show(mSaved);
     try {
@@ -385,6 +396,7 @@ bool CdEditor::QueryUnload()
     if (!mCloseSilently && isChanged() && !LongWork::mayBegin(*this))
         return false;
     const Busy asking(*this);
+    mDropCopy = true;
     RememberDiskPosition();
     if (!mCloseSilently && !saveBeforeClosing())
         return false;
@@ -397,8 +409,12 @@ bool CdEditor::QueryUnload()
 bool CdEditor::saveBeforeClosing()
 {
     freezeFrame();
-    if (!isChanged() || askYesNo(GetMessage("QuestSaveChanges")) != vbYes)
+    if (!isChanged())
         return true;
+    if (askYesNo(GetMessage("QuestSaveChanges")) != vbYes) {
+        mDropCopy = !modalWasRefused(); // a person's answer, not the end of the program
+        return true;
+    }
     if (mTracks->diskHasFocus())
         mControls.disk->CommitEdit();
     save(false);
@@ -408,4 +424,51 @@ bool CdEditor::saveBeforeClosing()
     RestoreDiskPosition();
     releaseFrame();
     return false;
+}
+
+void CdEditor::Form_Unload()
+{
+    mCopyTimer->stop();
+    if (mDropCopy)
+        mCopy.drop();
+    else
+        keepCopy();
+}
+
+UnsavedRecord CdEditor::unsaved() const
+{
+    const bool held = Mode == modeExisting && mRecord.isStored();
+    return {artists() == TrackStore::Artists::OfTitle,
+            held ? CdId : 0,
+            mRecord.content(),
+            mFields->shown(),
+            mControls.disk->DiscNo(),
+            mControls.disk->Tracks(),
+            mRecord.keptDiscs()};
+}
+
+// Between two states of a command there is nothing to keep.
+void CdEditor::keepCopy()
+{
+    if (isBusy())
+        return;
+    if (isChanged())
+        mCopy.keep(unsaved());
+    else
+        mCopy.drop();
+}
+
+void CdEditor::restore(const UnsavedRecord &record, const QString &copy)
+{
+    mCopy.adopt(copy);
+    if (Mode == modeNew)
+        mRecord.beginAnew(record.otherDiscs);
+    const int others = record.otherDiscs.isEmpty() ? 1 : record.otherDiscs.lastKey();
+    mControls.discs->setCount(std::max({record.disc, others, mControls.discs->count()}));
+    mControls.discs->showTab(record.disc - 1);
+    mControls.disk->setCdId(Mode == modeNew ? 0 : CdId);
+    mControls.disk->setDiscNo(record.disc);
+    mControls.disk->LoadDisc();
+    mControls.disk->ShowUnsaved(record.tracks);
+    mFields->show(record.header);
 }

@@ -3,11 +3,13 @@
 #include "collection/diskposition.h"
 #include "collection/headerfields.h"
 #include "collection/heldrecord.h"
+#include "collection/recoverycopy.h"
 #include "platform/desktop/form.h"
 
 #include <functional>
 
 class DiscTabs;
+class QTimer;
 class QToolBar;
 class TrackButtons;
 class TrackGrid;
@@ -50,6 +52,9 @@ public:
     void keepForAnew();
     void recordDeleted();
 
+    /// Behind Show(): what an earlier run has not saved, and the copy that it left of it.
+    void restore(const UnsavedRecord &record, const QString &copy);
+
 protected:
     static constexpr QLatin1String modeNew{"I"}, modeExisting{"U"};
 
@@ -83,6 +88,7 @@ protected:
 
     void Form_Load() override;
     bool QueryUnload() override;
+    void Form_Unload() override;
 
 private:
     void connectFields();
@@ -122,6 +128,8 @@ private:
     bool saveBeforeClosing();
     bool isChanged() const;
     void takeFocus();
+    UnsavedRecord unsaved() const;
+    void keepCopy();
 
     Controls mControls{};
     Kind mKind{};
@@ -130,6 +138,9 @@ private:
     Header mSaved; // as last loaded or saved
     HeldRecord mRecord;
     DiskPosition mPosition;
+    RecoveryCopy mCopy;
+    QTimer *mCopyTimer;
+    bool mDropCopy = false; // the form goes, and nothing of it is wanted any more
     bool mCloseSilently = false;
     bool mSaveFailed = false;
     bool mDeletingDisc = false;

@@ -105,10 +105,9 @@ void CdEditor::writeTitle(bool anew, qint64 newId, const Header &header)
     CdId = newId ? newId : nextId(nextTitleId, idField);
     gConnection->Execute(insertTitle(CdId, header));
     mControls.disk->setCdId(CdId);
-    if (mRecord.state() == HeldRecord::State::Lost) {
+    if (mRecord.state() == HeldRecord::State::Lost)
         mControls.disk->ForgetSaved();
-        mRecord.writeKeptDiscs(CdId, mControls.disk->DiscNo(), artists());
-    }
+    mRecord.writeKeptDiscs(CdId, mControls.disk->DiscNo(), artists());
 }
 
 void CdEditor::commit(ADODB::Transaction &transaction, const Header &header, bool reload,
@@ -118,6 +117,7 @@ void CdEditor::commit(ADODB::Transaction &transaction, const Header &header, boo
     written.know(CdId);
     transaction.CommitTrans();
     mRecord = written;
+    mCopy.drop();
     showLost(false);
     committed(header,
               tracksChanged || header.title != mSaved.title || header.artist != mSaved.artist,

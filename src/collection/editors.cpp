@@ -3,6 +3,8 @@
 #include "collection/frmCDRoot.h"
 #include "collection/frmCDRootE.h"
 #include "platform/desktop/desktop.h"
+#include "platform/desktop/modalloop.h"
+#include "services/messages.h"
 
 using namespace Qt::StringLiterals;
 
@@ -67,6 +69,31 @@ void editTrack(bool isCompilation, qint64 id, int disc, int track)
     CdEditor *editor = isCompilation ? edit<frmCDRoot>(id) : edit<frmCDRootE>(id);
     if (!editor->isUnloaded())
         editor->GoToTrack(disc, track);
+}
+
+void offerUnsaved()
+{
+    for (const RecoveryCopy::Found &found : RecoveryCopy::all()) {
+        const UnsavedRecord &record = found.record;
+        const QString name = record.header.title.trimmed();
+        const QString question =
+            name.isEmpty() ? GetMessage("xUnsavedUntitled")
+                           : GetMessage("xUnsavedPart1") + name + GetMessage("xUnsavedPart2");
+        if (askYesNo(question) != vbYes) {
+            if (!modalWasRefused())
+                RecoveryCopy::remove(found.file);
+            continue;
+        }
+        // One that the catalogue has no longer as it was becomes a new record.
+        HeldRecord held;
+        held.know(record.id);
+        const bool known = held.isStored() && held.content() == record.content;
+        const QString mode = known ? u"U"_s : u"I"_s;
+        CdEditor *editor =
+            record.isAlbum ? open<frmCDRootE>(mode, record.id) : open<frmCDRoot>(mode, record.id);
+        if (!editor->isUnloaded())
+            editor->restore(record, found.file);
+    }
 }
 
 void aboutToDelete(qint64 id)

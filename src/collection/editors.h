@@ -21,6 +21,9 @@ void editTrack(bool isCompilation, qint64 id, int disc, int track);
 void aboutToDelete(qint64 id);
 void deleted(qint64 id);
 
+/// Offers what earlier runs have not saved, one after the other. What is not wanted is gone then.
+void offerUnsaved();
+
 /// Saves what is open in editors, in the order in which they were opened.
 void saveAll();
 

@@ -42,6 +42,12 @@ void HeldRecord::know(qint64 id)
     mState = mContent.isEmpty() ? State::Swept : State::Stored;
 }
 
+void HeldRecord::beginAnew(const QMap<int, QList<StoredTrack>> &discs)
+{
+    begin();
+    mDiscs = discs;
+}
+
 bool HeldRecord::isThere(qint64 id) const
 {
     return isStored() && contentOf(id) == mContent;

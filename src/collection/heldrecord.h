@@ -34,6 +34,12 @@ public:
     /// Before it is deleted: its discs are kept, to be saved anew.
     void keepDiscs(qint64 id, TrackStore::Artists artists);
 
+    QStringList content() const { return mContent; }
+    const QMap<int, QList<StoredTrack>> &keptDiscs() const { return mDiscs; }
+
+    /// A record that was held in an earlier run, to be entered anew.
+    void beginAnew(const QMap<int, QList<StoredTrack>> &discs);
+
     /// Writes the kept discs but the one that an editor shows, as those of a new row.
     void writeKeptDiscs(qint64 id, int shown, TrackStore::Artists artists) const;
 

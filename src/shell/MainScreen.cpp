@@ -191,6 +191,8 @@ void MainScreen::Timer1_Timer()
     openBrowser();
     if (mStart.session == 1)
         ShowHelpLinks();
+    if (gConnection && gConnection->State() == ADODB::adStateOpen)
+        editors::offerUnsaved();
 }
 
 void MainScreen::openBrowser()

@@ -3,11 +3,14 @@
 #include "platform/ado/connection.h"
 #include "support/editing.h"
 #include "support/journey.h"
+#include "support/testcatalogue.h"
 
 #include <QApplication>
+#include <QDir>
 #include <QMdiArea>
 #include <QMdiSubWindow>
 #include <QTabWidget>
+#include <QTimer>
 
 /// A person enters and changes discs in the whole program, with the keyboard alone.
 class tst_Editors : public Journey
@@ -55,6 +58,19 @@ private:
             "order by d.ID, DiskNo, TrackNo)");
         return all.split(u'\n', Qt::SkipEmptyParts);
     }
+
+    // As after a kill: nothing is asked, nothing is cleaned up.
+    void startAgain()
+    {
+        active()->findChild<QTimer *>(u"RecoveryTimer"_s)->setInterval(0);
+        QTRY_COMPARE(QDir(mDesktop->folder + u"/Unsaved"_s).entryList(QDir::Files).size(), 1);
+        mProgram.reset();
+        mProgram = std::make_unique<Program>(*mDesktop);
+        QVERIFY(mProgram->start());
+        mProgram->frame().activateWindow();
+        QVERIFY(QTest::qWaitForWindowActive(&mProgram->frame()));
+    }
+    bool copyIsThere() const { return QFileInfo::exists(mDesktop->folder + u"/Unsaved"_s); }
 
 private slots:
     void aNewCompilationOfTwoDiscs_data() { languages(); }
@@ -159,6 +175,55 @@ private slots:
         QVERIFY(!mProgram->end());
         QVERIFY(mProgram->screen("frmCDRoot")->isVisible());
         mDesktop->expectBox(GetMessage("QuestSaveChanges"), vbNo);
+    }
+
+    void whatWasNotSavedIsOffered_data()
+    {
+        const DataRows<QString, bool, QStringList> row("meanwhile", "again", "stored");
+        const auto saved = texts("Hits 1/1 Anna: One", "Hits 1/2 Bob: Two");
+        row("nothing", "", true, saved);
+        row("it is not wanted", "", false, texts("Hits 1/1 Anna: One"));
+        row("its record has changed", "update CDTitels set Genre='Jazz'", true,
+            texts("Hits 1/1 Anna: One") + saved);
+        row("its record has gone", "delete from CompactDiscs; delete from CDTitels", true, saved);
+    }
+
+    void whatWasNotSavedIsOffered()
+    {
+        QFETCH(QString, meanwhile);
+        QFETCH(bool, again);
+        start(languageEnglish);
+        newCompilation(u"Hits"_s);
+        keyboard::fill({u"Anna"_s, u"One"_s, QString(), QString()});
+        mProgram->choose("mnuSave");
+        QCOMPARE(stored(), texts("Hits 1/1 Anna: One"));
+        QVERIFY(!copyIsThere());
+        keyboard::fill({u"Bob"_s});
+        keyboard::type(u"Two"_s); // in a cell that is still open
+        mDesktop->expectBox(u"\"Hits\" was not saved. Open it again?"_s, again ? vbYes : vbNo);
+        if (!meanwhile.isEmpty())
+            OtherProgram(mDesktop->folder + u"/Compact4.orv"_s).run(meanwhile.toUtf8());
+        startAgain();
+        QCOMPARE(active() != nullptr, again);
+        if (again) {
+            QCOMPARE(active()->findChild<TrackGrid *>()->model()->rowCount(), 3);
+            mProgram->choose("mnuSave");
+        }
+        QTEST(stored(), "stored");
+        QVERIFY(!copyIsThere());
+    }
+
+    void aNewOneIsOfferedToo()
+    {
+        start(languageDutch);
+        newAlbum(u"Anna"_s, QString());
+        keyboard::fill({u"One"_s});
+        mDesktop->expectBox(u"zonder titel"_s, vbYes);
+        startAgain();
+        QCOMPARE(active()->findChild<QLineEdit *>(u"txtArtiest"_s)->text(), u"Anna"_s);
+        active()->findChild<QLineEdit *>(u"txtTitel"_s)->setText(u"Found"_s);
+        mProgram->choose("mnuSave");
+        QCOMPARE(stored(), texts("Found 1/1 Anna: One"));
     }
 };
 

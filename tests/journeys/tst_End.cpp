@@ -236,6 +236,7 @@ private slots:
         cataloguefile::verify(*gConnection, true);
         QCOMPARE(catalogue.count("select count(*) from CompactDiscs"), rows);
         QCOMPARE(catalogue.count("select count(*) from CDTitels where Titel='Typed'"), 0);
+        QCOMPARE(QFileInfo::exists(catalogue.path("Unsaved")), state == "unsaved"); // its copy
         // An output that was quicker than the signal is whole.
         const QByteArray output = readFile(catalogue.path("output.file"));
         QVERIFY(output == "none" || output.count('\n') == rows || output.endsWith("%%EOF\n"));

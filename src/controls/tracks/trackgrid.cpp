@@ -452,6 +452,26 @@ void TrackGrid::RemoveDisc()
     go(0, 1);
 }
 
+QList<StoredTrack> TrackGrid::Tracks() const
+{
+    QList<StoredTrack> tracks;
+    for (const TrackToSave &track : mModel->toSave())
+        tracks.append({track.linkId, track.texts});
+    if (const CellEdit *edit = cellEdit()) {
+        const int row = mModel->trackNumber(currentIndex().row()) - 1;
+        if (row < 0)
+            tracks.append(StoredTrack());
+        (row < 0 ? tracks.last() : tracks[row]).texts[mModel->fieldOf(currentIndex().column())] =
+            TrackModel::fit(edit->text());
+    }
+    return tracks;
+}
+
+void TrackGrid::ShowUnsaved(const QList<StoredTrack> &tracks)
+{
+    mModel->showUnsaved(tracks);
+}
+
 void TrackGrid::ForgetSaved()
 {
     mModel->forgetSaved();

@@ -57,6 +57,12 @@ public:
     /// one transaction of its own. Throws Error.
     void RemoveDisc();
 
+    /// The tracks as they stand in the grid, what is being typed included; link 0: a new one.
+    QList<StoredTrack> Tracks() const;
+
+    /// Behind LoadDisc: these tracks, not saved yet, in the place of those that were loaded.
+    void ShowUnsaved(const QList<StoredTrack> &tracks);
+
     /// The tracks stand in no catalogue any more: all of them are new.
     void ForgetSaved();
 

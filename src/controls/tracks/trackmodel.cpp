@@ -75,6 +75,19 @@ void TrackModel::load(const QList<StoredTrack> &tracks)
     show(rows);
 }
 
+void TrackModel::showUnsaved(const QList<StoredTrack> &tracks)
+{
+    QHash<qint64, int> keys;
+    for (auto saved = mSaved.tracks.cbegin(); saved != mSaved.tracks.cend(); ++saved)
+        keys.insert(saved->linkId, saved.key());
+    QList<Row> rows;
+    for (const StoredTrack &track : tracks) {
+        const int known = keys.take(track.linkId);
+        rows.append(Row{known ? known : ++mLastKey, track.texts});
+    }
+    change(rows, 0, 1);
+}
+
 QString TrackModel::text(int row, TrackField field) const
 {
     return row >= 0 && row < mRows.size() ? mRows[row].texts[field] : QString();

@@ -24,6 +24,10 @@ public:
     /// Shows these tracks and forgets all else, undo included.
     void load(const QList<StoredTrack> &tracks);
 
+    /// Shows these instead, as one step of the user's; those with a link of what was loaded are
+    /// those tracks.
+    void showUnsaved(const QList<StoredTrack> &tracks);
+
     TrackField fieldOf(int column) const { return TrackField(column - 1 + mFirstField); }
     int columnOf(TrackField field) const { return field + 1 - mFirstField; }
     int waitingRow() const { return int(mRows.size()); } // its number: rowCount() - 1

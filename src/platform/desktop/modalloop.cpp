@@ -28,8 +28,11 @@ void runModal(Form &form)
 namespace
 {
 
+bool gRefused = false;
+
 void refuse(const QMessageBox &box)
 {
+    gRefused = true;
     for (const auto answer : {QMessageBox::Cancel, QMessageBox::No, QMessageBox::Ok}) {
         if (QAbstractButton *button = box.button(answer)) {
             button->click();
@@ -39,6 +42,16 @@ void refuse(const QMessageBox &box)
 }
 
 } // namespace
+
+bool modalWasRefused()
+{
+    return gRefused;
+}
+
+void setModalAnswered()
+{
+    gRefused = false;
+}
 
 void refuseModal()
 {

@@ -10,3 +10,7 @@ void runModal(Form &form);
 /// by Cancel, else No, else OK; a screen is unloaded. For an end of the program that nobody is
 /// there to agree to.
 void refuseModal();
+
+/// Whether the last box to close was ended so.
+bool modalWasRefused();
+void setModalAnswered(); // to be called before each box

@@ -129,6 +129,7 @@ BoxAnswer QtDesktop::messageBox(BoxKind kind, BoxButtons buttons, const QString 
     if (buttons == BoxButtons::YesNo)
         box.onlyButtons();
     box.setDefaultButton(buttons == BoxButtons::Ok ? QMessageBox::Ok : QMessageBox::Yes);
+    setModalAnswered();
     return answerOf(run(box));
 }
 
