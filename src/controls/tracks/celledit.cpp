@@ -1,5 +1,6 @@
 #include "controls/tracks/celledit.h"
 
+#include "platform/desktop/sentkey.h"
 #include "services/messages.h"
 
 #include <QAction>
@@ -41,7 +42,7 @@ bool isGridKey(const QKeyEvent &event)
     case Qt::Key_Insert:
         return isPlain(event) || event.modifiers() == Qt::ShiftModifier;
     case Qt::Key_End:
-        return isPlain(event) && !event.spontaneous();
+        return isPlain(event) && SentKey::is(event);
     case Qt::Key_Up:
     case Qt::Key_Down:
     case Qt::Key_PageUp:
@@ -139,7 +140,7 @@ bool CellEdit::takeListKey(QKeyEvent *event)
     if ((isEnter(*event) || isTab(*event)) && entry >= 0)
         choose(entry); // and the grid gets the key
     const bool moves = (down || event->key() == Qt::Key_Up) && isPlain(*event);
-    if (!moves || !event->spontaneous())
+    if (!moves || SentKey::is(*event))
         return false;
     const int to = entry + (down ? 1 : -1);
     if (to < 0)

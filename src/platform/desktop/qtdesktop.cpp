@@ -4,12 +4,12 @@
 #include "platform/desktop/modalloop.h"
 #include "platform/desktop/nestedloop.h"
 #include "platform/desktop/programfolder.h"
+#include "platform/desktop/sentkey.h"
 #include "platform/text/textrules.h"
 
 #include <QApplication>
 #include <QDesktopServices>
 #include <QFileDialog>
-#include <QKeyEvent>
 #include <QKeySequence>
 #include <QMessageBox>
 #include <QPrintDialog>
@@ -212,7 +212,7 @@ void QtDesktop::sendKeys(const QString &keys)
             QWidget *to = QApplication::focusWidget();
             if (!to)
                 to = QApplication::activeWindow();
-            QKeyEvent event(type, key.key(), key.keyboardModifiers());
+            SentKey event(type, key.key(), key.keyboardModifiers());
             if (to)
                 QApplication::sendEvent(to, &event);
         }

@@ -11,6 +11,30 @@
 #include <QSignalSpy>
 #include <QVBoxLayout>
 
+namespace
+{
+
+/// Takes each typed key and posts it again, as the bridge to a screen reader does.
+class ScreenReader : public QObject
+{
+public:
+    ScreenReader() { qApp->installEventFilter(this); }
+
+protected:
+    bool eventFilter(QObject *to, QEvent *event) override
+    {
+        const auto type = event->type();
+        if ((type != QEvent::KeyPress && type != QEvent::KeyRelease) || !event->spontaneous())
+            return false;
+        const auto *key = static_cast<QKeyEvent *>(event);
+        QCoreApplication::postEvent(to,
+                                    new QKeyEvent(type, key->key(), key->modifiers(), key->text()));
+        return true;
+    }
+};
+
+} // namespace
+
 /// Both track grids on a screen with a field before and one behind, as a person uses them.
 class tst_Disk : public ScreenTest
 {
@@ -50,6 +74,12 @@ private:
             transaction.CommitTrans();
     }
 
+    static void handlePostedKeys()
+    {
+        QCoreApplication::sendPostedEvents(nullptr, QEvent::KeyPress);
+        QCoreApplication::sendPostedEvents(nullptr, QEvent::KeyRelease);
+    }
+
     // Plain text; "{Key}" and "{Mod+Key}" are typed keys.
     void type(const char *keys)
     {
@@ -58,13 +88,16 @@ private:
         while (it.hasNext()) {
             const auto match = it.next();
             if (match.captured(1).isEmpty()) {
-                for (const QChar c : match.captured(2))
+                for (const QChar c : match.captured(2)) {
                     QTest::sendKeyEvent(QTest::Click, QApplication::focusWidget(), Qt::Key_unknown,
                                         QString(c), Qt::NoModifier);
+                    handlePostedKeys();
+                }
                 continue;
             }
             const QKeyCombination key = QKeySequence(match.captured(1))[0];
             QTest::keyClick(QApplication::focusWidget(), key.key(), key.keyboardModifiers());
+            handlePostedKeys();
         }
     }
 
@@ -135,6 +168,8 @@ private slots:
         row("x{Home}y{End}z{Return}", "yxz,Waterloo,Pop,1974/Beck,Loser,,1994/", "2.2");
         row("x{Insert}", ",,,/x,Waterloo,Pop,1974/Beck,Loser,,1994/", "1.2");
         row("{End}", "Beck,Loser,,1994/", "1.2");
+        row("b{Down}{Down}{Return}", "Belle and Sebastian,Waterloo,Pop,1974/Beck,Loser,,1994/",
+            "2.2");
     }
 
     void typing()
@@ -145,6 +180,13 @@ private slots:
         QTEST(cells(), "cells");
         QTEST(place(), "place");
         QVERIFY(mScreen->isVisible());
+    }
+
+    void typingWithAScreenReader_data() { typing_data(); }
+    void typingWithAScreenReader()
+    {
+        const ScreenReader reader;
+        typing();
     }
 
     // A button of the screen sends keys, here while a cell is being edited, suggestions open.
