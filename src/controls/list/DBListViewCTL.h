@@ -91,7 +91,6 @@ protected:
     void focusOutEvent(QFocusEvent *event) override;
     void hideEvent(QHideEvent *event) override;
     void changeEvent(QEvent *event) override;
-    bool viewportEvent(QEvent *event) override;
     void paintEvent(QPaintEvent *event) override;
 
 private:

@@ -7,12 +7,10 @@
 #include "controls/list/rowdrag.h"
 
 #include <QApplication>
-#include <QHelpEvent>
 #include <QMouseEvent>
 #include <QPointer>
 #include <QScrollBar>
 #include <QStyleOption>
-#include <QToolTip>
 
 #include <algorithm>
 
@@ -230,20 +228,4 @@ void DBListViewCTL::hideEvent(QHideEvent *event)
 {
     mDrag->end();
     QTableView::hideEvent(event);
-}
-
-// A text that its column cuts off is shown whole where the mouse rests.
-bool DBListViewCTL::viewportEvent(QEvent *event)
-{
-    if (event->type() != QEvent::ToolTip)
-        return QTableView::viewportEvent(event);
-    const auto *help = static_cast<QHelpEvent *>(event);
-    const QModelIndex cell = indexAt(help->pos());
-    const QString text = cell.data().toString();
-    if (text.isEmpty() || sizeHintForIndex(cell).width() <= columnWidth(cell.column()))
-        QToolTip::hideText();
-    else // plain text, whatever signs it holds
-        QToolTip::showText(help->globalPos(), u"<span>"_s + text.toHtmlEscaped() + u"</span>"_s,
-                           viewport(), visualRect(cell));
-    return true;
 }

@@ -4,6 +4,8 @@
 #include <QHelpEvent>
 #include <QToolTip>
 
+using namespace Qt::StringLiterals;
+
 void RowDelegate::initStyleOption(QStyleOptionViewItem *option, const QModelIndex &index) const
 {
     QStyledItemDelegate::initStyleOption(option, index);
@@ -16,7 +18,11 @@ bool RowDelegate::helpEvent(QHelpEvent *event, QAbstractItemView *view,
     if (event->type() != QEvent::ToolTip || !view->toolTip().isEmpty())
         return false;
     const bool cut = index.isValid() && sizeHint(option, index).width() > option.rect.width();
-    const QString text = cut ? index.data().toString().toHtmlEscaped() : QString();
-    QToolTip::showText(event->globalPos(), text, view->viewport(), option.rect);
+    if (cut) // plain text, whatever signs it holds
+        QToolTip::showText(event->globalPos(),
+                           u"<span>"_s + index.data().toString().toHtmlEscaped() + u"</span>"_s,
+                           view->viewport(), option.rect);
+    else
+        QToolTip::hideText();
     return true;
 }
