@@ -22,6 +22,11 @@ QString selectArtist(const QString &name)
     return u"SELECT id FROM Artiesten where Naam = "_s + quoted(name);
 }
 
+QString selectName(qint64 artist)
+{
+    return u"SELECT Naam FROM Artiesten where ID = "_s + QString::number(artist);
+}
+
 QString insertArtist(qint64 id, const QString &name)
 {
     return u"Insert into artiesten(id,naam) values ("_s + QString::number(id) + u',' +
@@ -96,6 +101,13 @@ qint64 findOrMake(const QString &name)
     const qint64 id = nextId(nextArtistId, idField);
     gConnection->Execute(insertArtist(id, name));
     return id;
+}
+
+QString nameOf(qint64 artist)
+{
+    ADODB::Recordset answer;
+    answer.Open(selectName(artist), *gConnection);
+    return answer.Fields(0).Value().toText();
 }
 
 void moveTracks(qint64 cd, qint64 artist)

@@ -83,6 +83,7 @@ protected:
     virtual QString updateTitle(qint64 id, const Header &header) const = 0;
     virtual void beforeTitle(const Header &) {}                          // in the transaction
     virtual void afterTitle(const Header &, const Header & /*saved*/) {} // of an existing record
+    virtual Header asStored(const Header &header) { return header; }     // tells what is otherwise
     virtual QWidget *behindLastTrack() const = 0; // gets the focus from the grid
     virtual void RestoreDiskPosition();
 

@@ -135,7 +135,8 @@ void CdEditor::committed(const Header &header, bool listsChange, bool reload)
         takeFocus();
         Desktop::current().pump();
     }
-    mSaved = header;
+    mSaved = asStored(header);
+    mFields->show(mSaved);
     takeFocus();
 }
 

@@ -3,7 +3,9 @@
 #include "catalogue/quoting.h"
 #include "collection/albumartist.h"
 #include "collection/ui_frmCDRootE.h"
+#include "platform/desktop/desktop.h"
 #include "services/captions.h"
+#include "services/frame.h"
 #include "services/messages.h"
 
 using namespace Qt::StringLiterals;
@@ -84,6 +86,18 @@ void frmCDRootE::afterTitle(const Header &header, const Header &saved)
 {
     if (header.artist != saved.artist)
         albumartist::moveTracks(CdId, mArtistId);
+}
+
+// A name is found whatever the case of its letters, and stays as it is.
+Header frmCDRootE::asStored(const Header &header)
+{
+    Header stored = header;
+    stored.artist = albumartist::nameOf(mArtistId);
+    if (stored.artist == header.artist)
+        return header;
+    releaseFrame();
+    informationBox(GetMessage("xKeptArtist") + stored.artist);
+    return stored;
 }
 
 QWidget *frmCDRootE::behindLastTrack() const

@@ -27,6 +27,7 @@ protected:
     QString updateTitle(qint64 id, const Header &header) const override;
     void beforeTitle(const Header &header) override;
     void afterTitle(const Header &header, const Header &saved) override;
+    Header asStored(const Header &header) override;
     QWidget *behindLastTrack() const override;
 
 private:

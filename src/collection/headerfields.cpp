@@ -2,6 +2,7 @@
 
 #include "catalogue/genres.h"
 #include "catalogue/hityear.h"
+#include "catalogue/typedtext.h"
 #include "controls/list/keycodes.h"
 #include "platform/desktop/desktop.h"
 #include "services/globals.h"
@@ -12,7 +13,6 @@
 #include <QCompleter>
 #include <QKeyEvent>
 #include <QLineEdit>
-#include <QRegularExpression>
 #include <QTimer>
 
 using namespace Qt::StringLiterals;
@@ -20,29 +20,15 @@ using namespace Qt::StringLiterals;
 namespace
 {
 
-constexpr int longestText = 255; // characters, as everywhere in the catalogue
 constexpr int keyPageUp = 33, keyPageDown = 34, keyEnd = 35, keyInsert = 45;
 constexpr int shiftAlone = 1;
-
-// A pasted text may have line ends, and the limit may have parted a pair of surrogates.
-void keepOneLine(QLineEdit *field)
-{
-    static const QRegularExpression lineEnds(u"\\s*[\\r\\n\\x{2028}\\x{2029}]+\\s*"_s);
-    QString clean = field->text();
-    clean.replace(lineEnds, u" "_s);
-    if (clean.size() == field->maxLength() && clean.back().isHighSurrogate())
-        clean.chop(1);
-    if (clean == field->text())
-        return;
-    const int cursor = field->cursorPosition();
-    field->setText(clean);
-    field->setCursorPosition(std::min<int>(cursor, int(clean.size())));
-}
 
 // A text that is longer, from another program's hand, is shown whole and never cut unseen.
 void showText(QLineEdit *field, const QString &text)
 {
-    field->setMaxLength(std::max<int>(longestText, int(text.size())));
+    field->setMaxLength(typedtext::room(text));
+    if (field->text() == text)
+        return;
     field->setText(text);
     field->setCursorPosition(0);
 }
@@ -82,8 +68,8 @@ HeaderFields::HeaderFields(const Fields &fields, QWidget *screen)
 void HeaderFields::watch(QWidget *field, QLineEdit *text)
 {
     field->installEventFilter(this);
-    text->setMaxLength(longestText);
-    connect(text, &QLineEdit::textEdited, this, [text] { keepOneLine(text); });
+    text->setMaxLength(typedtext::room({}));
+    connect(text, &QLineEdit::inputRejected, this, &HeaderFields::tellCut, Qt::QueuedConnection);
 }
 
 // The text stays as it was typed: a completer blind to case would put the list's "Folk" over "folk"
@@ -98,26 +84,34 @@ void HeaderFields::setUpGenre()
     mFields.genre->setCurrentIndex(-1);
 }
 
+// What the fields say, by the rule for what is typed.
 Header HeaderFields::shown() const
 {
-    return {mFields.artist ? mFields.artist->text() : QString(), mFields.title->text(),
-            mFields.genre->currentText(), mFields.year->text()};
+    const auto kept = [](const QString &typed, const QString &before) {
+        return typedtext::keep(typed, before).text;
+    };
+    return {mFields.artist ? kept(mFields.artist->text(), mBefore.artist) : QString(),
+            kept(mFields.title->text(), mBefore.title),
+            kept(mFields.genre->currentText(), mBefore.genre),
+            kept(mFields.year->text(), mBefore.year)};
 }
 
 void HeaderFields::show(const Header &header)
 {
+    mBefore = header;
     if (mFields.artist)
         showText(mFields.artist, header.artist);
     showText(mFields.title, header.title);
-    mFields.genre->setCurrentIndex(
-        mFields.genre->findText(header.genre, Qt::MatchExactly | Qt::MatchCaseSensitive));
+    if (mFields.genre->currentText() != header.genre)
+        mFields.genre->setCurrentIndex(
+            mFields.genre->findText(header.genre, Qt::MatchExactly | Qt::MatchCaseSensitive));
     showText(mFields.genre->lineEdit(), header.genre);
     showText(mFields.year, header.year);
 }
 
 bool HeaderFields::ValidateYear()
 {
-    const QString year = mFields.year->text();
+    const QString year = shown().year;
     if (year.isEmpty())
         return false;
     if (isHitYear(year))
@@ -133,8 +127,7 @@ bool HeaderFields::eventFilter(QObject *field, QEvent *event)
         selectText(field, static_cast<QFocusEvent *>(event)->reason());
         break;
     case QEvent::FocusOut:
-        if (field == mFields.year)
-            mYearLeftByHand = isByHand(static_cast<QFocusEvent *>(event)->reason());
+        left(field, static_cast<QFocusEvent *>(event)->reason());
         break;
     case QEvent::ShortcutOverride: // the menu has Shift+Insert too
     case QEvent::KeyPress:
@@ -176,6 +169,36 @@ void HeaderFields::selectText(QObject *field, Qt::FocusReason reason)
         QTimer::singleShot(0, text, &QLineEdit::selectAll);
     else if (reason != Qt::ActiveWindowFocusReason && reason != Qt::PopupFocusReason)
         text->selectAll();
+}
+
+// What is kept of a text stands in its field once one has gone on.
+void HeaderFields::left(QObject *field, Qt::FocusReason reason)
+{
+    if (field == mFields.year)
+        mYearLeftByHand = isByHand(reason);
+    if (reason == Qt::PopupFocusReason || reason == Qt::ActiveWindowFocusReason)
+        return;
+    const Header kept = shown();
+    const auto put = [field](QWidget *own, const QString &text) {
+        if (own == field && textOf(field)->text() != text)
+            textOf(field)->setText(text);
+    };
+    put(mFields.artist, kept.artist);
+    put(mFields.title, kept.title);
+    put(mFields.genre, kept.genre);
+    put(mFields.year, kept.year);
+}
+
+// Those that come while the box is there, from a key held down, are told with it.
+void HeaderFields::tellCut()
+{
+    if (mTellsCut)
+        return;
+    const QPointer<HeaderFields> alive(this);
+    mTellsCut = true;
+    informationBox(GetMessage("xTextCut"));
+    if (alive)
+        mTellsCut = false;
 }
 
 void HeaderFields::focusMoved(QWidget *from, QWidget *to)

@@ -31,7 +31,7 @@ public:
     };
     HeaderFields(const Fields &fields, QWidget *screen);
 
-    Header shown() const;
+    Header shown() const; // as it is to be kept
     void show(const Header &header);
 
     /// Whether the year is one: four characters, numeric, above 1900. A box tells if it is not. An
@@ -52,10 +52,14 @@ private:
     void setUpGenre();
     bool HandleFieldKey(QKeyEvent *event);
     void selectText(QObject *field, Qt::FocusReason reason);
+    void left(QObject *field, Qt::FocusReason reason);
+    void tellCut();
     void focusMoved(QWidget *from, QWidget *to);
     void leaveYear();
 
     Fields mFields;
     QWidget *mScreen;
+    Header mBefore; // as last shown
     bool mYearLeftByHand = false;
+    bool mTellsCut = false;
 };

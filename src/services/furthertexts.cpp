@@ -48,6 +48,8 @@ const Message furtherTexts[] = {
     {"xTitleGone", "The record of these tracks is no longer in the catalogue, or has no artist.", "Het record van deze tracks staat niet meer in de database, of heeft geen artiest."},
     {"xKeptValues", "These tracks are held by other discs too, or more than once by this one. The catalogue keeps their genre, year and spelling:", "Deze tracks staan ook op andere discs, of meer dan eens op deze. De database houdt hun genre, jaar en schrijfwijze:"},
     {"xKeptArtists", "Artists are never renamed. The catalogue keeps the spelling of the artist of these tracks:", "Artiesten worden nooit hernoemd. De database houdt de schrijfwijze van de artiest van deze tracks:"},
+    {"xKeptArtist", "Artists are never renamed. The catalogue keeps the spelling ", "Artiesten worden nooit hernoemd. De database houdt de schrijfwijze "},
+    {"xTextCut", "There is no room for so long a text. It has been cut.", "Voor zo'n lange tekst is geen plaats. Hij is afgekapt."},
     {"xReportPrint", "P&rint...", "Af&drukken..."},
     {"xReportPdf", "P&DF...", "&PDF..."},
     {"xReportPdfTip", "Save as PDF", "Opslaan als PDF"},

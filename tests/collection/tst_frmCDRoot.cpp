@@ -260,6 +260,52 @@ private slots:
         QVERIFY(editor->updatesEnabled() && editor->cursor().shape() == Qt::ArrowCursor);
     }
 
+    // By the same rule as the cells of the grid.
+    void typedTexts_data()
+    {
+        const DataRows<QString, QString> row("pasted", "kept");
+        row("blanks around", "  a  b ", "a  b");
+        row("tabs and line ends", "a\tb\r\nc\n", "a b c");
+        row("500 letters", QString(500, u'x'), QString(255, u'x'));
+    }
+
+    void typedTexts()
+    {
+        QFETCH(QString, pasted);
+        QFETCH(QString, kept);
+        CdEditor *editor = openThree();
+        for (const char *name : {"txtTitel", "Genre"}) {
+            mE->control<QWidget>(name)->setFocus();
+            QApplication::clipboard()->setText(pasted);
+            if (pasted.size() > 255)
+                mE->desktop.expectBox(GetMessage("xTextCut"));
+            keyboard::press(Qt::Key_A, Qt::ControlModifier);
+            keyboard::press(Qt::Key_V, Qt::ControlModifier);
+            QCoreApplication::processEvents();
+            mE->desktop.verifyAllCame();
+        }
+        editor->SaveAtUserRequest(); // the focus is in the genre still
+        QCOMPARE(mE->field("txtTitel")->text(), kept);
+        QCOMPARE(mE->genre()->currentText(), kept);
+        QCOMPARE(mE->catalogue.rows("select Titel, Genre from CDTitels where ID=3"),
+                 QStringList(kept + u'|' + kept));
+    }
+
+    void textsOfAnotherProgram()
+    {
+        fillThree();
+        const QString stored = u' ' + QString(300, u'x') + u'\t';
+        mE->catalogue.exec(
+            u"update CDTitels set Titel = '%1', Genre = '%1' where ID = 3"_s.arg(stored));
+        CdEditor *editor = mE->open<frmCDRoot>("U", 3);
+        for (const char *name : {"txtTitel", "Genre", "txtYear"})
+            mE->control<QWidget>(name)->setFocus();
+        editor->close(); // without a question
+        QVERIFY(editor->isUnloaded());
+        QCOMPARE(mE->catalogue.rows("select Titel, Genre from CDTitels where ID=3"),
+                 QStringList(stored + u'|' + stored));
+    }
+
     void leavingADiscRefused()
     {
         openThree();

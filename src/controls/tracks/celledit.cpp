@@ -15,7 +15,6 @@ using namespace Qt::StringLiterals;
 namespace
 {
 
-constexpr int longestText = 255;
 constexpr int linesShown = 12;
 
 bool isPlain(const QKeyEvent &event)
@@ -58,7 +57,6 @@ bool isGridKey(const QKeyEvent &event)
 CellEdit::CellEdit(const QString &name, QWidget *parent) : QLineEdit(parent)
 {
     setFrame(false);
-    setMaxLength(longestText);
     setAccessibleName(name);
     connect(this, &QLineEdit::textEdited, this, &CellEdit::suggest);
 }

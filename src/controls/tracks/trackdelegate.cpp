@@ -1,5 +1,7 @@
 #include "controls/tracks/trackdelegate.h"
 
+#include "catalogue/typedtext.h"
+
 #include <QKeyEvent>
 
 TrackDelegate::TrackDelegate(Describe describe, QObject *parent)
@@ -12,11 +14,13 @@ QWidget *TrackDelegate::createEditor(QWidget *parent, const QStyleOptionViewItem
 {
     const Cell cell = mDescribe(index);
     mEdit = new CellEdit(cell.name, parent);
+    mEdit->setMaxLength(typedtext::room(index.data(Qt::EditRole).toString()));
     mEdit->setSuggestions(cell.suggestions);
     if (!cell.list.isEmpty())
         mEdit->setList(cell.list, cell.listName);
     connect(mEdit, &CellEdit::cancelled, this, &TrackDelegate::cancelled);
     connect(mEdit, &CellEdit::gridKey, this, &TrackDelegate::gridKey);
+    connect(mEdit, &CellEdit::inputRejected, this, &TrackDelegate::cutOff);
     return mEdit;
 }
 

@@ -32,6 +32,7 @@ public:
 signals:
     void cancelled() const;
     void gridKey(QKeyEvent *event) const;
+    void cutOff() const; // more was typed or pasted than the cell can take
 
 protected:
     bool eventFilter(QObject *editor, QEvent *event) override;

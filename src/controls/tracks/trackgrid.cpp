@@ -67,6 +67,7 @@ TrackGrid::TrackGrid(Columns columns, QWidget *parent)
     go(0, 1);
     connect(mDelegate, &TrackDelegate::cancelled, this, &TrackGrid::cancelEdit);
     connect(mDelegate, &TrackDelegate::gridKey, this, &TrackGrid::actOnEditKey);
+    connect(mDelegate, &TrackDelegate::cutOff, this, &TrackGrid::tellCut, Qt::QueuedConnection);
     connect(qApp, &QApplication::focusChanged, this,
             [this](QWidget *, QWidget *now) { followFocus(now); });
 }
@@ -242,8 +243,8 @@ void TrackGrid::CommitEdit()
 bool TrackGrid::leaveEdit()
 {
     const QModelIndex index = currentIndex();
-    const QString text = TrackModel::fit(cellEdit()->text());
     const TrackField field = mModel->fieldOf(index.column());
+    const QString text = mModel->keep(index.row(), field, cellEdit()->text());
     const bool refused = field == YearField && !text.isEmpty() && !isHitYear(text) &&
                          text != mModel->text(index.row(), field);
     if (refused)
@@ -398,15 +399,15 @@ void TrackGrid::copy() const
     if (selectionModel()->selection().isEmpty())
         return;
     const QItemSelectionRange range = selectionModel()->selection().first();
-    QStringList lines;
+    QList<QStringList> lines;
     for (int row = range.top(); row <= std::min(range.bottom(), mModel->waitingRow() - 1); ++row) {
         QStringList cells;
         for (int column = range.left(); column <= range.right(); ++column)
             cells.append(mModel->index(row, column).data().toString());
-        lines.append(cells.join(u'\t'));
+        lines.append(cells);
     }
     if (!lines.isEmpty())
-        QApplication::clipboard()->setText(lines.join(u'\n'));
+        QApplication::clipboard()->setText(TrackModel::joined(lines));
 }
 
 void TrackGrid::paste()
@@ -416,9 +417,23 @@ void TrackGrid::paste()
         return;
     const QModelIndex from = currentIndex();
     emit LockScreen();
-    const QModelIndex to = mModel->paste(from.row(), from.column(), TrackModel::parted(text));
-    selectionModel()->select({from, to}, QItemSelectionModel::ClearAndSelect);
+    const auto pasted = mModel->paste(from.row(), from.column(), TrackModel::parted(text));
+    selectionModel()->select({from, pasted.last}, QItemSelectionModel::ClearAndSelect);
     emit UnlockScreen();
+    if (pasted.cut)
+        tellCut();
+}
+
+// Those that come while the box is there, from a key held down, are told with it.
+void TrackGrid::tellCut()
+{
+    if (mTellsCut)
+        return;
+    const QPointer<TrackGrid> alive(this);
+    mTellsCut = true;
+    informationBox(message("xTextCut"));
+    if (alive)
+        mTellsCut = false;
 }
 
 void TrackGrid::clearSelected()
@@ -459,10 +474,11 @@ QList<StoredTrack> TrackGrid::Tracks() const
         tracks.append({track.linkId, track.texts});
     if (const CellEdit *edit = cellEdit()) {
         const int row = mModel->trackNumber(currentIndex().row()) - 1;
+        const TrackField field = mModel->fieldOf(currentIndex().column());
         if (row < 0)
             tracks.append(StoredTrack());
-        (row < 0 ? tracks.last() : tracks[row]).texts[mModel->fieldOf(currentIndex().column())] =
-            TrackModel::fit(edit->text());
+        (row < 0 ? tracks.last() : tracks[row]).texts[field] =
+            mModel->keep(currentIndex().row(), field, edit->text());
     }
     return tracks;
 }
@@ -493,8 +509,9 @@ bool TrackGrid::IsChanged() const
     settleSave();
     const CellEdit *edit = cellEdit();
     const QModelIndex index = currentIndex();
-    const bool typed = edit && TrackModel::fit(edit->text()) !=
-                                   mModel->text(index.row(), mModel->fieldOf(index.column()));
+    const TrackField field = mModel->fieldOf(index.column());
+    const bool typed =
+        edit && mModel->keep(index.row(), field, edit->text()) != mModel->text(index.row(), field);
     return typed || mModel->isChanged();
 }
 

@@ -117,6 +117,7 @@ private:
     int lastColumn() const;
     void copy() const;
     void paste();
+    void tellCut();
     void clearSelected();
 
     // Saving.
@@ -134,4 +135,5 @@ private:
     int mLanguage = 0;
     bool mHasError = false;
     bool mFocused = false;
+    bool mTellsCut = false;
 };

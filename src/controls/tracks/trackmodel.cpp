@@ -1,5 +1,6 @@
 #include "controls/tracks/trackmodel.h"
 
+#include "catalogue/typedtext.h"
 #include "platform/text/textrules.h"
 
 #include <QRegularExpression>
@@ -9,14 +10,6 @@ using namespace Qt::StringLiterals;
 
 namespace
 {
-
-constexpr qsizetype longestText = 255;
-
-bool breaksLine(QChar c)
-{
-    return c.category() == QChar::Other_Control || c.category() == QChar::Separator_Line ||
-           c.category() == QChar::Separator_Paragraph;
-}
 
 // Quotes around a cell count only where they are needed, so that a title "Heroes" keeps its own.
 QString takeCell(const QString &lines, qsizetype &at)
@@ -34,6 +27,19 @@ QString takeCell(const QString &lines, qsizetype &at)
     if (at < 0)
         at = lines.size();
     return lines.sliced(from, at - from);
+}
+
+// As the cell of a table, whatever stands behind it.
+bool readsAsItIs(const QString &cell)
+{
+    static const QRegularExpression plain(
+        QRegularExpression::anchoredPattern(uR"re((?:[^"\t\r\n][^\t\r\n]*)?|"[^"\t\r\n]*")re"_s));
+    return plain.match(cell).hasMatch();
+}
+
+QString inQuotes(QString cell)
+{
+    return u'"' + cell.replace("\""_L1, "\"\""_L1) + u'"';
 }
 
 bool beginWithNumbers(const QList<QStringList> &lines)
@@ -98,25 +104,19 @@ int TrackModel::trackNumber(int row) const
     return mNumbers.value(row);
 }
 
-QString TrackModel::fit(const QString &text)
+QString TrackModel::keep(int row, TrackField field, const QString &typed) const
 {
-    QString fitted = text.normalized(QString::NormalizationForm_C);
-    fitted.replace("\r\n"_L1, " "_L1);
-    std::replace_if(fitted.begin(), fitted.end(), breaksLine, u' ');
-    fitted = text::cutTo(fitted.trimmed(), longestText).trimmed();
-    if (!fitted.isEmpty() && fitted.back().isHighSurrogate())
-        fitted.chop(1); // of a pair that a field has cut
-    return fitted;
+    return typedtext::keep(typed, text(row, field)).text;
 }
 
 void TrackModel::setText(int row, TrackField field, const QString &text)
 {
-    const QString fitted = fit(text);
-    if (fitted == this->text(row, field))
+    const QString kept = keep(row, field, text);
+    if (kept == this->text(row, field))
         return;
     QList<Row> rows = mRows;
     fillUpTo(rows, row);
-    rows[row].texts[field] = fitted;
+    rows[row].texts[field] = kept;
     change(rows, row, columnOf(field));
 }
 
@@ -152,21 +152,26 @@ void TrackModel::removeTrack(int row)
     change(rows, row, 1);
 }
 
-QModelIndex TrackModel::paste(int row, int column, const QList<QStringList> &lines)
+auto TrackModel::paste(int row, int column, const QList<QStringList> &lines) -> Pasted
 {
     if (column == 0 && !beginWithNumbers(lines))
         column = 1;
     QList<Row> rows = mRows;
     int last = column;
+    bool cut = false;
     for (int i = 0; i < lines.size(); ++i) {
         fillUpTo(rows, row + i);
         const int end = std::min(columnCount(), column + int(lines[i].size()));
-        for (int c = std::max(column, 1); c < end; ++c)
-            rows[row + i].texts[fieldOf(c)] = fit(lines[i][c - column]);
+        for (int c = std::max(column, 1); c < end; ++c) {
+            QString &cell = rows[row + i].texts[fieldOf(c)];
+            const typedtext::Kept kept = typedtext::keep(lines[i][c - column], cell);
+            cell = kept.text;
+            cut = cut || kept.cut;
+        }
         last = std::max(last, end - 1);
     }
     change(rows, row, column);
-    return index(row + int(lines.size()) - 1, last);
+    return {index(row + int(lines.size()) - 1, last), cut};
 }
 
 QList<QStringList> TrackModel::parted(const QString &clipboard)
@@ -181,6 +186,19 @@ QList<QStringList> TrackModel::parted(const QString &clipboard)
             lines.append(QStringList());
     }
     return lines;
+}
+
+QString TrackModel::joined(const QList<QStringList> &lines)
+{
+    QStringList all;
+    for (const QStringList &line : lines) {
+        QStringList cells;
+        for (const QString &cell : line)
+            cells.append(readsAsItIs(cell) ? cell : inQuotes(cell));
+        all.append(cells.join(u'\t'));
+    }
+    const bool endWouldGo = !all.isEmpty() && all.last().isEmpty();
+    return all.join(u'\n') + (endWouldGo ? u"\n"_s : QString());
 }
 
 bool TrackModel::isEmpty(const Row &row)

@@ -34,9 +34,8 @@ public:
     QString text(int row, TrackField field) const;
     int trackNumber(int row) const; // 0 for an empty row
 
-    /// A text as a cell takes it: blanks for line breaks and tabs, none around it, NFC, at most 255
-    /// characters.
-    static QString fit(const QString &text);
+    /// What a cell makes of a text that is typed into it.
+    QString keep(int row, TrackField field, const QString &typed) const;
 
     // Changes by the user, each one step to undo. In the waiting row they make a row of it.
     void setText(int row, TrackField field, const QString &text);
@@ -46,12 +45,17 @@ public:
 
     /// Fills cells from this one to the right and down; what stands right of the last column is
     /// left out. In the number column the first cells of the lines are left out if they are
-    /// numbers; else it starts with the first field. Gives the last cell filled.
-    QModelIndex paste(int row, int column, const QList<QStringList> &lines);
+    /// numbers; else it starts with the first field.
+    struct Pasted {
+        QModelIndex last; // cell that was filled
+        bool cut;         // some text was too long
+    };
+    Pasted paste(int row, int column, const QList<QStringList> &lines);
 
     /// Lines of cells parted by tabs, as spreadsheets put them on the clipboard: a cell with tabs,
     /// line breaks or doubled quotes inside may stand between quotes.
     static QList<QStringList> parted(const QString &clipboard);
+    static QString joined(const QList<QStringList> &lines); // the way back
 
     // Undo and redo give the cell that changed, no valid index if there is nothing to do.
     QModelIndex undo() { return step(mUndo, mRedo); }

@@ -9,6 +9,8 @@
 #include <QClipboard>
 #include <QListWidget>
 #include <QSignalSpy>
+#include <QTextDocumentFragment>
+#include <QToolTip>
 #include <QVBoxLayout>
 
 namespace
@@ -335,6 +337,48 @@ private slots:
         QApplication::clipboard()->setText(u"two\nlines"_s);
         type("x{Ctrl+V}{Return}"); // into the text of one cell
         QVERIFY(cells().startsWith(u"xtwo lines,"));
+        type("\"x\"\"y\"{Return}{Up}{Ctrl+C}{Right}{Ctrl+V}");
+        QVERIFY(cells().contains(u"\"x\"\"y\",\"x\"\"y\","_s));
+    }
+
+    // A text of another program may be longer than one that is typed.
+    void longTexts()
+    {
+        const QString stored = QString(300, u'x') + u' ', typed(260, u'y');
+        mCatalogue->exec(u"update tracks set titel = '"_s + stored + u"' where id = 1"_s);
+        showDisk();
+        mGrid->setCurrentColumn(3);
+        type("{Return}{Return}"); // opened and left
+        QVERIFY(cells().startsWith(u"Abba,"_s + stored + u",Pop"_s));
+        QVERIFY(!mGrid->IsChanged());
+        const auto paste = [&](const char *keys) {
+            QApplication::clipboard()->setText(typed);
+            mDesktop->expectBox(GetMessage("xTextCut"));
+            type(keys);
+            QCoreApplication::processEvents();
+            mDesktop->verifyAllCame();
+            type("{Return}");
+            QCOMPARE(cells().count(u'y'), 255);
+            mGrid->LoadDisc();
+        };
+        mGrid->setCurrentRow(2);
+        paste("{Ctrl+V}");                // into cells
+        paste("{Down}x{Ctrl+A}{Ctrl+V}"); // into the text of one
+    }
+
+    void aTextThatDoesNotFitShowsAsAToolTip()
+    {
+        mCatalogue->exec("update tracks set titel = 'Rock & Roll \"<b>\" and more' where id = 1");
+        showDisk();
+        const QModelIndex cell = mGrid->model()->index(0, 2);
+        for (const int width : {300, 20}) {
+            mGrid->setColumnWidth(2, width);
+            const QPoint at = mGrid->visualRect(cell).center();
+            QHelpEvent event(QEvent::ToolTip, at, mGrid->viewport()->mapToGlobal(at));
+            QApplication::sendEvent(mGrid->viewport(), &event);
+            QCOMPARE(QTextDocumentFragment::fromHtml(QToolTip::text()).toPlainText(),
+                     width == 20 ? u"Rock & Roll \"<b>\" and more"_s : QString());
+        }
     }
 
     void refusedRows_data()
@@ -410,6 +454,7 @@ private slots:
         save();
         QVERIFY(!mGrid->IsChanged());
         QCOMPARE(mCatalogue->rows("select titel from tracks where id > 3"), texts("Believe"));
+        QCOMPARE(mCatalogue->count("select count(*) from compactdiscs where cdtitels_id = 1"), 3);
     }
 };
 

@@ -7,11 +7,6 @@
 namespace
 {
 
-QString longText(int characters)
-{
-    return QString(characters, u'x');
-}
-
 StoredTrack stored(qint64 link, const char *artist, const char *title, const char *genre = "",
                    const char *year = "")
 {
@@ -49,27 +44,6 @@ class tst_TrackModel : public QObject
     Q_OBJECT
 
 private slots:
-    void fits_data()
-    {
-        const DataRows<QString, QString> row("typed", "kept");
-        const QString pair = u"\U0001F3B5"_s;
-        row("as it is", "d'Arc \"50%1\" <b>", "d'Arc \"50%1\" <b>");
-        row("only blanks", " \t ", "");
-        row("blanks around", "  a  b ", "a  b");
-        row("line breaks", "a\r\nb\nc\u2028d\te\r", "a b c d e");
-        row("composed", "E\u0301dith", "\u00C9dith");
-        row("255", longText(255), longText(255));
-        row("256", longText(256), longText(255));
-        row("cut before a pair", longText(254) + pair, longText(254));
-        row("a pair at the end", longText(253) + pair, longText(253) + pair);
-    }
-
-    void fits()
-    {
-        QFETCH(QString, typed);
-        QTEST(TrackModel::fit(typed), "kept");
-    }
-
     void parts_data()
     {
         // cells: "|" between cells, "/" between lines
@@ -91,6 +65,24 @@ private slots:
         for (const QStringList &line : TrackModel::parted(clipboard))
             lines.append(line.join(u'|'));
         QTEST(lines.join(u'/'), "cells");
+    }
+
+    // What is copied is what is pasted, whatever signs it holds.
+    void copiesComeBack_data()
+    {
+        const DataRows<QString> row("cell");
+        for (const char *cell : {"", "\"", "\"\"", "x\"\"y", "\"x\"\"y\"", "\"Heroes\"", "\"a\tb\"",
+                                 "tab\tin", "line\nin", " \"\"\"\" "})
+            row(QByteArray(cell).replace('\n', "LF").replace('\t', "TAB") + '.',
+                QString::fromLatin1(cell));
+    }
+
+    void copiesComeBack()
+    {
+        QFETCH(QString, cell);
+        for (const QList<QStringList> &lines :
+             {QList<QStringList>{{cell}}, {{u"a"_s, cell}, {cell, u"\"b"_s}}, {{u"a"_s}, {cell}}})
+            QCOMPARE(TrackModel::parted(TrackModel::joined(lines)), lines);
     }
 
     void pastes_data()
