@@ -190,8 +190,7 @@ void CdEditor::loadRecord()
     mRecord.know(CdId);
     mSaved = headerOf(record);
     mFields->show(mSaved);
-    const qint64 discs = record.Fields(u"DiscNum").Value().toLong();
-    mControls.discs->setCount(std::max(1, int(discs)));
+    mControls.discs->setCount(record.Fields(u"DiscNum").Value().toLong());
 }
 
 Header CdEditor::headerOf(ADODB::Recordset &record) const

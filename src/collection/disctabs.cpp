@@ -1,9 +1,11 @@
 #include "collection/disctabs.h"
 
+#include "catalogue/discnumber.h"
 #include "services/messages.h"
 
 #include <QSignalBlocker>
 #include <QWheelEvent>
+#include <algorithm>
 
 using namespace Qt::StringLiterals;
 
@@ -15,14 +17,31 @@ DiscTabs::DiscTabs(QWidget *parent) : QTabBar(parent)
             [this](int tab) { emit left(std::exchange(mShown, tab)); });
 }
 
-void DiscTabs::setCount(int count)
+// Bar and tabs are hidden while their number changes: the bar lays out all that can be seen for
+// each one that comes or goes, and with thousands of discs that took ten seconds.
+void DiscTabs::setCount(qint64 count)
 {
     const QSignalBlocker quiet(this);
-    while (QTabBar::count() > count)
-        removeTab(QTabBar::count() - 1);
-    while (QTabBar::count() < count)
-        add();
+    const int wanted = int(std::clamp<qint64>(count, 1, highestDisc));
+    const bool shown = !isHidden();
+    hide();
     showTab(0);
+    setOthersVisible(false);
+    while (QTabBar::count() > wanted)
+        removeTab(QTabBar::count() - 1);
+    while (QTabBar::count() < wanted) {
+        add();
+        setTabVisible(QTabBar::count() - 1, QTabBar::count() == 1);
+    }
+    setOthersVisible(true);
+    setVisible(shown);
+    showTab(0);
+}
+
+void DiscTabs::setOthersVisible(bool visible)
+{
+    for (int tab = 1; tab < count(); ++tab)
+        setTabVisible(tab, visible);
 }
 
 void DiscTabs::add()

@@ -11,8 +11,8 @@ class DiscTabs : public QTabBar
 public:
     explicit DiscTabs(QWidget *parent = nullptr);
 
-    void setCount(int count); // the first one shows
-    void add();               // behind the others; it does not show yet
+    void setCount(qint64 count); // from 1 to highestDisc; the first one shows
+    void add();                  // behind the others; it does not show yet
     void showTab(int tab);
 
 signals:
@@ -22,5 +22,7 @@ protected:
     void wheelEvent(QWheelEvent *event) override;
 
 private:
+    void setOthersVisible(bool visible);
+
     int mShown = 0;
 };

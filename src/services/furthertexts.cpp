@@ -50,6 +50,7 @@ const Message furtherTexts[] = {
     {"xKeptArtists", "Artists are never renamed. The catalogue keeps the spelling of the artist of these tracks:", "Artiesten worden nooit hernoemd. De database houdt de schrijfwijze van de artiest van deze tracks:"},
     {"xKeptArtist", "Artists are never renamed. The catalogue keeps the spelling ", "Artiesten worden nooit hernoemd. De database houdt de schrijfwijze "},
     {"xTextCut", "There is no room for so long a text. It has been cut.", "Voor zo'n lange tekst is geen plaats. Hij is afgekapt."},
+    {"xNumberTooLarge", "The number is too large!", "Het getal is te groot!"},
     {"xReportPrint", "P&rint...", "Af&drukken..."},
     {"xReportPdf", "P&DF...", "&PDF..."},
     {"xReportPdfTip", "Save as PDF", "Opslaan als PDF"},

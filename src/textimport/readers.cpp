@@ -1,10 +1,12 @@
 #include "textimport/readers.h"
 
+#include "catalogue/discnumber.h"
 #include "platform/error/error.h"
 #include "platform/text/textrules.h"
 #include "services/messages.h"
 
 #include <algorithm>
+#include <cmath>
 #include <limits>
 
 using namespace Qt::StringLiterals;
@@ -81,15 +83,17 @@ QString lineOrStar(ImportLines &lines)
     return line == u"*" ? QString() : line;
 }
 
-int countLine(ImportLines &lines)
+constexpr int mostTracks = std::numeric_limits<int>::max();
+
+int countLine(ImportLines &lines, int most)
 {
     const QString line = lines.next(FilePart::Head);
     if (!text::isNumeric(line))
         lines.refuse("NumberNotFound");
-    const qint64 count = ADODB::Value(line).toLong();
-    if (count < std::numeric_limits<int>::min() || count > std::numeric_limits<int>::max())
-        throw makeError(errOverflow);
-    return int(count);
+    const double count = std::nearbyint(line.trimmed().toDouble()); // a half to the even number
+    if (count > most)
+        lines.refuse("xNumberTooLarge");
+    return int(std::max(count, 0.0));
 }
 
 void readCountedTrack(ImportLines &lines, TrackRows &rows, int disc, int track)
@@ -105,10 +109,10 @@ void readCountedTrack(ImportLines &lines, TrackRows &rows, int disc, int track)
 // tracks is passed over.
 template <typename ReadTrack> void readDiscs(ImportLines &lines, ReadTrack readTrack)
 {
-    const int discs = countLine(lines);
+    const int discs = countLine(lines, highestDisc);
     int disc = 1;
     do {
-        const int tracks = countLine(lines);
+        const int tracks = countLine(lines, mostTracks);
         for (int track = 1; track <= tracks; ++track)
             readTrack(disc, track);
     } while (disc++ < discs);
@@ -126,13 +130,15 @@ public:
 
     void endDisc()
     {
-        ++disc;
+        disc = std::min(disc + 1, highestDisc + 1);
         track = 0;
     }
 
-    void beginTrack(TrackRows &rows)
+    void beginTrack(const ImportLines &lines, TrackRows &rows)
     {
         if (main == mPrevious) {
+            if (disc > highestDisc)
+                lines.refuse("xNumberTooLarge");
             ++track;
             return;
         }
@@ -206,7 +212,7 @@ void ReadCompilationFlat(ImportLines &lines, TrackRows &rows)
         requireTitle(lines, place.main);
         requireTitle(lines, title);
         requireYear(lines, rest);
-        place.beginTrack(rows);
+        place.beginTrack(lines, rows);
         rows.setArtist(artist);
         rows.add(title, genre, rest, place.disc, place.track);
     };
@@ -224,7 +230,7 @@ void ReadAlbumFlat(ImportLines &lines, TrackRows &rows)
         requireTitle(lines, place.main);
         requireTitle(lines, title);
         requireYear(lines, rest);
-        place.beginTrack(rows);
+        place.beginTrack(lines, rows);
         rows.add(title, genre, rest, place.disc, place.track);
     };
     const auto readHead = [&](const QString &line) {

@@ -37,8 +37,8 @@ private:
 };
 
 // The readers of the four formats: lines into rows. A fault in the data is thrown as DataError;
-// what a reader cannot even take apart (a count beyond 32 bits, a track without its stars) as
-// Error. The rows up to there are kept.
+// what a reader cannot even take apart (a track without its stars) as Error. The rows up to there
+// are kept.
 
 /// One field per row: title, count of discs; per disc a count of tracks; per track artist, title,
 /// genre, year.

@@ -7,6 +7,7 @@
 #include <QApplication>
 #include <QClipboard>
 #include <QPushButton>
+#include <ctime>
 
 namespace
 {
@@ -304,6 +305,30 @@ private slots:
         QVERIFY(editor->isUnloaded());
         QCOMPARE(mE->catalogue.rows("select Titel, Genre from CDTitels where ID=3"),
                  QStringList(stored + u'|' + stored));
+    }
+
+    // 4,000 discs took ten seconds, and a number from nowhere never ended.
+    void manyDiscs_data()
+    {
+        const DataRows<qint64, int> row("highest", "tabs");
+        row("4000", 4000, 4000);
+        row("beyond 32 bits", (qint64(1) << 32) + 2, 9999); // hung
+        row("0", 0, 1);
+    }
+
+    void manyDiscs()
+    {
+        QFETCH(qint64, highest);
+        fillThree();
+        mE->catalogue.exec(
+            u"update CompactDiscs set DiskNo = %1 where CDTitels_ID = 3"_s.arg(highest));
+        const std::clock_t begin = std::clock();
+        mE->open<frmCDRoot>("U", 3);
+        QTEST(mE->tabs()->count(), "tabs");
+        QCOMPARE(mE->tabs()->tabText(mE->tabs()->count() - 1).remove(u'&'),
+                 u"Disc %1"_s.arg(mE->tabs()->count()));
+        const double seconds = double(std::clock() - begin) / CLOCKS_PER_SEC;
+        QVERIFY2(seconds < (highest > 4000 ? 10 : 2), qPrintable(QString::number(seconds)));
     }
 
     void leavingADiscRefused()

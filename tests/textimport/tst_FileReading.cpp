@@ -98,8 +98,16 @@ private slots:
         const DataRows<char, QByteArray, QString> row("format", "content", "end");
         const char *number = "data 2: Number expected but not found!";
         row("A, count in words", 'A', "x\ntwo\n", number);
-        row("A, count beyond all bounds", 'A', "x\n1e300\n", "not readable, 2");
-        row("A, count beyond 32 bits", 'A', "x\n2147483648\n", "not readable, 2");
+        row("A, count beyond all bounds", 'A', "x\n1e999\n", "data 2: The number is too large!");
+        row("A, too many discs", 'A', "x\n10000\n", "data 2: The number is too large!");
+        row("A, as many as there may be", 'A', "x\n9999\n",
+            "data 3: Number expected but not found!");
+        row("A, tracks beyond 32 bits", 'A', "x\n1\n2147483648\n",
+            "data 3: The number is too large!");
+        row("C, too many discs", 'C', "x\na*b**\n" + QByteArray(9999, '\n') + "c*d**\n",
+            "data 10002: The number is too large!");
+        row("C, of another title", 'C', "x\na*b**\n" + QByteArray(9999, '\n') + "y\n*d**\n",
+            "data 10003: Found empty line, whereas artist is obligatory!");
         row("A, second count", 'A', "x\n1\n1 track\n", "data 3: Number expected but not found!");
         row("A, empty line at the end", 'A', "x\n1\n1\na\nb\n\n\n\n",
             "data 8: Found empty line, whereas title is obligatory!");
