@@ -16,6 +16,8 @@
 #include "services/globals.h"
 #include "services/messages.h"
 
+#include <functional>
+
 using namespace Qt::StringLiterals;
 
 namespace
@@ -24,14 +26,30 @@ namespace
 constexpr int firstSortKey = 1; // sort keys from 0: the first column that shows
 constexpr int keyEnter = 13, keyInsert = 45, keyDelete = 46;
 
-// Nodes of the tree from rows of an id and a text.
-std::vector<RecordTree::Node> nodesOf(const ADODB::Recordset &recordset, QChar keyLetter)
+using TextOf = std::function<QString(const ADODB::Rows &rows, qsizetype row)>;
+
+QString secondText(const ADODB::Rows &rows, qsizetype row)
+{
+    return rows.text(row, 1);
+}
+
+QString textOfDisc(const ADODB::Rows &rows, qsizetype row)
+{
+    return rows.text(row, 1) + u" (Track "_s + rows.text(row, 3) + GetMessage("VanDisc") +
+           rows.text(row, 2) + u')';
+}
+
+// Nodes of the tree from rows that begin with an id. One that has none has no key either.
+std::vector<RecordTree::Node> nodesOf(const ADODB::Recordset &recordset, QChar keyLetter,
+                                      const TextOf &text = secondText)
 {
     const auto rows = recordset.rows();
     std::vector<RecordTree::Node> nodes;
     nodes.reserve(std::size_t(rows->rowCount()));
-    for (qsizetype row = 0; row < rows->rowCount(); ++row)
-        nodes.push_back({keyLetter + rows->text(row, 0), rows->text(row, 1)});
+    for (qsizetype row = 0; row < rows->rowCount(); ++row) {
+        if (rows->kind(row, 0) == ADODB::Rows::Kind::Integer)
+            nodes.push_back({keyLetter + rows->text(row, 0), text(*rows, row)});
+    }
     return nodes;
 }
 
@@ -283,14 +301,8 @@ void frmCDList::FillTrackNode(RecordTree &TheTree, const QString &TheKey)
 
 void frmCDList::FillCDNode(RecordTree &TheTree, const QString &TheKey)
 {
-    const auto discs = recordnodes::discs(TheKey.sliced(1));
-    const auto rows = discs->rows();
-    auto nodes = nodesOf(*discs, u'C');
-    for (std::size_t i = 0; i < nodes.size(); ++i) {
-        nodes[i].text += u" (Track "_s + rows->text(qsizetype(i), 3) + GetMessage("VanDisc") +
-                         rows->text(qsizetype(i), 2) + u')';
-    }
-    TheTree.addNodes(TheKey, RecordTree::Disc, nodes);
+    const auto rows = recordnodes::discs(TheKey.sliced(1));
+    TheTree.addNodes(TheKey, RecordTree::Disc, nodesOf(*rows, u'C', textOfDisc));
 }
 
 // A node is filled once: its placeholder tells that it was not yet. The length comes first, for "A"

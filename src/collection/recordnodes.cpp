@@ -77,7 +77,7 @@ Title titleOf(const QString &linkId)
     if (row->isEOF())
         return {};
     const QString type = row->Fields(u"type").Value().toText();
-    return {row->Fields(u"ID").Value().toLong(), type.compare(u"V", Qt::CaseInsensitive) == 0};
+    return {row->rows()->id(0, row->columnOf(u"ID")), type.compare(u"V", Qt::CaseInsensitive) == 0};
 }
 
 } // namespace recordnodes

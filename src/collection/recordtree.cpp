@@ -89,8 +89,10 @@ void RecordTree::addNodes(const QString &parentKey, Level level, const std::vect
         return;
     QList<QTreeWidgetItem *> items;
     items.reserve(qsizetype(nodes.size()));
-    for (const Node &node : nodes)
-        items.append(make(level, node));
+    for (const Node &node : nodes) {
+        if (!mNodes.contains(node.key))
+            items.append(make(level, node));
+    }
     parent->addChildren(items);
 }
 

@@ -26,6 +26,8 @@ public:
     };
 
     /// Puts nodes of a level under the node of this key, all at once, each with its placeholder.
+    /// A key that another node has already is left out: in a damaged catalogue an id may stand
+    /// twice.
     void addNodes(const QString &parentKey, Level level, const std::vector<Node> &nodes);
     void removeNode(const QString &key);
 

@@ -1,6 +1,7 @@
 // Label: screen
 #include "collection/frmCDList.h"
 #include "collection/recordtree.h"
+#include "controls/list/DBListViewCTL.h"
 #include "support/editing.h"
 #include "support/screentest.h"
 
@@ -128,6 +129,40 @@ private slots:
         mTree->setCurrentItem(mTree->node(u"C1"_s));
         QTest::keyClick(mTree, Qt::Key_Return);
         QCOMPARE(openEditors(), texts("frmCDRootE U 2", "frmCDRoot U 1"));
+    }
+
+    // A catalogue that somebody prepared: tables without keys, with ids that are missing, doubled
+    // or no numbers.
+    void rowsThatTheRulesForbid()
+    {
+        mCatalogue->exec(R"(
+            drop table Artiesten; create table Artiesten(ID, Naam);
+            drop table Tracks; create table Tracks(ID, Artiest_ID, Titel, Genre, Hitjaar);
+            drop table CDTitels; create table CDTitels(ID, Titel, Artiest_ID, CD_Type, Genre, Hitjaar);
+            drop table CompactDiscs;
+            create table CompactDiscs(ID, CDTitels_ID, DiskNo, TrackNo, Track_ID, Opmerking);
+            insert into Artiesten values (null,'Abby'),(1,'Abe'),('1 or 1','Al'),(1,'Ann');
+            insert into Tracks values (1,1,'One',null,null),(1,1,'Two',null,null),(null,1,'X',null,null);
+            insert into CDTitels values (3,'Hits',null,'V',null,null),(3,'Hits',null,'V',null,null),
+                (null,'None',null,'V',null,null);
+            insert into CompactDiscs values (1,3,1,1,1,null),(1,3,1,2,1,null),(null,3,1,3,1,null),
+                ('x',3,1,4,1,null);)");
+        show();
+        QCOMPARE(below(open("A")), texts("Abe"));
+        QCOMPARE(below(open("A1")), texts("One"));
+        QCOMPARE(below(open("T1"), true), texts("C1"));
+        mTree->expandAll();
+        click(u"C1"_s);
+        QCOMPARE(openEditors(), texts("frmCDRoot U 3"));
+        mScreen->RefreshLists();
+        open("A");
+        mScreen->findChild<QTabWidget *>(u"CDTab"_s)->setCurrentIndex(0);
+        auto *list = mScreen->findChild<DBListViewCTL *>(u"ColList"_s);
+        mDesktop->expectBox(GetMessage("MsgInitFalse"));
+        for (int row = 1; row <= list->ListItems().Count(); ++row) {
+            list->setSelectedItem(list->ListItems().Item(row));
+            emit list->DblClick();
+        }
     }
 
     // A slow way to insert or to look for nodes takes seconds here.

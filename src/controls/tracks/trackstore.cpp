@@ -155,7 +155,7 @@ QList<StoredTrack> TrackStore::load() const
     const auto rows = answer.rows();
     QList<StoredTrack> tracks;
     for (qsizetype row = 0; row < rows->rowCount(); ++row) {
-        StoredTrack track{rows->integer(row, 0), {}};
+        StoredTrack track{rows->id(row, 0), {}};
         for (int field = 0; field < trackFields; ++field)
             track.texts[std::size_t(field)] = rows->text(row, 1 + field);
         tracks.append(track);

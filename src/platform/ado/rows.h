@@ -39,6 +39,12 @@ public:
     std::string_view utf8(qsizetype row, int column) const; // of a cell of kind Text
     Value value(qsizetype row, int column) const;
 
+    /// The cell as an id: 0 for whatever is no whole number, which the rules forbid there.
+    qint64 id(qsizetype row, int column) const
+    {
+        return kind(row, column) == Kind::Integer ? integer(row, column) : 0;
+    }
+
     /// The cell as text, NULL as the empty text.
     QString text(qsizetype row, int column) const;
 
