@@ -1,8 +1,8 @@
 #include "services/settingsfile.h"
 
+#include "platform/desktop/desktop.h"
 #include "services/wholefile.h"
 
-#include <QDateTime>
 #include <QDir>
 #include <QFileInfo>
 #include <QJsonDocument>
@@ -48,7 +48,7 @@ QJsonObject toJson(const QVariant &v)
 
 bool setAside(const QString &file)
 {
-    const QString stamp = QDateTime::currentDateTime().toString(u"yyyyMMdd-hhmmss"_s);
+    const QString stamp = Desktop::current().now().toString(u"yyyyMMdd-hhmmss"_s);
     QString aside = file + u".damaged-"_s + stamp;
     while (QFile::exists(aside))
         aside += u'x';

@@ -10,8 +10,8 @@
 namespace
 {
 
-constexpr int interval = 50;          // milliseconds
-constexpr qint64 timeToAnswer = 5000; // milliseconds
+constexpr int interval = 50;       // milliseconds
+constexpr int timeToAnswer = 5000; // milliseconds
 
 } // namespace
 
@@ -53,8 +53,9 @@ void EndOfProgram::refuseWhatStandsOpen()
     QWidget *open = QApplication::activeModalWidget();
     if (open != mOpen) {
         mOpen = open;
-        mOpenSince.start();
+        mOpenFor = 0;
     }
-    if (open && (!mAsking || mOpenSince.elapsed() > timeToAnswer))
+    mOpenFor += interval;
+    if (open && (!mAsking || mOpenFor > timeToAnswer))
         refuseModal();
 }

@@ -1,6 +1,5 @@
 #pragma once
 
-#include <QElapsedTimer>
 #include <QObject>
 #include <QPointer>
 #include <QTimer>
@@ -29,6 +28,6 @@ private:
     MainScreen &mFrame;
     QTimer mStep;
     QPointer<QWidget> mOpen; // the box or modal screen on top
-    QElapsedTimer mOpenSince;
-    bool mAsking = false; // the frame was closed: what opens now is for a person to answer
+    int mOpenFor = 0;        // milliseconds
+    bool mAsking = false;    // the frame was closed: what opens now is for a person to answer
 };

@@ -1,9 +1,9 @@
 #include "shell/frmSplash.h"
 
+#include "platform/desktop/paintwait.h"
 #include "services/messages.h"
 #include "shell/ui_frmSplash.h"
 
-#include <QElapsedTimer>
 #include <QScreen>
 
 using namespace Qt::StringLiterals;
@@ -65,10 +65,7 @@ void frmSplash::showWords()
 void frmSplash::waitUntilPainted()
 {
     constexpr int longest = 100; // milliseconds
-    QElapsedTimer waited;
-    waited.start();
-    while (!mUi->Picture1->isPainted() && waited.elapsed() < longest)
-        QCoreApplication::processEvents(QEventLoop::ExcludeUserInputEvents, 5);
+    paintUntil([this] { return mUi->Picture1->isPainted(); }, longest);
 }
 
 void frmSplash::setAuthor(const QString &text)

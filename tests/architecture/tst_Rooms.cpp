@@ -1,4 +1,6 @@
 // Label: unit
+#include "services/globals.h"
+#include "services/messages.h"
 #include "support/datarows.h"
 
 #include <QDir>
@@ -56,6 +58,14 @@ bool mayInclude(int room, int included)
     const auto values = valueRooms.constFind(rooms[room]);
     return values == valueRooms.end() ? included >= 0 && included < room
                                       : values->contains(rooms.value(included));
+}
+
+// places: starts of file names, "|" between.
+bool isOneOf(const QString &file, const QString &places)
+{
+    const QStringList starts = places.split(u'|');
+    return std::any_of(starts.begin(), starts.end(),
+                       [&](const QString &start) { return file.startsWith(start); });
 }
 
 QStringList includesIn(const QStringList &lines, QChar open, QChar close)
@@ -133,18 +143,77 @@ private slots:
         QFETCH(QString, header);
         QFETCH(QString, allowed);
         const QRegularExpression expression(header);
-        const QStringList starts = allowed.split(u'|');
         QStringList wrong;
         for (auto it = mSources.cbegin(); it != mSources.cend(); ++it) {
-            const bool fine = std::any_of(starts.begin(), starts.end(), [&](const QString &start) {
-                return it.key().startsWith(start);
-            });
+            const bool fine = isOneOf(it.key(), allowed);
             for (const QString &included : includesIn(it.value(), u'<', u'>')) {
                 if (!fine && expression.match(included).hasMatch())
                     wrong.append(it.key() + u" includes "_s + included);
             }
         }
         QVERIFY2(wrong.isEmpty(), qPrintable(wrong.join(u'\n')));
+    }
+
+    void callsStayInTheirPlaces_data()
+    {
+        // places: starts of file names, "|" between
+        const DataRows<QString, QString, QString> row("call", "places", "example");
+        row("events", "\\bprocessEvents\\b", "platform/desktop/|platform/work/",
+            "QApplication::processEvents();");
+        // How long ago a letter was typed belongs to the list alone.
+        row("clock",
+            "\\b(QElapsedTimer|QDeadlineTimer|std::chrono|current(Date|Time|DateTime)(Utc)?|"
+            "current(M?)SecsSinceEpoch)\\b",
+            "platform/|controls/list/DBListViewCTL", "QDateTime::currentDateTime()");
+        row("chained arg", "\\.arg\\((?:[^()]|\\([^()]*\\))*\\)\\s*\\.arg\\(", "nowhere",
+            "text.arg(f(x))\n    .arg(y)");
+    }
+
+    void callsStayInTheirPlaces()
+    {
+        QFETCH(QString, call);
+        QFETCH(QString, places);
+        QFETCH(QString, example);
+        const QRegularExpression expression(call);
+        QVERIFY(expression.match(example).hasMatch());
+        QStringList wrong;
+        for (auto it = mSources.cbegin(); it != mSources.cend(); ++it) {
+            const auto match = expression.match(it.value().join(u'\n'));
+            if (match.hasMatch() && !isOneOf(it.key(), places))
+                wrong.append(it.key() + u": "_s + match.captured());
+        }
+        QVERIFY2(wrong.isEmpty(), qPrintable(wrong.join(u'\n')));
+    }
+
+    // Keys of texts by the calls that take them, by the tables of captions, and by how they begin.
+    void textsThatAreAskedForExist()
+    {
+        static const QRegularExpression literal(u"(?<!\\w)\"([^\"]*)\"(?!_)"_s);
+        static const QRegularExpression takers(
+            u"\\b(?:GetMessage|message|refuse|errorText|paragraph)\\(((?:[^()]|\\([^()]*\\))*)\\)"_s);
+        static const QRegularExpression tables(u"applyCaptions\\(.*?\\}\\);"_s,
+                                               QRegularExpression::DotMatchesEverythingOption);
+        static const QRegularExpression caption(u"\\{\\s*\"[^\"]+\",\\s*\"([^\"]+)\""_s);
+        static const QRegularExpression start(u"(?<!\\w)\"((?:x[A-Z]|Msg|Quest|TT)\\w*)\""_s);
+        QSet<QString> keys;
+        const auto take = [&keys](const QRegularExpression &which, const QString &from) {
+            for (const auto &match : which.globalMatch(from))
+                keys.insert(match.captured(1));
+        };
+        for (const QStringList &lines : std::as_const(mSources)) {
+            const QString source = lines.join(u'\n');
+            for (const auto &call : takers.globalMatch(source))
+                take(literal, call.captured(1));
+            for (const auto &table : tables.globalMatch(source))
+                take(caption, table.captured());
+            take(start, source);
+        }
+        QVERIFY(keys.size() > 150 && keys.contains(u"MainScreen.Caption"_s));
+        keys.removeIf([](const QString &key) {
+            const QByteArray name = key.toLatin1();
+            return GetMessage(QLatin1String(name), languageEnglish) != u"Unknown"_s;
+        });
+        QCOMPARE(QStringList(keys.begin(), keys.end()), QStringList());
     }
 
     void filesStayShort()

@@ -1,4 +1,5 @@
 #include "fuzz/fuzz.h"
+#include "platform/desktop/qtdesktop.h"
 #include "support/texts.h"
 
 #include <QCommandLineParser>
@@ -70,6 +71,8 @@ extern "C" void __sanitizer_set_death_callback(void (*callback)());
 int main(int argc, char **argv)
 {
     const QCoreApplication application(argc, argv);
+    QtDesktop desktop; // for the time of day
+    Desktop::setCurrent(&desktop);
     QCommandLineParser options;
     options.addOptions({{u"seconds"_s, u"For all targets."_s, u"N"_s, u"10"_s},
                         {u"target"_s, u"This one alone."_s, u"NAME"_s},
