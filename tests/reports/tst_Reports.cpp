@@ -125,6 +125,18 @@ private slots:
                  qPrintable(text.last(300)));
     }
 
+    void theLastPageFirst()
+    {
+        Report *report = openLong(150);
+        const QString paper = path(u"paper.pdf"_s);
+        mDesktop->expectPrinter(paper, QPrinter::LastPageFirst);
+        press(report, "cmdPrint");
+        const QStringList pages = textOf(paper, u"-layout"_s).split(QChar(u'\f'));
+        QCOMPARE(pages.size(), 4);
+        for (int page = 0; page < 3; ++page)
+            QVERIFY(pages[page].contains(u"Page %1 of 3"_s.arg(3 - page)));
+    }
+
     void textsStayWithinTheMargins()
     {
         mCatalogue->exec(manyDiscs());

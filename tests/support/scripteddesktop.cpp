@@ -6,14 +6,14 @@
 #include "platform/desktop/qtdesktop.h"
 #include "support/texts.h"
 
-#include <QPrinter>
+#include <QApplication>
 #include <QTest>
 #include <QTimer>
 
 namespace
 {
 
-constexpr int modalAtMost = 30000; // milliseconds
+constexpr int modalAtMost = 10000; // milliseconds
 
 void failTest(const QString &why)
 {
@@ -59,8 +59,8 @@ void ScriptedDesktop::verifyAllCame()
         failTest(u"This screen did not come: "_s + modal.name);
     for (const QString &file : mFiles)
         failTest(u"No dialog asked for: "_s + file);
-    for (const QString &printer : mPrinters)
-        failTest(u"Nothing was printed: "_s + printer);
+    for (const Printer &printer : mPrinters)
+        failTest(u"Nothing was printed: "_s + printer.file);
     mBoxes.clear();
     mModals.clear();
     mFiles.clear();
@@ -102,7 +102,11 @@ void ScriptedDesktop::showModal(Form &form)
     });
     guard.start(modalAtMost);
     if (script)
-        QTimer::singleShot(0, &form, [script, alive] { script(*alive); });
+        QTimer::singleShot(0, &form, [script, alive] {
+            script(*alive);
+            if (alive && QTest::currentTestFailed())
+                alive->hide(); // the script may have ended in its midst
+        });
     runModal(form);
 }
 
@@ -138,12 +142,13 @@ PrinterChoice ScriptedDesktop::choosePrinter(QPrinter &printer, int)
         failTest(u"Unexpected dialog: printer"_s);
         return PrinterChoice::Cancelled;
     }
-    const QString file = mPrinters.front();
+    const Printer chosen = mPrinters.front();
     mPrinters.pop_front();
-    if (file.isEmpty())
+    if (chosen.file.isEmpty())
         return PrinterChoice::NoPrinter;
     printer.setOutputFormat(QPrinter::PdfFormat);
-    printer.setOutputFileName(file);
+    printer.setOutputFileName(chosen.file);
+    printer.setPageOrder(chosen.order);
     return PrinterChoice::Chosen;
 }
 
@@ -171,4 +176,19 @@ bool ScriptedDesktop::openAddress(const QString &url)
 {
     addresses.append(url);
     return browserThere;
+}
+
+void inNextBox(const std::function<void(QMessageBox &)> &act)
+{
+    QTimer::singleShot(0, qApp, [act] {
+        const QPointer<QMessageBox> box =
+            qobject_cast<QMessageBox *>(QApplication::activeModalWidget());
+        if (!box) {
+            failTest(u"No box came"_s);
+            return;
+        }
+        act(*box);
+        if (box && box->isVisible())
+            box->done(0);
+    });
 }

@@ -2,6 +2,8 @@
 
 #include "platform/desktop/desktop.h"
 
+#include <QMessageBox>
+#include <QPrinter>
 #include <QStringList>
 #include <QTemporaryDir>
 #include <deque>
@@ -29,7 +31,10 @@ public:
 
     /// The next question for a printer gets one that prints into this file; without a name the
     /// machine has none.
-    void expectPrinter(const QString &file) { mPrinters.push_back(file); }
+    void expectPrinter(const QString &file, QPrinter::PageOrder order = QPrinter::FirstPageFirst)
+    {
+        mPrinters.push_back({file, order});
+    }
 
     /// Fails the test if something announced did not come.
     void verifyAllCame();
@@ -70,5 +75,14 @@ private:
     };
     std::deque<Box> mBoxes;
     std::deque<Modal> mModals;
-    std::deque<QString> mFiles, mPrinters;
+    struct Printer {
+        QString file;
+        QPrinter::PageOrder order;
+    };
+    std::deque<QString> mFiles;
+    std::deque<Printer> mPrinters;
 };
+
+/// Does this in the next real box that comes, and ends the box whatever becomes of it: a QCOMPARE
+/// that fails leaves its function at once, and the box would wait for ever.
+void inNextBox(const std::function<void(QMessageBox &)> &act);

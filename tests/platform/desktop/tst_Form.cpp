@@ -253,20 +253,31 @@ private slots:
         Desktop::current().freeze(nullptr);
     }
 
+    // A comparison that fails leaves its function at once, here on purpose.
+    void aBoxEndsThoughItsTestFails()
+    {
+        inNextBox([](QMessageBox &) {
+            QEXPECT_FAIL("", "on purpose", Continue);
+            QVERIFY(false);
+            QEXPECT_FAIL("", "on purpose", Abort);
+            QVERIFY(false);
+            QFAIL("not reached");
+        });
+        QtDesktop().messageBox(BoxKind::Question, BoxButtons::YesNo, u"?"_s, u"t"_s);
+    }
+
     void questionOnlyItsButtonsAnswer()
     {
         QtDesktop real;
         QString text;
         const auto answer = [&](BoxButtons buttons) {
-            QTimer::singleShot(0, this, [&] {
-                auto *box = qobject_cast<QMessageBox *>(QApplication::activeModalWidget());
-                QVERIFY(box);
-                QCOMPARE(box->textFormat(), Qt::PlainText);
-                text = box->text();
-                QTest::keyClick(box, Qt::Key_Escape);
-                box->close();
-                if (box->isVisible())
-                    QTest::keyClick(box, Qt::Key_Return); // Yes is the default
+            inNextBox([&](QMessageBox &box) {
+                QCOMPARE(box.textFormat(), Qt::PlainText);
+                text = box.text();
+                QTest::keyClick(&box, Qt::Key_Escape);
+                box.close();
+                if (box.isVisible())
+                    QTest::keyClick(&box, Qt::Key_Return); // Yes is the default
             });
             return real.messageBox(BoxKind::Question, buttons, u"<b>\rnext"_s, u"t"_s);
         };
@@ -284,8 +295,8 @@ private slots:
         bool aliveBehindBox = false;
         inMainLoop([&] {
             QTimer::singleShot(0, form, [&] {
-                QVERIFY(form->Unload());
                 QTimer::singleShot(60, qApp, [] { refuseModal(); }); // longer than it is looked at
+                QVERIFY(form->Unload());
             });
             real.messageBox(BoxKind::Error, BoxButtons::Ok, u"wrong"_s, u"t"_s);
             aliveBehindBox = form;
