@@ -1,4 +1,5 @@
 // Label: journey
+#include "catalogue/cataloguefile.h"
 #include "collection/frmCDList.h"
 #include "collection/frmCDRoot.h"
 #include "collection/frmCDRootE.h"
@@ -13,6 +14,7 @@
 #include "shell/frmHelp.h"
 #include "shell/frmSplash.h"
 #include "support/datarows.h"
+#include "support/program.h"
 #include "support/scripteddesktop.h"
 #include "support/testcatalogue.h"
 #include "textimport/frmImport.h"
@@ -24,12 +26,16 @@
 #include <QAbstractItemView>
 #include <QAbstractSpinBox>
 #include <QComboBox>
+#include <QDirIterator>
+#include <QHeaderView>
 #include <QLabel>
 #include <QLineEdit>
 #include <QProgressBar>
 #include <QPushButton>
 #include <QRadioButton>
+#include <QStatusBar>
 #include <QStyle>
+#include <QTabBar>
 #include <QTabWidget>
 #include <QTest>
 #include <QTimer>
@@ -116,8 +122,19 @@ Form *makeLandscapeSetup()
 
 QString textOf(const QWidget *w)
 {
-    return w->property("text").toString() + w->property("title").toString() + w->windowTitle() +
-           w->toolTip() + w->accessibleName();
+    QString text = w->property("text").toString() + w->property("title").toString() +
+                   w->windowTitle() + w->toolTip() + w->accessibleName();
+    if (const auto *bar = qobject_cast<const QTabBar *>(w)) {
+        for (int tab = 0; tab < bar->count(); ++tab)
+            text += bar->tabText(tab);
+    }
+    if (const auto *head = qobject_cast<const QHeaderView *>(w); head && head->model()) {
+        for (int section = 0; section < head->count(); ++section)
+            text += head->model()->headerData(section, head->orientation()).toString();
+    }
+    if (const auto *bar = qobject_cast<const QStatusBar *>(w))
+        text += bar->currentMessage();
+    return text;
 }
 
 bool needsName(const QWidget *w)
@@ -193,27 +210,85 @@ class tst_Screens : public QObject
 {
     Q_OBJECT
 
+    using Screens = std::vector<std::pair<const char *, Make>>;
+    static Screens screens()
+    {
+        return {{"frmSplash", make<frmSplash>()},
+                {"frmHelp", make<frmHelp>()},
+                {"frmCDList", make<frmCDList>()},
+                {"frmCDRoot", makeEditor<frmCDRoot>()},
+                {"frmCDRootE", makeEditor<frmCDRootE>()},
+                {"frmImportWizard", make<frmImportWizard>()},
+                {"frmImportBusy", make<frmImportBusy>()},
+                {"frmImport", make<frmImport>()},
+                {"frmImportDBBusy", make<frmImportDBBusy>()},
+                {"frmSearchArtistsTitles", make<frmSearchArtistsTitles>()},
+                {"CompilationReport", makeReport<CompilationReport>()},
+                {"AlbumReport", makeReport<AlbumReport>()},
+                {"PlatenbakReport", makeReport<PlatenbakReport>()},
+                {"frmPageSetup", makePageSetup}};
+    }
+
+    static void check(const QWidget *screen)
+    {
+        for (const QWidget *w : screen->findChildren<QWidget *>()) {
+            const QByteArray name = w->objectName().toLatin1();
+            const QString text = textOf(w);
+            QVERIFY2(!text.contains("Unknown"_L1) && !text.contains("Onbekend"_L1), name);
+            if (isPartOfAnother(w) || !w->isVisible())
+                continue;
+            QVERIFY2(!needsName(w) || hasName(w, screen),
+                     QByteArray(name).append(": no name for a screen reader"));
+            QVERIFY2(!isCut(w), QByteArray(name).append(": text cut: ").append(text.toUtf8()));
+        }
+    }
+
 private slots:
+    void everyFileOfAScreenIsHere()
+    {
+        ScriptedDesktop desktop;
+        TestCatalogue catalogue;
+        QSet<QString> here{u"MainScreen"_s}; // by theFrame()
+        for (const auto &[name, make] : screens()) {
+            const std::unique_ptr<Form> screen(make());
+            for (auto *type = screen->metaObject(); type; type = type->superClass())
+                here.insert(QString::fromLatin1(type->className()));
+        }
+        QStringList missing;
+        QDirIterator it(qEnvironmentVariable("SONGCASE_SOURCE") + u"/src"_s, {u"*.ui"_s},
+                        QDir::Files, QDirIterator::Subdirectories);
+        QVERIFY(it.hasNext());
+        while (it.hasNext()) {
+            const QString name = QFileInfo(it.next()).completeBaseName();
+            if (!here.contains(name))
+                missing.append(name);
+        }
+        QCOMPARE(missing, QStringList());
+    }
+
+    void theFrame_data()
+    {
+        const DataRows<int> row("language");
+        row("English", languageEnglish);
+        row("Dutch", languageDutch);
+    }
+    void theFrame()
+    {
+        QFETCH(int, language);
+        ScriptedDesktop desktop;
+        cataloguefile::create(desktop.folder + u"/Compact4.orv"_s);
+        storeLanguage(language);
+        Program program(desktop);
+        QVERIFY(program.start());
+        check(&program.frame());
+        QVERIFY(program.end());
+    }
+
     void everyScreen_data()
     {
         QTest::addColumn<int>("language");
         QTest::addColumn<Make>("make");
-        const std::pair<const char *, Make> screens[] = {
-            {"frmSplash", make<frmSplash>()},
-            {"frmHelp", make<frmHelp>()},
-            {"frmCDList", make<frmCDList>()},
-            {"frmCDRoot", makeEditor<frmCDRoot>()},
-            {"frmCDRootE", makeEditor<frmCDRootE>()},
-            {"frmSearchArtistsTitles", make<frmSearchArtistsTitles>()},
-            {"frmImportWizard", make<frmImportWizard>()},
-            {"frmImportBusy", make<frmImportBusy>()},
-            {"frmImport", make<frmImport>()},
-            {"frmImportDBBusy", make<frmImportDBBusy>()},
-            {"CompilationReport", makeReport<CompilationReport>()},
-            {"AlbumReport", makeReport<AlbumReport>()},
-            {"PlatenbakReport", makeReport<PlatenbakReport>()},
-            {"frmPageSetup", makePageSetup}};
-        for (const auto &[name, make] : screens) {
+        for (const auto &[name, make] : screens()) {
             QTest::newRow(QByteArray(name).append(", English")) << languageEnglish << make;
             QTest::newRow(QByteArray(name).append(", Dutch")) << languageDutch << make;
         }
@@ -233,17 +308,7 @@ private slots:
         screen->Show();
         QVERIFY(QTest::qWaitForWindowExposed(screen));
         QVERIFY2(!screen->windowTitle().isEmpty(), "a window without a title");
-
-        for (const QWidget *w : screen->findChildren<QWidget *>()) {
-            const QByteArray name = w->objectName().toLatin1();
-            const QString text = textOf(w);
-            QVERIFY2(!text.contains("Unknown"_L1) && !text.contains("Onbekend"_L1), name);
-            if (isPartOfAnother(w) || !w->isVisible())
-                continue;
-            QVERIFY2(!needsName(w) || hasName(w, screen),
-                     QByteArray(name).append(": no name for a screen reader"));
-            QVERIFY2(!isCut(w), QByteArray(name).append(": text cut: ").append(text.toUtf8()));
-        }
+        check(screen);
         screen->Unload();
         QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
     }
