@@ -292,6 +292,30 @@ private slots:
         emit list()->DblClick();
     }
 
+    // The numbers of tracks are what they are: some are missing, some have gaps before them.
+    void theRowOfAFoundTrack_data()
+    {
+        const DataRows<QString, int> row("number", "row");
+        row("none", "", 1);
+        row("behind none", "3", 2);
+        row("behind a gap", "7", 3);
+    }
+    void theRowOfAFoundTrack()
+    {
+        QFETCH(QString, number);
+        mCatalogue->exec("insert into CDTitels values (9,'Gaps',null,'V',null,null);"
+                         "insert into CompactDiscs values (9001,9,1,7,101,null),"
+                         "(9002,9,1,null,102,null),(9003,9,1,3,103,null),(9004,9,2,1,104,null)");
+        search();
+        const auto found =
+            shown().indexOf(QRegularExpression(u".*\\|1\\|"_s + number + u"\\|Gaps\\|.*"_s));
+        QVERIFY(found >= 0);
+        list()->setSelectedItem(list()->ListItems().Item(int(found) + 1));
+        emit list()->DblClick();
+        QVERIFY(editor(u"frmCDRoot"_s));
+        QTEST(editor(u"frmCDRoot"_s)->findChild<TrackGrid *>()->CurrentRow(), "row");
+    }
+
     void exportsTheListAsItIsShown()
     {
         const QString name = mCatalogue->path(u"out"_s);

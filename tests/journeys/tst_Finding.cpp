@@ -34,6 +34,30 @@ private:
     }
 
 private slots:
+    // Of the button as long as it can be pressed, and else of the menu "&Songcase".
+    void anAccessKey_data()
+    {
+        const DataRows<bool> row("enabled");
+        row("of a button", true);
+        row("of a disabled one", false);
+    }
+    void anAccessKey()
+    {
+        QFETCH(bool, enabled);
+        start(languageEnglish);
+        mProgram->choose("mnuSearchArtistsTitles");
+        QTRY_VERIFY(
+            mProgram->control<QLineEdit>("frmSearchArtistsTitles", "txtArtistKey")->hasFocus());
+        mProgram->control<QPushButton>("frmSearchArtistsTitles", "cmdSearch")->setEnabled(enabled);
+        keyboard::press(Qt::Key_S, Qt::AltModifier);
+        QWidget *menu = QApplication::activePopupWidget();
+        QCOMPARE(bool(menu), !enabled);
+        if (menu)
+            menu->close();
+        const auto *status = mProgram->control<QStatusBar>("frmSearchArtistsTitles", "StatusBar");
+        QCOMPARE(status->currentMessage().startsWith(GetMessage("NumberFound")), enabled);
+    }
+
     void aSongIsFoundKeptAndPrinted_data() { languages(); }
     void aSongIsFoundKeptAndPrinted()
     {

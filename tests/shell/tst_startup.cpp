@@ -61,16 +61,18 @@ private slots:
     void proxySettingsCountOnlyWhenOneIsUsed()
     {
         ScriptedDesktop desktop;
-        store("ProxyServer", u"proxy"_s);
-        store("ProxyServerPort", u"8080"_s);
-        QCOMPARE(startup::ReadProxySettings(), QString());
-        QVERIFY(!gUseProxy);
-        QCOMPARE(gProxyServer, QString());
-        QCOMPARE(gProxyServerPort, u"0"_s);
-        store("UseProxy", 1);
-        QCOMPARE(startup::ReadProxySettings(), u"1"_s);
-        QVERIFY(gUseProxy);
-        QCOMPARE(gProxyServer + gProxyServerPort, u"proxy8080"_s);
+        const auto names =
+            texts("ProxyServer", "ProxyServerPort", "ProxyUserName", "ProxyPassword");
+        for (const QString &name : names)
+            store(name.toLatin1().constData(), name);
+        for (const char *use : {"", "1", "0", "1", "yes"}) { // what was read before goes
+            if (*use)
+                store("UseProxy", QString::fromLatin1(use));
+            QCOMPARE(startup::ReadProxySettings(), QLatin1String(use));
+            QCOMPARE(gUseProxy, *use == '1');
+            const QStringList read{gProxyServer, gProxyServerPort, gProxyUserName, gProxyPassword};
+            QCOMPARE(read, gUseProxy ? names : texts("", "0", "", ""));
+        }
     }
 };
 
