@@ -1,5 +1,6 @@
 // Label: unit
 #include "catalogue/cataloguefile.h"
+#include "catalogue/connect.h"
 #include "platform/ado/recordset.h"
 #include "services/globals.h"
 #include "support/datarows.h"
@@ -114,6 +115,14 @@ private slots:
         const QString nowhere = folder() + u"/none/Compact4.orv"_s;
         QVERIFY_EXCEPTION_THROWN(cataloguefile::create(nowhere), Error);
         QVERIFY(!QFile::exists(nowhere));
+    }
+
+    void syncsTheFolderToo()
+    {
+        ADODB::Connection connection;
+        configureConnection(connection, file());
+        connection.Open();
+        QCOMPARE(connection.housekeeping("PRAGMA synchronous"), u"3"_s); // EXTRA
     }
 
     void wrongOnes_data()

@@ -190,7 +190,9 @@ void Connection::Open(const QString &, const QString &, const QString &connectio
         sqlite3_db_config(mEngine->db, SQLITE_DBCONFIG_TRUSTED_SCHEMA, 0, nullptr);
         sqlite3_db_config(mEngine->db, SQLITE_DBCONFIG_DQS_DML, 0, nullptr);
         check(registerFunctions(mEngine->db));
-        check(mEngine->exec("PRAGMA synchronous=FULL; PRAGMA temp_store=MEMORY; "
+        // EXTRA: until the folder is synced too, a power cut can bring back the journal of a
+        // change that was told as saved, and the journal the catalogue from before it.
+        check(mEngine->exec("PRAGMA synchronous=EXTRA; PRAGMA temp_store=MEMORY; "
                             "PRAGMA cache_size=-64000; PRAGMA cell_size_check=ON;"));
     } catch (const Error &) {
         mEngine.reset();
