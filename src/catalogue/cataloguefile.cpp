@@ -1,14 +1,14 @@
 #include "catalogue/cataloguefile.h"
 
+#include "catalogue/schemacheck.h"
+#include "platform/ado/connection.h"
 #include "platform/ado/engineerror.h"
-#include "platform/ado/recordset.h"
 #include "platform/ado/sqlfunctions.h"
 #include "platform/text/collation.h"
 #include "services/messages.h"
 
 #include <QFile>
 #include <QFileInfo>
-#include <QtEndian>
 #include <sqlite3.h>
 
 using namespace Qt::StringLiterals;
@@ -61,14 +61,9 @@ insert into sqlite_stat1(tbl, idx, stat) values
     ('MP3Files', 'MP3FilesCollection', '2000 12 1');
 )sql";
 
-constexpr const char *tables[] = {"Artiesten",    "Tracks",         "CDTitels",
-                                  "CompactDiscs", "MP3Collections", "MP3Files"};
-
-// A catalogue of this size is checked through in a few milliseconds, so each start does it.
-constexpr qint64 quicklyChecked = 8 << 20;
-
-constexpr qsizetype headerSize = 100;
-constexpr qsizetype versionOffset = 60, applicationOffset = 68;
+// Compared through, each index with its table, this takes a quarter of a second; a look at how the
+// pages hang together is ten times as quick and is taken at any size.
+constexpr qint64 quicklyCompared = 16 << 20;
 
 int currentVersion()
 {
@@ -78,20 +73,6 @@ int currentVersion()
 QByteArray pragma(const char *name, int value)
 {
     return QByteArray("PRAGMA ") + name + '=' + QByteArray::number(value);
-}
-
-[[noreturn]] void refuse(ErrorNumber number, const char *key)
-{
-    throw Error(number, u"Songcase"_s, GetMessage(key));
-}
-
-bool mayBeWritten(const QFileInfo &file)
-{
-    // The bits are looked at as well: some users the system does not stop, and "WriteUser" says so.
-    constexpr auto anyWrite = QFile::WriteOwner | QFile::WriteGroup | QFile::WriteOther;
-    const QFileInfo folder(file.absolutePath());
-    return file.isWritable() && (file.permissions() & anyWrite) && folder.isWritable() &&
-           (folder.permissions() & anyWrite);
 }
 
 } // namespace
@@ -121,49 +102,29 @@ void create(const QString &file)
     }
 }
 
-void inspect(const QString &name)
-{
-    const QFileInfo info(name);
-    QFile file(name);
-    if (info.isDir())
-        refuse(errCannotUse, "xNotACatalogue");
-    if (!file.open(QIODevice::ReadOnly))
-        throw ADODB::engineError(SQLITE_CANTOPEN, file.errorString());
-    const QByteArray header = file.read(headerSize);
-    const bool database = header.size() == headerSize && header.startsWith("SQLite format 3");
-    if (!database ||
-        qFromBigEndian<qint32>(header.constData() + applicationOffset) != applicationId)
-        refuse(errCannotUse, "xNotACatalogue");
-    if (qFromBigEndian<quint32>(header.constData() + versionOffset) >> 24 > quint32(formatVersion))
-        refuse(errCannotUse, "xNewerCatalogue");
-    if (!mayBeWritten(info))
-        refuse(errReadOnly, "xReadOnly");
-}
-
 namespace
 {
 
-void requireTables(ADODB::Connection &connection)
+void requireSound(ADODB::Connection &connection, bool thorough)
 {
-    ADODB::Recordset names;
-    names.Open(u"select name as Name from sqlite_schema where type='table'"_s, connection);
-    QStringList found;
-    for (; !names.isEOF(); names.MoveNext())
-        found.append(names.Fields(0).Value().toText().toLower());
-    for (const char *table : tables) {
-        if (!found.contains(QLatin1String(table).toString().toLower()))
-            refuse(errCannotUse, "xTablesMissing");
-    }
+    const char *check = thorough ? "PRAGMA integrity_check(1)" : "PRAGMA quick_check(1)";
+    if (connection.housekeeping(check) != "ok"_L1)
+        throw Error(errCannotUse, u"Songcase"_s, GetMessage("xDamaged"));
 }
 
-void keepSortOrder(ADODB::Connection &connection)
+bool quicklyComparable(const ADODB::Connection &connection)
 {
-    if (connection.housekeeping("PRAGMA user_version").toInt() == currentVersion())
-        return;
-    ADODB::Transaction transaction(connection);
-    connection.housekeeping("REINDEX SONGCASE");
-    connection.housekeeping(pragma("user_version", currentVersion()).constData());
-    transaction.CommitTrans();
+    const QFileInfo file(ADODB::Connection::dataSource(connection.ConnectionString));
+    return file.size() <= quicklyCompared;
+}
+
+// Indexes and statistics that an older version made, or none; another version of the sort order.
+QByteArray remedyFor(ADODB::Connection &connection)
+{
+    QByteArray remedy = schemacheck::compare(connection, QByteArray(schema) + statistics);
+    if (connection.housekeeping("PRAGMA user_version").toInt() != currentVersion())
+        remedy += "REINDEX SONGCASE;" + pragma("user_version", currentVersion());
+    return remedy;
 }
 
 } // namespace
@@ -171,18 +132,15 @@ void keepSortOrder(ADODB::Connection &connection)
 void verify(ADODB::Connection &connection, bool thorough)
 {
     // Fails here and not at the first change if another program holds the file.
-    {
-        ADODB::Transaction probe(connection);
-        probe.RollbackTrans();
+    ADODB::Transaction transaction(connection);
+    if (const QByteArray remedy = remedyFor(connection); !remedy.isEmpty()) {
+        requireSound(connection, false);
+        connection.housekeeping(remedy.constData());
     }
-    requireTables(connection);
-    const QFileInfo file(ADODB::Connection::dataSource(connection.ConnectionString));
-    const bool check = thorough || file.size() <= quicklyChecked;
-    if (check && connection.housekeeping("PRAGMA quick_check(1)") != "ok"_L1)
-        refuse(errCannotUse, "xDamaged");
+    requireSound(connection, thorough || quicklyComparable(connection));
+    transaction.CommitTrans();
     // Another program may have left it in a mode that keeps files beside it.
     connection.housekeeping("PRAGMA journal_mode=DELETE");
-    keepSortOrder(connection);
 }
 
 } // namespace cataloguefile

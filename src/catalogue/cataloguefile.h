@@ -18,13 +18,15 @@ inline constexpr int formatVersion = 4;
 /// Error.
 void create(const QString &file);
 
-/// Looks at the bytes of a file that is to be opened, without the engine: whether it is a catalogue
-/// of this program, and may be written. Throws Error; the file is not touched.
+/// Looks at the bytes of a file that is to be opened, and at what lies beside it, without the
+/// engine: whether it is a catalogue of this program, may be written, and can be given to the
+/// engine at all. Throws Error; no file is touched.
 void inspect(const QString &file);
 
-/// After it was opened: whether nobody has locked it, all six tables are there and, with `thorough`
-/// or when that is quick, whether it is undamaged. Indexes that were made under another version of
-/// the sort order are made anew. Throws Error.
+/// After it was opened: whether nobody has locked it, it holds the six tables and nothing that a
+/// new one does not hold, and is undamaged. With `thorough`, or when that is quick, every index is
+/// compared with its table. Indexes that were made by another version of the program or of the sort
+/// order are made anew. Throws Error; the file is then as it was.
 void verify(ADODB::Connection &connection, bool thorough);
 
 } // namespace cataloguefile

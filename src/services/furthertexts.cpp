@@ -12,7 +12,10 @@ namespace messagetable
 const Message furtherTexts[] = {
     {"xInUse", "This catalogue is in use by another program or another user.", "Deze database is in gebruik bij een ander programma of een andere gebruiker."},
     {"xNotACatalogue", "The file is not a catalogue of this program.", "Het bestand is geen database van dit programma."},
-    {"xTablesMissing", "The file is not a complete catalogue: a table is missing.", "Het bestand is geen volledige database: er ontbreekt een tabel."},
+    {"xTablesMissing", "The file is not a complete catalogue: a table is missing: ", "Het bestand is geen volledige database: er ontbreekt een tabel: "},
+    {"xTableDiffers", "The file was not made by this program: its columns differ in the table ", "Het bestand is niet door dit programma gemaakt: het heeft andere kolommen in de tabel "},
+    {"xForeignPart", "The file was not made by this program alone, and it is not safe to use it. It holds this: ", "Het bestand is niet alleen door dit programma gemaakt en het gebruik ervan is niet veilig. Het bevat dit: "},
+    {"xForeignJournal", "A file beside the catalogue was not made by this program, and it is not safe to use them: ", "Een bestand naast de database is niet door dit programma gemaakt en het gebruik ervan is niet veilig: "},
     {"xDamaged", "The catalogue is damaged. Please put back your last copy of it.", "De database is beschadigd. Zet uw laatste kopie ervan terug."},
     {"xReadOnly", "The catalogue or its folder is read-only.", "De database of de map ervan is alleen-lezen."},
     {"xNewerCatalogue", "The catalogue was made by a newer version of this program.", "De database is gemaakt met een nieuwere versie van dit programma."},

@@ -9,9 +9,12 @@
 
 #include <QDir>
 #include <QFile>
+#include <QtEndian>
 #include <csignal>
 #include <sqlite3.h>
+#include <sys/stat.h>
 #include <sys/wait.h>
+#include <unistd.h>
 
 namespace
 {
@@ -125,6 +128,165 @@ private slots:
         QCOMPARE(connection.housekeeping("PRAGMA synchronous"), u"3"_s); // EXTRA
     }
 
+    void runsNothingOfTheFile()
+    {
+        exec("create table seen(x); create trigger t after insert on artiesten begin "
+             "insert into seen values (1); end; create view v as select 1 as x");
+        openConnection(file());
+        gConnection->Execute(u"insert into artiesten values (2000,'new')"_s);
+        QCOMPARE(gConnection->housekeeping("select count(*) from seen"), u"0"_s);
+        QVERIFY(numberOf([] { gConnection->Execute(u"select x from v"_s); }) != 0);
+    }
+
+    void preparedByOthers_data()
+    {
+        const DataRows<QString, QString> row("made", "told");
+        const auto again = [&](const char *name, const char *table, const QString &columns,
+                               const AnyText &told = {"table MP3Files"}) {
+            row(name, u"drop table %1; create table %1(%2)"_s.arg(QLatin1String(table), columns),
+                told);
+        };
+        row("trigger",
+            "create trigger artiesten after delete on Tracks begin delete from Artiesten; end",
+            "trigger artiesten");
+        row("view", "create view v as select 1", "view v");
+        row("table", "create table more(x)", "table more");
+        row("virtual table", "create virtual table v using fts5(x)", "table v");
+        row("index", "create index i on Tracks(Genre)", "index i");
+        row("index with a condition",
+            "drop index ArtiestenNaam; create index ArtiestenNaam on Artiesten(Naam) where ID>5",
+            "index ArtiestenNaam");
+        row("view for a table", "drop table MP3Files; create view MP3Files as select 1 as ID",
+            "view MP3Files");
+        row("further column", "alter table Tracks add column Map text", "table Tracks");
+        row("generated column", "alter table Tracks add column g as (ID+1)", "table Tracks");
+        const QString rest = u"Volgnummer integer, FileName text collate SONGCASE, "
+                             "CollectionId integer"_s;
+        again("no key", "MP3Files", u"ID integer, "_s + rest);
+        again("condition", "MP3Files", u"ID integer primary key check(ID<9), "_s + rest);
+        again("rule for conflicts", "MP3Files",
+              u"ID integer primary key on conflict replace, "_s + rest);
+        again("numbers counted on", "MP3Files", u"ID integer primary key autoincrement, "_s + rest);
+        again("default", "MP3Files", u"ID integer primary key, "_s + rest + u" default 1"_s);
+        again("other key", "Artiesten", u"ID integer, Naam text collate SONGCASE primary key"_s,
+              "index sqlite_autoindex_Artiesten_1");
+        again("other order of letters", "Artiesten", u"ID integer primary key, Naam text"_s,
+              "table Artiesten");
+        again("other type", "Artiesten", u"ID integer primary key, Naam integer collate SONGCASE"_s,
+              "table Artiesten");
+    }
+
+    void preparedByOthers()
+    {
+        QFETCH(QString, made);
+        QFETCH(QString, told);
+        exec(made.toUtf8());
+        const auto before = snapshot();
+        const QString said = opening();
+        gConnection.reset();
+        QVERIFY2(said.contains("not made by this program"_L1) && said.endsWith(told),
+                 qPrintable(said));
+        QCOMPARE(snapshot(), before);
+    }
+
+    // Made by another tool or an older version: it holds the same tables.
+    void putsRight_data()
+    {
+        const DataRows<QString> row("made");
+        row("no index", "drop index TracksArtiest; drop index MP3FilesCollection");
+        row("older indexes", "drop index CompactDiscsTrack; "
+                             "create index CompactDiscsTrack on CompactDiscs(Track_ID)");
+        row("no statistics", "drop table sqlite_stat1");
+        row("others' statistics", "analyze");
+    }
+
+    void putsRight()
+    {
+        const auto shape = [this] {
+            const OtherProgram other(file());
+            QStringList all;
+            const auto take = [](void *to, int, char **values, char **) {
+                static_cast<QStringList *>(to)->append(QLatin1String(values[0]));
+                return 0;
+            };
+            sqlite3_exec(other.db,
+                         "select type||name||sql from sqlite_schema union all "
+                         "select tbl||idx||stat from sqlite_stat1 order by 1",
+                         take, &all, nullptr);
+            return all;
+        };
+        const QStringList asNew = shape();
+        QFETCH(QString, made);
+        exec(made.toUtf8());
+        QVERIFY(shape() != asNew);
+        QCOMPARE(opening(), QString());
+        QCOMPARE(gConnection->housekeeping("PRAGMA integrity_check"), u"ok"_s);
+        gConnection.reset();
+        QCOMPARE(shape(), asNew);
+        const auto mended = snapshot();
+        QCOMPARE(opening(), QString()); // once, not at every start
+        gConnection.reset();
+        QCOMPARE(snapshot(), mended);
+    }
+
+    void takesTheSameTablesWrittenOtherwise()
+    {
+        exec("drop table MP3Collections; create table \"mp3collections\" ([id] INTEGER,\n"
+             "\t`Map` TEXT COLLATE songcase, 'Album' text collate SONGCASE, PRIMARY KEY(\"id\"))");
+        const auto before = snapshot();
+        QCOMPARE(opening(), QString());
+        gConnection.reset();
+        QCOMPARE(snapshot(), before);
+    }
+
+    // A hot journal, the last change of which was one over several files.
+    void journalThatNamesAnother()
+    {
+        const QString victim = writeFile(folder() + u"/letter.txt"_s, "dear"),
+                      journal = file() + u"-journal"_s;
+        const auto number = [](quint32 n) {
+            return QByteArray(reinterpret_cast<const char *>(&(n = qToBigEndian(n))), 4);
+        };
+        const QByteArray mark = QByteArray::fromHex("d9d505f920a163d7"), name = victim.toUtf8();
+        const auto pages = quint32(QFileInfo(file()).size() / 4096);
+        quint32 sum = 0;
+        for (const char c : name)
+            sum += quint32(c);
+        const QByteArray header =
+            mark + number(0) + number(0) + number(pages) + number(512) + number(4096);
+        writeFile(journal, header.leftJustified(512, 0) + number((1 << 30) / 4096 + 1) + name +
+                               number(quint32(name.size())) + number(sum) + mark);
+        const auto before = snapshot();
+        QVERIFY2(opening().endsWith(journal), "named");
+        gConnection.reset();
+        QCOMPARE(snapshot(), before);
+        // What it would have been good for.
+        exec("select * from Artiesten");
+        QVERIFY(!QFile::exists(victim));
+    }
+
+    void pipes_data()
+    {
+        const DataRows<QString, QString> row("end", "told");
+        row("catalogue", "", "not a catalogue");
+        row("journal", "-journal", "-journal");
+        row("log", "-wal", "-wal");
+    }
+
+    // To open one is to wait for ever.
+    void pipes()
+    {
+        QFETCH(QString, end);
+        const QByteArray name = (file() + end).toUtf8();
+        QFile::remove(file() + end);
+        QCOMPARE(mkfifo(name.constData(), 0600), 0);
+        alarm(20);
+        const QString said = opening();
+        alarm(0);
+        QFETCH(QString, told);
+        QVERIFY2(said.contains(told), qPrintable(said));
+    }
+
     void wrongOnes_data()
     {
         const DataRows<QString, QString> row("kind", "told");
@@ -134,7 +296,8 @@ private slots:
         row("not there", "cannot be opened");
         row("no rights", "cannot be opened");
         row("newer", "newer version");
-        row("table missing", "table is missing");
+        row("table missing", "table is missing: MP3Files");
+        row("index damaged", "damaged");
         row("half", "damaged");
         row("garbage schema", "damaged");
         row("overwritten middle", "damaged");
@@ -164,6 +327,10 @@ private slots:
             exec("pragma user_version=83886080"); // 5 << 24
         } else if (is("table missing")) {
             exec("drop table MP3Files");
+        } else if (is("index damaged")) { // no page of it is: a name is another one there
+            QByteArray bytes = readFile(f);
+            const auto at = bytes.lastIndexOf("artist 777");
+            writeFile(f, bytes.replace(at, 10, "artist 778"));
         } else if (is("half")) {
             QFile::resize(f, size / 2 / 4096 * 4096);
         } else if (is("garbage schema")) {

@@ -156,6 +156,11 @@ void Connection::check(int code)
         fail(code);
 }
 
+sqlite3 *Connection::handle() const
+{
+    return mEngine ? mEngine->db : nullptr;
+}
+
 void Connection::requireOpen() const
 {
     if (!mEngine)
@@ -189,6 +194,9 @@ void Connection::Open(const QString &, const QString &, const QString &connectio
         sqlite3_db_config(mEngine->db, SQLITE_DBCONFIG_DEFENSIVE, 1, nullptr);
         sqlite3_db_config(mEngine->db, SQLITE_DBCONFIG_TRUSTED_SCHEMA, 0, nullptr);
         sqlite3_db_config(mEngine->db, SQLITE_DBCONFIG_DQS_DML, 0, nullptr);
+        // A catalogue has neither; one that somebody prepared shall not run what it brings.
+        sqlite3_db_config(mEngine->db, SQLITE_DBCONFIG_ENABLE_TRIGGER, 0, nullptr);
+        sqlite3_db_config(mEngine->db, SQLITE_DBCONFIG_ENABLE_VIEW, 0, nullptr);
         check(registerFunctions(mEngine->db));
         // EXTRA: until the folder is synced too, a power cut can bring back the journal of a
         // change that was told as saved, and the journal the catalogue from before it.

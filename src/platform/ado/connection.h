@@ -2,9 +2,11 @@
 
 #include "platform/error/error.h"
 
-#include <QString>
+#include <QStringList>
 #include <memory>
 #include <vector>
+
+struct sqlite3;
 
 namespace ADODB
 {
@@ -85,12 +87,15 @@ public:
 private:
     friend class Recordset;
     friend class Transaction;
+    friend class DeletedRows;
+    friend QStringList columnsOf(Connection &, const QByteArray &);
     struct Engine;
 
     static constexpr int allRows = -1;
     std::shared_ptr<const Rows> run(const QString &statement, int atMost = allRows);
     [[noreturn]] void fail(int code);
     void check(int code);
+    sqlite3 *handle() const; // null while closed
     void requireOpen() const;
     void settleBefore(bool readOnly);
     void requireKept() const; // that the engine has not taken an open transaction back
