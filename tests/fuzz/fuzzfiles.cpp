@@ -3,6 +3,7 @@
 #include "platform/ado/recordset.h"
 #include "services/globals.h"
 #include "services/settingsfile.h"
+#include "support/damage.h"
 #include "support/testcatalogue.h"
 
 #include <QDir>
@@ -34,19 +35,6 @@ void runSettings(const QByteArray &input)
         fuzz::must(readFile(folder.filePath(file)) == input, "the damaged file has changed");
 }
 
-QByteArray smallCatalogue()
-{
-    const QTemporaryDir folder;
-    const QString name = folder.filePath(u"Compact4.orv"_s);
-    cataloguefile::create(name);
-    openConnection(name);
-    for (int i = 0; i < 200; ++i)
-        gConnection->Execute(u"insert into artiesten values ("_s + QString::number(i) +
-                             u",'artist "_s + QString::number(i * 7 % 200) + u'\'' + u')');
-    gConnection.reset();
-    return readFile(name);
-}
-
 // As at a start. False if the file was refused.
 bool opens(const QString &name)
 {
@@ -66,6 +54,7 @@ void runCatalogue(const QByteArray &input)
 {
     static const QTemporaryDir folder;
     const QString name = writeFile(folder.filePath(u"Compact4.orv"_s), input);
+    fuzz::must(damage::startAndEnd(input, damage::Size::Small).lost.isEmpty(), "rows are lost");
     if (opens(name)) {
         for (const char *statement :
              {"select * from artiesten order by naam", "select * from tracks",
@@ -85,6 +74,14 @@ void runCatalogue(const QByteArray &input)
     QFile::remove(name);
 }
 
+// Damages that leave more of a file whole: of the input only a number is taken.
+void runDamage(const QByteArray &input)
+{
+    const QByteArray catalogue = damage::damagedCatalogue(qChecksum(input));
+    for (const auto size : {damage::Size::Small, damage::Size::Large})
+        fuzz::must(damage::startAndEnd(catalogue, size).lost.isEmpty(), "rows are lost");
+}
+
 fuzz::Target settings(
     "settings",
     [] {
@@ -96,6 +93,9 @@ fuzz::Target settings(
     runSettings);
 
 fuzz::Target catalogues(
-    "catalogues", [] { return fuzz::Inputs{smallCatalogue()}; }, runCatalogue);
+    "catalogues", [] { return fuzz::Inputs{damage::wholeCatalogue()}; }, runCatalogue);
+
+fuzz::Target damages(
+    "damages", [] { return fuzz::Inputs{"0"}; }, runDamage);
 
 } // namespace
