@@ -19,34 +19,6 @@ namespace ADODB
 namespace
 {
 
-// A statement goes back to its start on every way out, so that it holds no lock and no value.
-class Running
-{
-public:
-    explicit Running(sqlite3_stmt *s) : mStatement(s) {}
-    ~Running()
-    {
-        sqlite3_reset(mStatement);
-        sqlite3_clear_bindings(mStatement);
-    }
-
-private:
-    sqlite3_stmt *mStatement;
-};
-
-// The first step finds out whether the tables are still those that the statement was prepared for.
-int firstStep(PreparedStatement &prepared)
-{
-    sqlite3_stmt *s = prepared.statement.get();
-    const int code = sqlite3_step(s);
-    const int times = sqlite3_stmt_status(s, SQLITE_STMTSTATUS_REPREPARE, 0);
-    if (times != prepared.timesPrepared) {
-        prepared.timesPrepared = times;
-        prepared.fields = fieldsOf(s);
-    }
-    return code;
-}
-
 int bind(sqlite3_stmt *s, const Dialect &dialect)
 {
     int code = SQLITE_OK, place = 0;
@@ -145,9 +117,7 @@ QString Connection::dataSource(const QString &connectionString)
 void Connection::fail(int code)
 {
     const QString message = QString::fromUtf8(sqlite3_errmsg(mEngine->db));
-    const Error error = engineError(code, message);
-    Errors.assign(1, error);
-    throw error;
+    refuse(engineError(code, message));
 }
 
 void Connection::check(int code)
@@ -238,28 +208,51 @@ std::shared_ptr<const TransactionFate> Connection::fate() const
     return mEngine->routines.empty() ? mEngine->fate : mEngine->routines.back()->mFate;
 }
 
+qint64 Connection::changes() const
+{
+    requireOpen();
+    return sqlite3_total_changes64(mEngine->db);
+}
+
+void Connection::refuse(const Error &error)
+{
+    Errors.assign(1, error);
+    throw error;
+}
+
 std::shared_ptr<const Rows> Connection::run(const QString &statement, int atMost)
 {
     requireOpen();
     try {
         mEngine->dialect.translate(statement);
     } catch (const Error &error) {
-        Errors.assign(1, error);
-        throw;
+        refuse(error);
     }
+    const auto prepared = prepare(mEngine->dialect.sql());
+    const Running running(*prepared);
+    check(bind(running.statement(), mEngine->dialect));
+    return fetch(*prepared, atMost);
+}
+
+std::shared_ptr<PreparedStatement> Connection::prepare(const std::string &sql)
+{
+    requireOpen();
     int code = SQLITE_OK;
-    PreparedStatement *prepared =
-        mEngine->prepared.prepare(mEngine->db, mEngine->dialect.sql(), code);
+    auto prepared = mEngine->prepared.prepare(mEngine->db, sql, code);
     check(code);
-    settleBefore(prepared->readOnly);
-    sqlite3_stmt *s = prepared->statement.get();
-    const Running running(s);
-    check(bind(s, mEngine->dialect));
-    code = firstStep(*prepared);
+    return prepared;
+}
+
+// Runs a statement that has its values; the caller takes it back to its start.
+std::shared_ptr<const Rows> Connection::fetch(PreparedStatement &prepared, int atMost)
+{
+    settleBefore(prepared.readOnly);
+    sqlite3_stmt *s = prepared.statement.get();
+    int code = prepared.firstStep();
     std::shared_ptr<Rows> rows; // none for a change
-    if (!prepared->fields->empty())
-        rows = std::make_shared<Rows>(prepared->fields);
-    const bool ordered = prepared->order.empty();
+    if (!prepared.fields->empty())
+        rows = std::make_shared<Rows>(prepared.fields);
+    const bool ordered = prepared.order.empty();
     for (; code == SQLITE_ROW; code = sqlite3_step(s)) {
         readRow(s, *rows);
         if (ordered && rows->rowCount() == atMost)
@@ -267,7 +260,7 @@ std::shared_ptr<const Rows> Connection::run(const QString &statement, int atMost
     }
     check(code);
     if (!ordered)
-        rows->arrange(firstOf(rowOrder(*rows, prepared->order, prepared->repeats), atMost));
+        rows->arrange(firstOf(rowOrder(*rows, prepared.order, prepared.repeats), atMost));
     return rows;
 }
 

@@ -13,6 +13,7 @@ namespace ADODB
 
 class Recordset;
 class Rows;
+struct PreparedStatement;
 
 enum CursorLocationEnum { adUseServer = 2, adUseClient = 3 };
 enum IsolationLevelEnum { adXactChaos = 16, adXactReadCommitted = 4096 };
@@ -70,6 +71,13 @@ public:
     /// The same for a query of which only the first rows are wanted; no more than those are read.
     Recordset firstRows(const QString &statement, int atMost);
 
+    /// The rows inserted, changed and deleted over this connection since it was opened: by it a
+    /// routine sees whether another one has written meanwhile.
+    qint64 changes() const;
+
+    /// Fails as the engine would: the error stands in Errors and is thrown.
+    [[noreturn]] void refuse(const Error &error);
+
     /// What becomes of the changes made now: null if no transaction is open.
     std::shared_ptr<const TransactionFate> fate() const;
 
@@ -85,6 +93,7 @@ public:
     QString housekeeping(const char *command);
 
 private:
+    friend class Command;
     friend class Recordset;
     friend class Transaction;
     friend class DeletedRows;
@@ -93,6 +102,8 @@ private:
 
     static constexpr int allRows = -1;
     std::shared_ptr<const Rows> run(const QString &statement, int atMost = allRows);
+    std::shared_ptr<PreparedStatement> prepare(const std::string &sql);
+    std::shared_ptr<const Rows> fetch(PreparedStatement &prepared, int atMost = allRows);
     [[noreturn]] void fail(int code);
     void check(int code);
     sqlite3 *handle() const; // null while closed

@@ -83,6 +83,24 @@ void PreparedStatement::Finalize::operator()(sqlite3_stmt *s) const
     sqlite3_finalize(s);
 }
 
+int PreparedStatement::firstStep()
+{
+    sqlite3_stmt *s = statement.get();
+    const int code = sqlite3_step(s);
+    const int times = sqlite3_stmt_status(s, SQLITE_STMTSTATUS_REPREPARE, 0);
+    if (times != timesPrepared) {
+        timesPrepared = times;
+        fields = fieldsOf(s);
+    }
+    return code;
+}
+
+Running::~Running()
+{
+    sqlite3_reset(mStatement);
+    sqlite3_clear_bindings(mStatement);
+}
+
 std::shared_ptr<const FieldList> fieldsOf(sqlite3_stmt *statement)
 {
     auto fields = std::make_shared<FieldList>();
@@ -91,21 +109,22 @@ std::shared_ptr<const FieldList> fieldsOf(sqlite3_stmt *statement)
     return fields;
 }
 
-PreparedStatement *PreparedStatements::prepare(sqlite3 *db, const std::string &sql, int &code)
+std::shared_ptr<PreparedStatement> PreparedStatements::prepare(sqlite3 *db, const std::string &sql,
+                                                               int &code)
 {
     code = SQLITE_OK;
     if (const auto it = mStatements.find(sql); it != mStatements.end())
-        return &it->second;
+        return it->second;
     if (mStatements.size() >= preparedAtMost)
         mStatements.clear();
-    PreparedStatement prepared;
-    if (!prepareUnordered(db, sql, prepared))
-        code = prepareOne(db, sql, prepared);
+    const auto prepared = std::make_shared<PreparedStatement>();
+    if (!prepareUnordered(db, sql, *prepared))
+        code = prepareOne(db, sql, *prepared);
     if (code != SQLITE_OK)
         return nullptr;
-    prepared.fields = fieldsOf(prepared.statement.get());
-    prepared.readOnly = sqlite3_stmt_readonly(prepared.statement.get());
-    return &mStatements.emplace(sql, std::move(prepared)).first->second;
+    prepared->fields = fieldsOf(prepared->statement.get());
+    prepared->readOnly = sqlite3_stmt_readonly(prepared->statement.get());
+    return mStatements.emplace(sql, prepared).first->second;
 }
 
 } // namespace ADODB

@@ -31,6 +31,25 @@ struct PreparedStatement {
     /// A "select distinct" ordered by all of its columns is run without the "distinct" too: rows
     /// that are alike are found side by side.
     Repeats repeats = Repeats::Kept;
+
+    /// Finds out whether the tables are still those that the statement was prepared for.
+    int firstStep();
+};
+
+/// A statement in use: it goes back to its start on every way out, so that it holds no lock and no
+/// value.
+class Running
+{
+public:
+    explicit Running(PreparedStatement &prepared) : mStatement(prepared.statement.get()) {}
+    ~Running();
+    Running(const Running &) = delete;
+    Running &operator=(const Running &) = delete;
+
+    sqlite3_stmt *statement() const { return mStatement; }
+
+private:
+    sqlite3_stmt *mStatement;
 };
 
 /// The statements that a connection has prepared, by their texts.
@@ -38,11 +57,11 @@ class PreparedStatements
 {
 public:
     /// nullptr if it cannot be prepared; `code` is the engine's answer.
-    PreparedStatement *prepare(sqlite3 *db, const std::string &sql, int &code);
+    std::shared_ptr<PreparedStatement> prepare(sqlite3 *db, const std::string &sql, int &code);
     void clear() { mStatements.clear(); }
 
 private:
-    std::unordered_map<std::string, PreparedStatement> mStatements;
+    std::unordered_map<std::string, std::shared_ptr<PreparedStatement>> mStatements;
 };
 
 std::shared_ptr<const FieldList> fieldsOf(sqlite3_stmt *statement);

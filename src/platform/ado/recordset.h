@@ -62,6 +62,7 @@ public:
 
 private:
     friend class Field;
+    friend class Command;
     friend class Connection;
     Rows &changeable();
     void requireOpen() const;

@@ -1,5 +1,7 @@
 #include "platform/ado/rows.h"
 
+#include "platform/text/normalform.h"
+
 #include <QStringConverter>
 #include <algorithm>
 #include <cstring>
@@ -71,10 +73,7 @@ QString Rows::text(qsizetype row, int column) const
 {
     if (kind(row, column) != Kind::Text)
         return value(row, column).toText();
-    const auto bytes = utf8(row, column);
-    const QString text = QString::fromUtf8(bytes.data(), qsizetype(bytes.size()));
-    // Here it is a character like any other; the conversion takes it for the mark of a file.
-    return bytes.starts_with("\xEF\xBB\xBF") ? QChar(QChar::ByteOrderMark) + text : text;
+    return text::fromUtf8(utf8(row, column));
 }
 
 qsizetype Rows::addRow()
