@@ -19,6 +19,7 @@ int main(int argc, char **argv)
     qputenv("QT_QPA_PLATFORM", "offscreen");
     const QApplication application(argc, argv);
     const ConsoleDesktop desktop;
+    registerOpenCases();
     registerBrowseCases();
     registerTextCases();
     registerOrphanCases();

@@ -6,6 +6,7 @@
 
 // Each function registers the benchmarks of one subject.
 
+void registerOpenCases();      // what is looked at before a catalogue is worked with
 void registerBrowseCases();    // the load of the browser, the sort of one page
 void registerTextCases();      // reading and loading text files, and the bare loop
 void registerOrphanCases();    // CleanOrphans, and its deletes without the program
