@@ -4,13 +4,11 @@
 #include "platform/desktop/programfolder.h"
 #include "platform/error/error.h"
 #include "services/clsRegistry.h"
-#include "services/fileutilities.h"
 #include "services/messages.h"
 #include "services/wholefile.h"
 
 #include <QDir>
 #include <QFileInfo>
-#include <QSaveFile>
 
 using namespace Qt::StringLiterals;
 
@@ -30,11 +28,11 @@ bool firstStart(const QString &folder)
 bool copyCatalogue(const QString &to)
 {
     QFile from(QLatin1String{shipped});
-    QSaveFile copy(to);
+    WholeFile copy(to);
     if (!from.open(QIODevice::ReadOnly) || !copy.open(QIODevice::WriteOnly))
         return false;
     copy.write(from.readAll());
-    return commitWhole(copy);
+    return copy.commit();
 }
 
 } // namespace
@@ -48,8 +46,9 @@ void provisionCatalogue()
     QDir(beside).removeRecursively(); // an attempt that did not get through
     const bool made = QDir().mkpath(beside) && copyCatalogue(beside + u"/Compact4.orv"_s) &&
                       QDir().rename(beside, folder);
-    if (!made)
-        throw Error(errCannotUse, u"Songcase"_s,
-                    GetMessage("xCannotMakeCatalogue") + QDir::toNativeSeparators(folder));
-    syncFolder(QFileInfo(folder).absolutePath());
+    if (made && syncFolder(QFileInfo(folder).absolutePath()))
+        return;
+    QDir(beside).removeRecursively();
+    throw Error(errCannotUse, u"Songcase"_s,
+                GetMessage("xCannotMakeCatalogue") + QDir::toNativeSeparators(folder));
 }

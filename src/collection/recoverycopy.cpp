@@ -5,7 +5,6 @@
 
 #include <QDir>
 #include <QJsonDocument>
-#include <QSaveFile>
 #include <QUuid>
 
 using namespace Qt::StringLiterals;
@@ -23,8 +22,8 @@ void RecoveryCopy::keep(const UnsavedRecord &record)
         return;
     if (mFile.isEmpty())
         mFile = folder() + u'/' + QUuid::createUuid().toString(QUuid::WithoutBraces) + u".json"_s;
-    QSaveFile file(mFile);
-    if (file.open(QIODevice::WriteOnly) && file.write(bytes) == bytes.size() && commitWhole(file))
+    WholeFile file(mFile);
+    if (file.open(QIODevice::WriteOnly) && file.write(bytes) == bytes.size() && file.commit())
         mWritten = bytes;
 }
 

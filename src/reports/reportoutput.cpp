@@ -1,14 +1,11 @@
 #include "reports/reportoutput.h"
 
-#include "services/fileutilities.h"
 #include "services/messages.h"
 #include "services/wholefile.h"
 
-#include <QFileInfo>
 #include <QPainter>
 #include <QPdfWriter>
 #include <QPrinter>
-#include <QSaveFile>
 #include <algorithm>
 #include <numeric>
 
@@ -74,7 +71,7 @@ Result paintPages(QPagedPaintDevice &device, const std::vector<qsizetype> &pages
 Result writePdf(const QString &name, const ReportPainter &report, const QPageLayout &paper,
                 const Progress &progress)
 {
-    QSaveFile file(name);
+    WholeFile file(name);
     if (!file.open(QIODevice::WriteOnly))
         return {Outcome::Failed, file.errorString()};
     QPdfWriter writer(&file);
@@ -82,23 +79,12 @@ Result writePdf(const QString &name, const ReportPainter &report, const QPageLay
     writer.setPageLayout(paper);
     writer.setTitle(report.content().caption());
     writer.setCreator(GetMessage("MainScreen.Caption"));
-    QString reason; // what comes later hides it
-    const auto isWell = [&] {
-        if (file.error() != QFileDevice::NoError && reason.isEmpty())
-            reason = file.errorString();
-        return reason.isEmpty();
-    };
+    const auto isWell = [&file] { return file.reason().isEmpty(); };
     Result result = paintPages(writer, allPages(report.layout()), report, isWell, progress);
-    if (result.outcome == Outcome::Done && !(file.flush() && isWell() && commitWhole(file)))
+    if (result.outcome == Outcome::Done && !file.commit())
         result.outcome = Outcome::Failed;
-    if (result.outcome == Outcome::Failed) {
-        isWell();
-        result.reason = reason;
-    }
-    if (result.outcome == Outcome::Done)
-        syncFolder(QFileInfo(name).absolutePath());
-    else
-        file.cancelWriting();
+    if (result.outcome == Outcome::Failed)
+        result.reason = file.reason();
     return result;
 }
 

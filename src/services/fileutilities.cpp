@@ -2,18 +2,15 @@
 
 #include "platform/desktop/desktop.h"
 #include "services/messages.h"
+#include "services/wholefile.h"
 
 #include <QDir>
 #include <QDirIterator>
 #include <QRegularExpression>
 #include <QStandardPaths>
 #include <cstdio>
-#ifdef Q_OS_UNIX
-#include <fcntl.h>
-#include <unistd.h>
 
 using namespace Qt::StringLiterals;
-#endif
 
 QStringList gFoundFiles;
 QString gBrowseInitialFolder;
@@ -113,19 +110,6 @@ bool IsDriveRoot(const QString &text)
     return false;
 }
 
-void syncFolder(const QString &folder)
-{
-#ifdef Q_OS_UNIX
-    const int handle = open(QFile::encodeName(folder).constData(), O_RDONLY | O_DIRECTORY);
-    if (handle >= 0) {
-        fsync(handle);
-        close(handle);
-    }
-#else
-    Q_UNUSED(folder)
-#endif
-}
-
 QString StripAtNull(QString &s)
 {
     if (const auto end = s.indexOf(QChar(0)); end >= 0)
@@ -169,8 +153,7 @@ bool MoveFileReplace(const QString &from, const QString &to)
 {
     if (std::rename(QFile::encodeName(from).constData(), QFile::encodeName(to).constData()) != 0)
         return true;
-    syncFolder(QFileInfo(to).absolutePath());
-    return false;
+    return !syncFolder(QFileInfo(to).absolutePath());
 }
 
 QString BrowseForFolderDialog(const QString &title, const QString &initialFolder)

@@ -35,11 +35,8 @@ QStringList FindFilesInTree(const QString &path, const QString &pattern, int mod
 double ScanFolderTree(QString path, const QString &pattern, int fileCount, int folderCount);
 
 /// True when the move failed, as between two disks. An existing file of the new name is replaced.
-/// When it returns, the new name is on the disk and outlives a power cut.
+/// After false the new name is on the disk and outlives a power cut.
 bool MoveFileReplace(const QString &from, const QString &to);
-
-/// Writes the names in a folder through to the disk, where the system knows such a thing.
-void syncFolder(const QString &folder);
 
 /// An empty text when the dialog was cancelled.
 QString BrowseForFolderDialog(const QString &title, const QString &initialFolder);

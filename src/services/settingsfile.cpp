@@ -1,37 +1,41 @@
 #include "services/settingsfile.h"
 
 #include "platform/desktop/desktop.h"
+#include "services/filelock.h"
 #include "services/wholefile.h"
 
 #include <QDir>
 #include <QFileInfo>
 #include <QJsonDocument>
 #include <QJsonObject>
-#include <QLockFile>
-#include <QSaveFile>
 
 using namespace Qt::StringLiterals;
 
 namespace
 {
 
+constexpr int otherWriterAtMost = 2000; // milliseconds
+
 QString normalKey(const QString &key)
 {
     return key.toLower().split(u'\\', Qt::SkipEmptyParts).join(u'\\');
 }
 
-QVariant fromJson(const QJsonObject &o)
+// A value of ours as what it is; any other as it stands, so that it stays when others change.
+QVariant fromJson(const QJsonValue &value)
 {
-    const QString type = o.value("type"_L1).toString();
-    const QJsonValue v = o.value("value"_L1);
-    if (type == "text"_L1)
+    const QString type = value["type"_L1].toString();
+    const QJsonValue v = value["value"_L1];
+    if (type == "text"_L1 && v.isString())
         return v.toString();
-    if (type == "number"_L1)
+    if (type == "number"_L1 && v == v.toInt())
         return v.toInt();
-    return QByteArray::fromBase64(v.toString().toLatin1());
+    if (type == "binary"_L1 && v.isString())
+        return QByteArray::fromBase64(v.toString().toLatin1());
+    return value;
 }
 
-QJsonObject toJson(const QVariant &v)
+QJsonValue toJson(const QVariant &v)
 {
     const auto object = [](const char *type, const QJsonValue &value) {
         return QJsonObject{{u"type"_s, QLatin1String(type)}, {u"value"_s, value}};
@@ -41,9 +45,27 @@ QJsonObject toJson(const QVariant &v)
         return object("text", v.toString());
     case QMetaType::Int:
         return object("number", v.toInt());
-    default:
+    case QMetaType::QByteArray:
         return object("binary", QString::fromLatin1(v.toByteArray().toBase64()));
+    default:
+        return v.toJsonValue();
     }
+}
+
+// Whether a document is one of ours: keys, and in them values that are, but for some that a person
+// has typed.
+bool isOurs(const QJsonDocument &document)
+{
+    int ours = 0, others = 0;
+    const QJsonObject keys = document.object();
+    for (const QJsonValue &key : keys) {
+        const QJsonObject values = key.toObject();
+        for (const QJsonValue &value : values)
+            ++(fromJson(value).typeId() == QMetaType::QJsonValue ? others : ours);
+        if (!key.isObject())
+            return false;
+    }
+    return document.isObject() && (ours > 0 || others == 0);
 }
 
 bool setAside(const QString &file)
@@ -70,14 +92,14 @@ SettingsFile::Code SettingsFile::read(Tree &tree) const
     file.close();
     if (!wholly)
         return AccessDenied;
-    if (!document.isObject())
+    if (!isOurs(document))
         return setAside(mFile) ? Success : BadFormat;
     const QJsonObject keys = document.object();
     for (auto key = keys.begin(); key != keys.end(); ++key) {
         Values &values = tree[normalKey(key.key())];
         const QJsonObject named = key.value().toObject();
         for (auto v = named.begin(); v != named.end(); ++v)
-            values[v.key().toLower()] = fromJson(v.value().toObject());
+            values[v.key().toLower()] = fromJson(v.value());
     }
     return Success;
 }
@@ -86,8 +108,8 @@ template <typename Change> SettingsFile::Code SettingsFile::change(Change change
 {
     if (!QDir().mkpath(QFileInfo(mFile).absolutePath()))
         return AccessDenied;
-    QLockFile lock(mFile + u".lock"_s);
-    if (!lock.tryLock(2000))
+    FileLock lock;
+    if (lock.takeWithin(mFile + u".lock"_s, otherWriterAtMost) != FileLock::Outcome::Taken)
         return AccessDenied;
     Tree tree;
     if (const Code code = read(tree); code != Success)
@@ -101,12 +123,12 @@ template <typename Change> SettingsFile::Code SettingsFile::change(Change change
             named.insert(v.key(), toJson(v.value()));
         keys.insert(key.key(), named);
     }
-    QSaveFile file(mFile);
+    WholeFile file(mFile);
     if (!file.open(QIODevice::WriteOnly))
         return AccessDenied;
     file.setPermissions(QFile::ReadOwner | QFile::WriteOwner); // it may hold a password
     file.write(QJsonDocument(keys).toJson());
-    return commitWhole(file) ? Success : AccessDenied;
+    return file.commit() ? Success : AccessDenied;
 }
 
 bool SettingsFile::hasKey(const QString &key) const

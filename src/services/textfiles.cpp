@@ -5,7 +5,6 @@
 
 #include <QFile>
 #include <QFileInfo>
-#include <QSaveFile>
 
 namespace
 {
@@ -71,7 +70,7 @@ OutputTextFile::~OutputTextFile() = default;
 bool OpenOutputFile(const QString &name, OutputTextFile &file)
 {
     // Not a stored name but one just chosen: a "\" in it is a plain character.
-    auto target = std::make_unique<QSaveFile>(name);
+    auto target = std::make_unique<WholeFile>(name);
     const bool plain = !name.isEmpty() && !QFileInfo(name).isDir();
     if (!plain || !target->open(QIODevice::WriteOnly | QIODevice::Text))
         target.reset();
@@ -87,7 +86,7 @@ bool WriteTextLine(OutputTextFile &file, const QString &line)
 
 bool CloseTextFile(OutputTextFile &file)
 {
-    const bool done = file.mFile && commitWhole(*file.mFile);
+    const bool done = file.mFile && file.mFile->commit();
     file.mFile.reset();
     return done;
 }

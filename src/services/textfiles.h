@@ -6,7 +6,7 @@
 #include <QString>
 #include <memory>
 
-class QSaveFile;
+class WholeFile;
 
 /// A text file that is read line by line. Lines end at CR, CRLF or LF; a file that is valid UTF-8
 /// is taken as such, any other as Windows-1252. The whole file is held in memory, so that counting
@@ -42,7 +42,7 @@ private:
     friend bool OpenOutputFile(const QString &name, OutputTextFile &file);
     friend bool WriteTextLine(OutputTextFile &file, const QString &line);
     friend bool CloseTextFile(OutputTextFile &file);
-    std::unique_ptr<QSaveFile> mFile;
+    std::unique_ptr<WholeFile> mFile;
 };
 
 /// False if the file cannot be opened; nothing is shown.

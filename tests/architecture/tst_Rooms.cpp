@@ -133,7 +133,8 @@ private slots:
         row("^discid/", "discdata/");
         row("^QSql|^QtSql", "nowhere");
         row("^QMessageBox|^QFileDialog|^QDesktopServices", "platform/desktop/");
-        row("^thread$|^future$|^QThread|^QFuture|^QtConcurrent|^QProcess", "platform/work/");
+        row("^thread$|^future$|^QThread|^QFuture|^QtConcurrent|^QProcess",
+            "platform/work/|platform/desktop/openaddress");
         row("^Q(Tcp|Udp|Ssl)|^QNetwork", "platform/work/|discdata/");
         row("^QtTest|^QTest|^benchmark/", "nowhere");
     }

@@ -1,5 +1,6 @@
 // Label: unit
 #include "services/clsRegistry.h"
+#include "services/filelock.h"
 #include "support/datarows.h"
 #include "support/ordinaryuser.h"
 #include "support/scripteddesktop.h"
@@ -113,15 +114,17 @@ private slots:
         writeFile(mDesktop->settings,
                   R"({"80000002\\SOFTWARE\\Orvanta Software\\SongCase\\": {
                         "Blob": {"type": "binary", "value": "AAEC"},
-                        "Odd": 5, "Number": {"type": "number", "value": 12},
+                        "Odd": 5, "Far": {"type": "number", "value": 1e30}, "Number": {"type": "number", "value": 12},
                         "Text": {"type": "text", "value": "x"}}})");
         QCOMPARE(get("Number"), QVariant(12));
         QCOMPARE(get("Text"), QVariant(u"x"_s));
         QVERIFY(!get("Odd").isValid());
+        QVERIFY(!get("Far").isValid());
         QVERIFY(!get("Blob").isValid());
         QCOMPARE(mEvents, QStringList());
         set("Text", u"y"_s);
-        QVERIFY(content().contains("AAEC"));
+        for (const char *kept : {"AAEC", "5", "1e+30"})
+            QVERIFY2(content().contains(kept), kept);
         QCOMPARE(get("Number"), QVariant(12));
     }
 
@@ -131,6 +134,9 @@ private slots:
         row("empty", "");
         row("cut off", R"({"80000002\\software": {"a": {"type": )");
         row("a list", "[1,2]");
+        row("no keys", R"({"language": 19})");
+        row("values without a type", R"({"window": {"width": 800, "open": true}})");
+        row("types without a value", R"({"80000002\\software": {"a": {"type": "number"}}})");
     }
 
     void damagedFileIsSetAside()
@@ -175,7 +181,21 @@ private slots:
         const auto others =
             QFile::ReadGroup | QFile::WriteGroup | QFile::ReadOther | QFile::WriteOther;
         QVERIFY(!(QFile::permissions(mDesktop->settings) & others));
-        QCOMPARE(QDir(folder()).entryList(QDir::Files), QStringList{u"settings.json"_s});
+    }
+
+    // A lock of another machine, or cut off while it was made, means nothing: who holds it counts.
+    void nobodyIsLockedOut()
+    {
+        for (const QByteArray &content :
+             {QByteArray(), QByteArray(64, 0), QByteArray("1\nsongcase\nrenamed-machine\n")}) {
+            writeFile(mDesktop->settings + u".lock"_s, content);
+            mRegistry->CreateKey(settingsKey);
+            QCOMPARE(mEvents, QStringList());
+        }
+        FileLock other;
+        QCOMPARE(other.take(mDesktop->settings + u".lock"_s), FileLock::Outcome::Taken);
+        mRegistry->CreateKey(settingsKey);
+        QCOMPARE(mEvents.size(), 1);
     }
 
     // Two programs at once: every write of both must be there afterwards.

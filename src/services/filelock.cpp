@@ -1,0 +1,80 @@
+#include "services/filelock.h"
+
+#include <QDeadlineTimer>
+#include <QFile>
+#include <cerrno>
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+#include <utility>
+
+namespace
+{
+
+constexpr off_t lockedByte = off_t(1) << 62;
+constexpr useconds_t betweenAttempts = 5000; // microseconds
+
+bool isPlainFile(int handle)
+{
+    struct stat about = {};
+    return ::fstat(handle, &about) == 0 && S_ISREG(about.st_mode);
+}
+
+// Of the open file, not of the process: two in one process exclude each other as well.
+bool lock(int handle)
+{
+    struct flock byte = {};
+    byte.l_type = F_WRLCK;
+    byte.l_whence = SEEK_SET;
+    byte.l_start = lockedByte;
+    byte.l_len = 1;
+    return ::fcntl(handle, F_OFD_SETLK, &byte) == 0;
+}
+
+} // namespace
+
+FileLock::~FileLock()
+{
+    if (mHandle >= 0)
+        ::close(mHandle);
+}
+
+FileLock::FileLock(FileLock &&other) noexcept : mHandle(std::exchange(other.mHandle, -1)) {}
+
+FileLock &FileLock::operator=(FileLock &&other) noexcept
+{
+    std::swap(mHandle, other.mHandle);
+    return *this;
+}
+
+FileLock::Outcome FileLock::take(const QString &file, int flags)
+{
+    const int handle =
+        ::open(QFile::encodeName(file).constData(), O_RDWR | O_CLOEXEC | O_NONBLOCK | flags, 0600);
+    if (handle < 0)
+        return Outcome::Unusable;
+    const bool plain = isPlainFile(handle);
+    if (plain && lock(handle)) {
+        mHandle = handle;
+        return Outcome::Taken;
+    }
+    const bool held = plain && (errno == EAGAIN || errno == EACCES);
+    ::close(handle);
+    return held ? Outcome::Held : Outcome::Unusable;
+}
+
+FileLock::Outcome FileLock::take(const QString &file)
+{
+    return take(file, 0);
+}
+
+FileLock::Outcome FileLock::takeWithin(const QString &lockFile, int milliseconds)
+{
+    const QDeadlineTimer deadline(milliseconds);
+    auto outcome = take(lockFile, O_CREAT);
+    while (outcome == Outcome::Held && !deadline.hasExpired()) {
+        ::usleep(betweenAttempts);
+        outcome = take(lockFile, O_CREAT);
+    }
+    return outcome;
+}

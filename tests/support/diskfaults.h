@@ -1,0 +1,175 @@
+#pragma once
+
+#include <QFile>
+#include <QFileInfo>
+#include <cerrno>
+#include <cstdarg>
+#include <cstdio>
+#include <cstdlib>
+#include <dlfcn.h>
+#include <fcntl.h>
+#include <string>
+#include <sys/stat.h>
+#include <unistd.h>
+
+/// Makes one call to the disk fail, whichever part of the program or of its libraries makes it:
+/// the test program's own write(), fsync(), rename() and so on stand before those of the system. To
+/// be included once in a program. Only what concerns files below one folder is counted.
+namespace diskfaults
+{
+
+enum class Kind {
+    Full,  // that call and all writes behind it find no room; a write takes a part first
+    Broken // that call alone fails
+};
+
+/// Counts the calls below a folder from now on and lets the n-th fail; 0: none.
+class Fault
+{
+public:
+    Fault(const QString &folder, Kind kind, int n);
+    ~Fault();
+    Fault(const Fault &) = delete;
+    Fault &operator=(const Fault &) = delete;
+
+    bool came() const; // whether there were as many calls
+};
+
+} // namespace diskfaults
+
+namespace diskfaults
+{
+
+struct State {
+    std::string folder;
+    Kind kind = Kind::Full;
+    int failing = 0, calls = 0;
+};
+State *gState = nullptr;
+
+bool concerns(const char *path)
+{
+    return gState && std::string(path).compare(0, gState->folder.size(), gState->folder) == 0;
+}
+
+bool concerns(int handle)
+{
+    char path[4096];
+    const std::string link = "/proc/self/fd/" + std::to_string(handle);
+    const auto size = gState ? ::readlink(link.c_str(), path, sizeof path - 1) : -1;
+    return size > 0 && concerns((path[size] = 0, path));
+}
+
+// Whether this call is the one to fail, or comes behind it on a full disk.
+template <typename File> bool fails(File file, bool needsRoom)
+{
+    if (!concerns(file))
+        return false;
+    const int call = ++gState->calls;
+    const bool full = gState->kind == diskfaults::Kind::Full;
+    const bool now = full ? needsRoom && gState->failing > 0 && call >= gState->failing
+                          : call == gState->failing;
+    errno = now ? (full ? ENOSPC : EIO) : errno;
+    return now;
+}
+
+template <typename Function> Function *next(Function *, const char *name)
+{
+    return reinterpret_cast<Function *>(::dlsym(RTLD_NEXT, name));
+}
+
+int openAs(const char *name, const char *path, int flags, unsigned mode)
+{
+    if ((flags & (O_CREAT | O_WRONLY | O_RDWR | O_DIRECTORY)) && fails(path, flags & O_CREAT))
+        return -1;
+    return reinterpret_cast<int (*)(const char *, int, ...)>(::dlsym(RTLD_NEXT, name))(path, flags,
+                                                                                       mode);
+}
+
+unsigned modeOf(int flags, va_list rest)
+{
+    return flags & (O_CREAT | O_TMPFILE) ? va_arg(rest, unsigned) : 0;
+}
+
+extern "C" {
+
+int open(const char *path, int flags, ...)
+{
+    va_list rest;
+    va_start(rest, flags);
+    const unsigned mode = modeOf(flags, rest);
+    va_end(rest);
+    return openAs("open", path, flags, mode);
+}
+
+int open64(const char *path, int flags, ...)
+{
+    va_list rest;
+    va_start(rest, flags);
+    const unsigned mode = modeOf(flags, rest);
+    va_end(rest);
+    return openAs("open64", path, flags, mode);
+}
+
+ssize_t write(int handle, const void *data, size_t size)
+{
+    static const auto system = next(&::write, "write");
+    const int before = gState ? gState->calls : 0;
+    if (!fails(handle, true))
+        return system(handle, data, size);
+    // The one that fills the disk takes what there is room for.
+    const bool part = gState->kind == diskfaults::Kind::Full && before + 1 == gState->failing;
+    return part && size > 1 ? system(handle, data, size / 2) : -1;
+}
+
+int fsync(int handle)
+{
+    static const auto system = next(&::fsync, "fsync");
+    return fails(handle, false) ? -1 : system(handle);
+}
+
+int fdatasync(int handle)
+{
+    static const auto system = next(&::fdatasync, "fdatasync");
+    return fails(handle, false) ? -1 : system(handle);
+}
+
+int rename(const char *from, const char *to) noexcept
+{
+    static const auto system = next(&::rename, "rename");
+    return fails(to, false) ? -1 : system(from, to);
+}
+
+int renameat2(int fromFolder, const char *from, int toFolder, const char *to,
+              unsigned flags) noexcept
+{
+    static const auto system = next(&::renameat2, "renameat2");
+    return fails(to, false) ? -1 : system(fromFolder, from, toFolder, to, flags);
+}
+
+int mkdir(const char *path, mode_t mode) noexcept
+{
+    static const auto system = next(&::mkdir, "mkdir");
+    return fails(path, true) ? -1 : system(path, mode);
+}
+
+} // extern "C"
+
+Fault::Fault(const QString &folder, Kind kind, int n)
+{
+    gState = new State{QFile::encodeName(QFileInfo(folder).canonicalFilePath()).toStdString(), kind,
+                       n, 0};
+}
+
+Fault::~Fault()
+{
+    delete gState;
+    gState = nullptr;
+}
+
+bool Fault::came() const
+{
+    return gState->calls >= gState->failing;
+}
+
+} // namespace diskfaults
