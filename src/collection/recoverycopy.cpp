@@ -18,7 +18,9 @@ QString RecoveryCopy::folder()
 void RecoveryCopy::keep(const UnsavedRecord &record)
 {
     const QByteArray bytes = QJsonDocument(record.toJson()).toJson(QJsonDocument::Compact);
-    if (bytes == mWritten || folder().isEmpty() || !QDir().mkpath(folder()))
+    // Never with the folder above it: that is there only once a first start has made it whole.
+    const bool there = QFileInfo::exists(folder()) || QDir().mkdir(folder());
+    if (bytes == mWritten || folder().isEmpty() || !there)
         return;
     if (mFile.isEmpty())
         mFile = folder() + u'/' + QUuid::createUuid().toString(QUuid::WithoutBraces) + u".json"_s;

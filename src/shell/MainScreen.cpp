@@ -6,6 +6,7 @@
 #include "collection/frmCDList.h"
 #include "collection/frmSearchArtistsTitles.h"
 #include "platform/ado/connection.h"
+#include "platform/desktop/programfolder.h"
 #include "services/captions.h"
 #include "services/clsRegistry.h"
 #include "services/fileutilities.h"
@@ -18,7 +19,6 @@
 #include "textimport/frmImportWizard.h"
 
 #include <QCloseEvent>
-#include <QDir>
 #include <QMdiSubWindow>
 #include <QScopedValueRollback>
 #include <QTimer>
@@ -58,8 +58,8 @@ bool MainScreen::Load()
     Desktop::current().pump();
     setUpControls();
     try {
-        provisionCatalogue();
         InitMainScreen();
+        mProvisioned = provisionCatalogue();
         if (FileExists(gDatabasePath)) {
             startup::openCatalogue(gDatabasePath, mLastRunBroken);
         } else {
@@ -92,7 +92,7 @@ void MainScreen::InitMainScreen()
     mStart = startup::readSettings(folder);
     emit languageKnown();
     markLanguage();
-    gDatabasePath = folder + QDir::separator() + u"Compact4.orv"_s;
+    gDatabasePath = programfolder::catalogueIn(folder);
     setCaptions();
     setBoxTitle(windowTitle());
 }

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "catalogue/cataloguelock.h"
 #include "platform/desktop/form.h"
 #include "services/frame.h"
 #include "shell/startup.h"
@@ -70,6 +71,8 @@ private:
     QTimer *mTimer1;
     bool mDatabaseMissing = false;
     startup::Found mStart;
+    CatalogueLock mProvisioned; // of a catalogue made by this start
     bool mLastRunBroken;
+    bool mStarted = false; // by the timer step
     bool mUnloading = false, mUnloaded = false;
 };

@@ -1,11 +1,14 @@
 #include "shell/singleinstance.h"
 
-#include "platform/desktop/desktop.h"
+#include "platform/desktop/programfolder.h"
 
 #include <QCryptographicHash>
 #include <QDir>
 #include <QFileInfo>
 #include <QLocalSocket>
+#include <QStandardPaths>
+#include <sys/socket.h>
+#include <unistd.h>
 
 using namespace Qt::StringLiterals;
 
@@ -15,20 +18,40 @@ namespace
 constexpr int answerWithin = 2000; // milliseconds
 constexpr char raiseWord[] = "raise\n", raisedWord[] = "raised\n";
 
-QString nameFor(const QString &folder)
+// One name whatever road leads there; of a file that a first start has still to make, too.
+QString realPath(const QString &path)
 {
-    const QByteArray hash = QCryptographicHash::hash(QFileInfo(folder).absoluteFilePath().toUtf8(),
-                                                     QCryptographicHash::Sha1);
-    return u"songcase-"_s + QString::fromLatin1(hash.toHex().left(16));
+    const QFileInfo info(path);
+    if (info.exists() || info.isRoot())
+        return info.canonicalFilePath();
+    return realPath(info.absolutePath()) + u'/' + info.fileName();
+}
+
+// In the folder that the system gives to this user alone for such things, if it has one.
+QString serverFor(const QString &catalogue)
+{
+    const QString own = QStandardPaths::writableLocation(QStandardPaths::RuntimeLocation);
+    const QByteArray hash =
+        QCryptographicHash::hash(realPath(catalogue).toUtf8(), QCryptographicHash::Sha1);
+    return (own.isEmpty() ? QDir::tempPath() : own) + u"/songcase-"_s +
+           QString::fromLatin1(hash.toHex().left(16));
+}
+
+// What another user has put there may say anything.
+bool listensForThisUser(const QLocalSocket &socket)
+{
+    ucred other = {};
+    socklen_t size = sizeof other;
+    return ::getsockopt(int(socket.socketDescriptor()), SOL_SOCKET, SO_PEERCRED, &other, &size) ==
+               0 &&
+           other.uid == ::geteuid();
 }
 
 } // namespace
 
-SingleInstance::SingleInstance(const QString &programFolder) : mServerName(nameFor(programFolder))
+SingleInstance::SingleInstance(const QString &programFolder)
+    : mCatalogue(programfolder::catalogueIn(programFolder)), mServerName(serverFor(mCatalogue))
 {
-    const QString beside = QFileInfo(Desktop::current().settingsFile()).absolutePath();
-    QDir().mkpath(beside);
-    mLockName = beside + QDir::separator() + mServerName + u".lock"_s;
 }
 
 SingleInstance::~SingleInstance()
@@ -38,16 +61,18 @@ SingleInstance::~SingleInstance()
 
 SingleInstance::Outcome SingleInstance::take()
 {
-    const bool lockThere = QFileInfo::exists(mLockName);
-    mLock = std::make_unique<QLockFile>(mLockName);
-    mLock->setStaleLockTime(0); // held as long as its process lives, however long that is
-    if (!mLock->tryLock(0)) {
-        // A folder that cannot be written holds no locks: the catalogue itself will tell.
-        if (mLock->error() != QLockFile::LockFailedError)
-            return Outcome::First;
+    const auto outcome = mLock.take(mCatalogue);
+    if (outcome == FileLock::Outcome::Held)
         return raiseTheFirst() ? Outcome::Raised : Outcome::InUse;
-    }
-    mLastRunBroken = lockThere;
+    // A catalogue that is not there yet, or cannot be written, tells that itself.
+    if (outcome == FileLock::Outcome::Taken)
+        mLock.markRunning(mCatalogue);
+    listen();
+    return Outcome::First;
+}
+
+void SingleInstance::listen()
+{
     connect(&mServer, &QLocalServer::newConnection, this, [this] {
         QLocalSocket *caller = mServer.nextPendingConnection();
         connect(caller, &QLocalSocket::disconnected, caller, &QObject::deleteLater);
@@ -60,15 +85,15 @@ SingleInstance::Outcome SingleInstance::take()
     QLocalServer::removeServer(mServerName); // of a run that did not get to its end
     mServer.setSocketOptions(QLocalServer::UserAccessOption);
     mServer.listen(mServerName);
-    return Outcome::First;
 }
 
 bool SingleInstance::raiseTheFirst() const
 {
     QLocalSocket first;
     first.connectToServer(mServerName);
-    if (!first.waitForConnected(answerWithin))
+    if (!first.waitForConnected(answerWithin) || !listensForThisUser(first))
         return false;
     first.write(raiseWord);
-    return first.waitForBytesWritten(answerWithin) && first.waitForReadyRead(answerWithin);
+    return first.waitForBytesWritten(answerWithin) && first.waitForReadyRead(answerWithin) &&
+           first.readAll() == raisedWord;
 }

@@ -1,18 +1,18 @@
 #pragma once
 
-#include <QLocalServer>
-#include <QLockFile>
-#include <QObject>
-#include <memory>
+#include "catalogue/cataloguelock.h"
 
-/// One running program per catalogue. The first holds a lock and listens; a later one asks the
-/// first to come to the front, and ends.
+#include <QLocalServer>
+#include <QObject>
+
+/// One running program per catalogue. The first holds the lock of the file and listens; a later one
+/// asks the first to come to the front, and ends. The lock decides: the first listens where only
+/// its own user can, so another user is told that the catalogue is in use.
 class SingleInstance : public QObject
 {
     Q_OBJECT
 
 public:
-    /// Lock and server are named after the folder of the catalogue and lie beside the settings.
     explicit SingleInstance(const QString &programFolder);
     ~SingleInstance() override;
 
@@ -23,15 +23,19 @@ public:
     Outcome take();
 
     /// Whether the run before this one on the same catalogue did not get to its end.
-    bool lastRunBroken() const { return mLastRunBroken; }
+    bool lastRunBroken() const { return mLock.lastRunBroken(); }
+
+    /// Where the first one listens.
+    QString serverName() const { return mServerName; }
 
 signals:
     void raiseRequested();
 
 private:
+    void listen();
+
+    QString mCatalogue;
     QString mServerName;
-    QString mLockName;
-    std::unique_ptr<QLockFile> mLock;
+    CatalogueLock mLock;
     QLocalServer mServer;
-    bool mLastRunBroken = false;
 };

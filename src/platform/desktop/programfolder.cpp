@@ -24,4 +24,9 @@ QString find()
     return userFolder();
 }
 
+QString catalogueIn(const QString &folder)
+{
+    return folder + QDir::separator() + u"Compact4.orv"_s;
+}
+
 } // namespace programfolder

@@ -13,4 +13,7 @@ QString find();
 /// The data folder of the user, the only one that the program makes by itself.
 QString userFolder();
 
+/// The catalogue in a program's own folder.
+QString catalogueIn(const QString &folder);
+
 } // namespace programfolder
