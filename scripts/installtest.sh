@@ -137,7 +137,7 @@ as_person listener
 start first-start /usr/bin/songcase
 expect "the first start made no catalogue" test -f "$root$catalogue"
 expect "the window is not the one that the desktop entry names" has_class songcase
-expect "the guide does not open" opens_guide listener /usr/share/songcase/guide/en/index.html
+expect "the guide does not open" opens_guide listener /usr/share/songcase-guide/en/index.html
 stop
 say "first start"
 
@@ -166,7 +166,7 @@ in_root chown -R guest:guest /home/guest/songcase-portable
 as_person guest
 start portable /home/guest/songcase-portable/bin/songcase
 expect "the portable program uses another catalogue" holds_open /home/guest/songcase-portable/bin/Compact4.orv
-expect "the portable guide does not open" opens_guide guest /home/guest/songcase-portable/share/songcase/guide/en/index.html
+expect "the portable guide does not open" opens_guide guest /home/guest/songcase-portable/share/songcase-guide/en/index.html
 stop
 expect "the portable program made a data folder" test ! -e "$root/home/guest/.local/share/songcase"
 say "portable folder"

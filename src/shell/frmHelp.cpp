@@ -27,11 +27,11 @@ QString frmHelp::guideAddress()
 {
     const QString page = QLatin1String(gLanguage == languageDutch ? "nl" : "en") + u"/index.html"_s;
     const QString beside =
-        QCoreApplication::applicationDirPath() + u"/../share/songcase/guide/"_s + page;
+        QCoreApplication::applicationDirPath() + u"/../share/songcase-guide/"_s + page;
     QString file = QFileInfo(beside).canonicalFilePath();
     if (file.isEmpty())
         file = QStandardPaths::locate(QStandardPaths::GenericDataLocation,
-                                      u"songcase/guide/"_s + page);
+                                      u"songcase-guide/"_s + page);
     return file.isEmpty() ? QString() : QUrl::fromLocalFile(file).toString();
 }
 
