@@ -24,7 +24,7 @@ public:
     void freeze(QWidget *) override {}
     void pump() override {}
     void sendKeys(const QString &) override {}
-    bool openAddress(const QString &) override { return false; }
+    void openAddress(const QString &, std::function<void()> notOpened) override { notOpened(); }
     QString settingsFile() override { return {}; }
     QString programFolder() override { return {}; }
 };

@@ -66,9 +66,12 @@ void frmHelp::keyPressEvent(QKeyEvent *event)
 
 void frmHelp::Link_Click()
 {
+    const auto noBrowser = [] { errorBox(u"No browser detected!"_s); };
     const QString address = guideAddress();
-    if (address.isEmpty() || !Desktop::current().openAddress(address))
-        errorBox(u"No browser detected!"_s);
+    if (address.isEmpty())
+        noBrowser();
+    else
+        Desktop::current().openAddress(address, noBrowser);
 }
 
 void ShowHelpLinks()

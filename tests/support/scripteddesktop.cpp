@@ -72,6 +72,8 @@ BoxAnswer ScriptedDesktop::messageBox(BoxKind kind, BoxButtons buttons, const QS
 {
     const QString line = QLatin1String(kindOf(kind, buttons)) + u" ["_s + title + u"] "_s + text;
     boxes.append(line);
+    if (duringBox)
+        duringBox();
     if (mBoxes.empty() || !line.contains(mBoxes.front().part)) {
         failTest(u"Unexpected box: "_s + line +
                  (mBoxes.empty() ? QString() : u"; awaited: "_s + mBoxes.front().part));
@@ -172,10 +174,11 @@ void ScriptedDesktop::sendKeys(const QString &keys)
     QtDesktop().sendKeys(keys);
 }
 
-bool ScriptedDesktop::openAddress(const QString &url)
+void ScriptedDesktop::openAddress(const QString &url, std::function<void()> notOpened)
 {
     addresses.append(url);
-    return browserThere;
+    if (!browserThere)
+        notOpened();
 }
 
 void inNextBox(const std::function<void(QMessageBox &)> &act)

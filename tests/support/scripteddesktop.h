@@ -39,8 +39,9 @@ public:
     /// Fails the test if something announced did not come.
     void verifyAllCame();
 
-    QStringList boxes;     // lines of all boxes since the last clear
-    QStringList addresses; // opened
+    QStringList boxes;               // lines of all boxes since the last clear
+    QStringList addresses;           // opened
+    std::function<void()> duringBox; // what happens while a box is open
     bool browserThere = true;
     QDateTime time{QDate(2026, 11, 22), QTime(12, 0)};
     QString folder;   // App.Path
@@ -58,7 +59,7 @@ public:
     void freeze(QWidget *window) override;
     void pump() override;
     void sendKeys(const QString &keys) override;
-    bool openAddress(const QString &url) override;
+    void openAddress(const QString &url, std::function<void()> notOpened) override;
     QString settingsFile() override { return settings; }
     QString programFolder() override { return folder; }
 

@@ -4,6 +4,7 @@
 #include <QPointer>
 #include <QString>
 #include <QWidget>
+#include <functional>
 
 class Form;
 class QPrinter;
@@ -51,7 +52,10 @@ public:
     virtual void freeze(QWidget *window) = 0; // nullptr: drawing goes on
     virtual void pump() = 0;                  // handles what is waiting, input included
     virtual void sendKeys(const QString &keys) = 0;
-    virtual bool openAddress(const QString &url) = 0; // false: nothing there to open it with
+
+    /// Opens an address in the browser of the person. That nothing is there to open it with shows
+    /// later, when the desktop has looked.
+    virtual void openAddress(const QString &url, std::function<void()> notOpened) = 0;
     virtual QString settingsFile() = 0;
     virtual QString programFolder() = 0; // App.Path
 

@@ -3,19 +3,18 @@
 #include "platform/desktop/drawingfreeze.h"
 #include "platform/desktop/modalloop.h"
 #include "platform/desktop/nestedloop.h"
+#include "platform/desktop/openaddress.h"
 #include "platform/desktop/programfolder.h"
 #include "platform/desktop/sentkey.h"
 #include "platform/text/textrules.h"
 
 #include <QApplication>
-#include <QDesktopServices>
 #include <QFileDialog>
 #include <QKeySequence>
 #include <QMessageBox>
 #include <QPrintDialog>
 #include <QPrinterInfo>
 #include <QStandardPaths>
-#include <QUrl>
 
 using namespace Qt::StringLiterals;
 
@@ -219,9 +218,9 @@ void QtDesktop::sendKeys(const QString &keys)
     }
 }
 
-bool QtDesktop::openAddress(const QString &url)
+void QtDesktop::openAddress(const QString &url, std::function<void()> notOpened)
 {
-    return QDesktopServices::openUrl(QUrl(url));
+    openInBrowser(url, std::move(notOpened));
 }
 
 QString QtDesktop::settingsFile()

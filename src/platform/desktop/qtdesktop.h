@@ -20,7 +20,7 @@ public:
     void freeze(QWidget *window) override;
     void pump() override;
     void sendKeys(const QString &keys) override;
-    bool openAddress(const QString &url) override;
+    void openAddress(const QString &url, std::function<void()> notOpened) override;
     QString settingsFile() override;
     QString programFolder() override;
 };
