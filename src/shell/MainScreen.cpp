@@ -187,6 +187,7 @@ void MainScreen::Timer1_Timer()
         move(placeAtStart.topLeft());
         resize(placeAtStart.size());
     }
+    mStarted = true;
     show();
     openBrowser();
     if (mStart.session == 1)
@@ -223,8 +224,10 @@ void MainScreen::ChangeLanguage(int language)
 
 void MainScreen::Over_Click()
 {
+    defaultInstance<frmSplash>().setAuthor({}); // of the form that the last time has left
     defaultInstance<frmSplash>().ShowModal();
-    // By design: the author comes after the screen has closed, on a form that stays hidden.
+    // By design: the author comes after the screen has closed, on a form that stays hidden, and is
+    // never seen.
     frmSplash &hidden = defaultInstance<frmSplash>();
     hidden.Load();
     hidden.setAuthor(GetMessage("TheAuthor"));
@@ -278,8 +281,8 @@ QMdiSubWindow *MainScreen::subWindowOf(Form *form) const
 
 void MainScreen::bringToFront()
 {
-    if (mTimer1->isActive())
-        return; // the start is still on its way
+    if (!mStarted)
+        return; // by the timer step, which comes after what the start still has to say
     setWindowState(windowState() & ~Qt::WindowMinimized);
     show();
     raise();

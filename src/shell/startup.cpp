@@ -11,6 +11,10 @@
 #include "services/messages.h"
 
 #include <QDir>
+#include <algorithm>
+#include <cmath>
+#include <limits>
+#include <optional>
 
 using namespace Qt::StringLiterals;
 
@@ -21,6 +25,7 @@ namespace
 {
 
 constexpr int currentGeneration = 4;
+constexpr int largestNumber = std::numeric_limits<int>::max();
 
 QString read(clsRegistry &settings, const char *name)
 {
@@ -38,37 +43,40 @@ void writeFirst(clsRegistry &settings, const char *name, int value)
     write(settings, name, value);
 }
 
-int number(const QString &text)
+// What is no number, or one beyond what a number of the settings can be, is as good as not there.
+std::optional<int> readNumber(clsRegistry &settings, const char *name)
 {
-    const qint64 value = ADODB::Value(text).toLong();
-    if (value != int(value))
-        throw makeError(errOverflow);
-    return int(value);
+    const QString stored = read(settings, name);
+    if (!text::isNumeric(stored))
+        return {};
+    const double value = stored.trimmed().toDouble();
+    if (std::abs(value) > largestNumber)
+        return {};
+    return int(ADODB::Value(stored).toLong());
 }
 
 int countSession(clsRegistry &settings)
 {
-    const QString stored = read(settings, "Session");
-    if (!text::isNumeric(stored)) {
+    const auto stored = readNumber(settings, "Session");
+    if (!stored) {
         writeFirst(settings, "Session", 1);
         return 1;
     }
-    const int session = number(stored) + 1;
+    const int session = std::min(*stored, largestNumber - 1) + 1; // the last one stays
     write(settings, "Session", session);
     return session;
 }
 
 void readLanguage(clsRegistry &settings)
 {
-    const QString stored = read(settings, "Language");
-    if (!text::isNumeric(stored)) {
+    const auto stored = readNumber(settings, "Language");
+    if (!stored) {
         gLanguage = languageEnglish;
         writeFirst(settings, "Language", gLanguage);
         return;
     }
-    const qint64 language = ADODB::Value(stored).toLong();
-    gLanguage = language == languageDutch ? languageDutch : languageEnglish;
-    if (language != gLanguage)
+    gLanguage = stored == languageDutch ? languageDutch : languageEnglish;
+    if (stored != gLanguage)
         write(settings, "Language", gLanguage);
 }
 
@@ -80,13 +88,13 @@ bool oldCatalogueIn(const QString &folder)
 
 void readGeneration(clsRegistry &settings, const QString &programFolder, Found &found)
 {
-    const QString stored = read(settings, "DBVersion");
-    if (!text::isNumeric(stored)) {
+    const auto stored = readNumber(settings, "DBVersion");
+    if (!stored) {
         writeFirst(settings, "DBVersion", currentGeneration);
         found.conversionPending = oldCatalogueIn(programFolder);
         return;
     }
-    found.dbVersion = number(stored);
+    found.dbVersion = *stored;
     if (found.dbVersion < currentGeneration) {
         settings.SetValue(u"Software\\Orvanta Software\\Songcase"_s, u"DBVersion"_s,
                           currentGeneration);

@@ -14,8 +14,8 @@ struct Found {
     QString useProxy; // the text of the value UseProxy
 };
 
-/// Reads the settings, mends and counts on, and sets gLanguage and the proxy globals. Throws
-/// Error for a number that is too large.
+/// Reads the settings, mends and counts on, and sets gLanguage and the proxy globals. Nothing that
+/// stands in them makes it fail.
 Found readSettings(const QString &programFolder);
 
 /// The language that the settings hold, English where they hold none; nothing is written.

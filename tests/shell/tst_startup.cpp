@@ -34,6 +34,11 @@ private slots:
         row("next session", "Session", 41, 42, 42, 1, false);
         row("session as text", "Session", u"6"_s, 7, 7, 1, false);
         row("session is words", "Session", u"x"_s, 1, 1, 1, false);
+        row("session beyond all numbers", "Session", u"1e30"_s, 1, 1, 1, false);
+        row("session just beyond", "Session", u"2147483648"_s, 1, 1, 1, false);
+        row("the last session", "Session", 2147483647, 2147483647, 2147483647, 1, false);
+        row("language beyond all numbers", "Language", u"1e30"_s, 1, 1, 1, false);
+        row("generation beyond all numbers", "DBVersion", u"-1e30"_s, 4, 1, 1, false);
         row("Dutch", "Language", 19, 19, 1, 19, false);
         row("no such language", "Language", 5, 1, 1, 1, false);
         row("language is words", "Language", u"abc"_s, 1, 1, 1, false);
