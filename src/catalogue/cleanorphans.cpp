@@ -35,8 +35,6 @@ bool goodRowsGone(const ADODB::DeletedRows &deleted)
 void CleanOrphans()
 {
     try {
-        if (!gConnection)
-            throw makeError(errObjectClosed);
         ADODB::Transaction transaction(*gConnection);
         const ADODB::DeletedRows deleted(*gConnection);
         gConnection->Execute(deleteTracks);

@@ -7,8 +7,6 @@
 void showDatabaseErrors(const Error &error, const QString &title)
 {
     errorBox(error.numbered(), title);
-    if (!gConnection)
-        return;
     const auto entries = gConnection->Errors;
     for (const Error &entry : entries)
         errorBox(entry.numbered());

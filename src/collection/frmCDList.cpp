@@ -55,8 +55,6 @@ std::vector<RecordTree::Node> nodesOf(const ADODB::Recordset &recordset, QChar k
 
 template <typename PrintedReport> void startReport()
 {
-    if (!gConnection)
-        throw makeError(errObjectClosed);
     const auto rows = gConnection->Execute(PrintedReport::command(), ADODB::adOptionUnspecified);
     auto &report = defaultInstance<PrintedReport>();
     report.setDataSource(rows);
@@ -159,8 +157,6 @@ void frmCDList::LoadLists()
 {
     setFramePointer(vbHourglass);
     try {
-        if (!gConnection)
-            throw makeError(errObjectClosed);
         loadPage(mPages[0]);
         loadPage(mPages[1]);
         mTrackCount = browserlists::trackCount();

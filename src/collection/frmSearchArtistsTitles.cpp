@@ -167,8 +167,6 @@ void frmSearchArtistsTitles::refuse(const char *message, QLineEdit *field)
 
 void frmSearchArtistsTitles::show(const SearchKey &key)
 {
-    if (!gConnection)
-        throw makeError(errObjectClosed);
     if (mUi->ResultList->ListItems().Count() > largeResult)
         showNothing(); // makes room for as many
     const auto found = std::make_shared<ADODB::Recordset>();
@@ -216,7 +214,7 @@ void frmSearchArtistsTitles::ResultList_Enter()
 
 void frmSearchArtistsTitles::openDisc(const ListItem &item)
 {
-    if (!item || !gConnection)
+    if (!item)
         return;
     const QStringList texts = textsOf(item);
     try {

@@ -1,9 +1,10 @@
 #include "services/globals.h"
 
+#include "platform/ado/connection.h"
 #include "platform/ado/recordset.h"
 #include "services/messages.h"
 
-std::unique_ptr<ADODB::Connection> gConnection;
+std::unique_ptr<ADODB::Connection> gConnection = std::make_unique<ADODB::Connection>();
 QString gDatabasePath;
 int gLanguage = languageEnglish;
 

@@ -11,8 +11,10 @@ class Recordset;
 
 // What the screens share, one instance each, plain values.
 
-extern std::unique_ptr<ADODB::Connection>
-    gConnection;              // the one connection; MainScreen's alone to open
+/// The one connection, MainScreen's alone to open and close. The object is always there: what is
+/// asked of it while it is closed is an error like any other.
+extern std::unique_ptr<ADODB::Connection> gConnection;
+
 extern QString gDatabasePath; // full name of the catalogue
 extern int gLanguage;         // 1 English, 19 Dutch; fixed for a run
 

@@ -169,8 +169,6 @@ void MainScreen::showConnectErrors(const Error &error)
                  GetMessage("MsgSysErr"));
     };
     show(error);
-    if (!gConnection)
-        return;
     const auto entries = gConnection->Errors;
     for (const Error &entry : entries)
         show(entry);
@@ -331,13 +329,9 @@ void MainScreen::closeCatalogue()
         return;
     try {
         CleanOrphans();
-        if (!gConnection)
-            throw makeError(errObjectClosed);
         gConnection->Close();
-        gConnection.reset();
     } catch (const Error &error) {
         errorBox(error.numbered(), GetMessage("MsgSysErr"));
-        if (gConnection)
-            gConnection->RollbackTrans();
+        gConnection->RollbackTrans();
     }
 }

@@ -1,6 +1,7 @@
 // Label: journey
 #include "catalogue/cataloguefile.h"
-#include "platform/ado/connection.h"
+#include "catalogue/ids.h"
+#include "platform/ado/recordset.h"
 #include "platform/desktop/programfolder.h"
 #include "services/clsRegistry.h"
 #include "services/globals.h"
@@ -52,7 +53,7 @@ private slots:
             QCOMPARE(program.frame().QMainWindow::size(), QSize(1000, 667));
             QCOMPARE(gConnection->State(), ADODB::adStateOpen);
             QVERIFY(program.end());
-            QVERIFY(!gConnection);
+            QCOMPARE(gConnection->State(), ADODB::adStateClosed);
         }
         QCOMPARE(QDir(mDesktop->folder).entryList(QDir::Files), texts("Compact4.orv"));
     }
@@ -123,6 +124,82 @@ private slots:
         QCOMPARE(QDir(mDesktop->folder).entryList({u"Compact4*"_s}).size(), 1);
     }
 
+    // A folder that cannot be made leaves the frame with its captions and a connection that is
+    // closed; what needs one says so and ends nothing.
+    void withoutACatalogue()
+    {
+        QTemporaryDir home;
+        qputenv("XDG_DATA_HOME", QFile::encodeName(writeFile(home.filePath(u"file"_s), "x")));
+        mDesktop->folder = programfolder::userFolder();
+        mDesktop->expectBox(u"ADO Connect Error: -2147467259"_s);
+        mDesktop->expectBox(u"[Unable to initialise list!] 3704"_s);
+        Program program(*mDesktop);
+        QVERIFY(program.start());
+        QCOMPARE(program.frame().windowTitle(), u"Dr. Orvanta's Songcase"_s);
+        QVERIFY(!program.entry("Import")->text().isEmpty());
+        QCOMPARE(gConnection->State(), ADODB::adStateClosed);
+
+        // With this the reading of a text file begins.
+        QCOMPARE(numberOf([] { nextId(u"select max(id+1) as ID from CDtitels"_s, "ID"_L1); }),
+                 int(errObjectClosed));
+        mDesktop->verifyAllCame();
+        mDesktop->expectBox(u"[Systeemfout]"_s);
+        mDesktop->expectBox(u"[System error]"_s);
+        QVERIFY(program.end());
+    }
+
+    // Another one comes while this one still says what is wrong: the frame has its turn later.
+    void aSecondStartWhileTheFirstSaysAnError()
+    {
+        makeCatalogue();
+        writeFile(mDesktop->folder + u"/Compact4.orv"_s, "x");
+        MainScreen frame;
+        bool shown = true;
+        mDesktop->expectBox(u"ADO Connect Error"_s);
+        mDesktop->expectBox(u"not a catalogue"_s);
+        mDesktop->duringBox = [&] {
+            frame.bringToFront();
+            shown = frame.isVisible();
+        };
+        QVERIFY(frame.Load());
+        mDesktop->duringBox = {};
+        QVERIFY(!shown);
+        mDesktop->expectBox(u"[Systeemfout]"_s);
+        mDesktop->expectBox(u"[System error]"_s);
+        QVERIFY(frame.Unload());
+    }
+
+    void aCatalogueMovedWhileOpen_data()
+    {
+        QTest::addColumn<bool>("replaced");
+        QTest::newRow("moved") << false;
+        QTest::newRow("replaced") << true;
+    }
+
+    void aCatalogueMovedWhileOpen()
+    {
+        QFETCH(bool, replaced);
+        makeCatalogue();
+        storeLanguage(languageEnglish);
+        const QString file = mDesktop->folder + u"/Compact4.orv"_s, moved = file + u".old"_s;
+        Program program(*mDesktop);
+        QVERIFY(program.start());
+        const QByteArray before = readFile(file);
+        QVERIFY(QFile::rename(file, moved));
+        if (replaced)
+            writeFile(file, before);
+        QString told;
+        try {
+            gConnection->Execute(u"insert into artiesten values (1,'x')"_s);
+        } catch (const Error &error) {
+            told = error.Description;
+        }
+        QVERIFY2(told.contains("moved, replaced or deleted"_L1), qPrintable(told));
+        QCOMPARE(readFile(moved), before);
+        QCOMPARE(readFile(file), replaced ? before : QByteArray("none"));
+        QVERIFY(program.end());
+    }
+
     void changeOfLanguage_data() { languages(); }
     void changeOfLanguage()
     {
@@ -164,17 +241,20 @@ private slots:
         storeLanguage(language);
         Program program(*mDesktop);
         QVERIFY(program.start());
-        mDesktop->expectModal(u"frmSplash"_s, [](Form &splash) {
-            QCOMPARE(splash.findChild<QLabel *>(u"lblVersion"_s)->text(),
-                     u"Version " SONGCASE_VERSION ""_s);
-            QCOMPARE(splash.findChild<QLabel *>(u"lblAuthor"_s)->text(), QString());
-            QTest::keyClick(&splash, Qt::Key_Space);
-        });
-        program.choose("tbCredits");
         const QString author =
             language == languageDutch ? u"Door Arend K. Vossel"_s : u"Created by Arend K. Vossel"_s;
-        QCOMPARE(program.control<QLabel>("frmSplash", "lblAuthor")->text(), author);
-        QVERIFY(!program.screen("frmSplash")->isVisible());
+        for (int time = 1; time <= 2; ++time) {
+            QStringList shown;
+            mDesktop->expectModal(u"frmSplash"_s, [&](Form &splash) {
+                for (const char *label : {"lblVersion", "lblAuthor"})
+                    shown.append(splash.findChild<QLabel *>(QLatin1String(label))->text());
+                QTest::keyClick(&splash, Qt::Key_Space);
+            });
+            program.choose("tbCredits");
+            QCOMPARE(shown, (QStringList{u"Version " SONGCASE_VERSION ""_s, QString()}));
+            QCOMPARE(program.control<QLabel>("frmSplash", "lblAuthor")->text(), author);
+            QVERIFY(!program.screen("frmSplash")->isVisible());
+        }
 
         program.choose("mnuHelp");
         QPointer<Form> help = program.screen("frmHelp");
@@ -188,6 +268,9 @@ private slots:
         QVERIFY(mDesktop->addresses.first().endsWith(
             language == languageDutch ? "guide/nl/index.html"_L1 : "guide/en/index.html"_L1));
         QVERIFY(QFile::exists(QUrl(mDesktop->addresses.first()).toLocalFile()));
+        // Below ~/.local that is the folder of the user's catalogue, which is not there before the
+        // first start.
+        QVERIFY(!mDesktop->addresses.first().contains("share/songcase/"_L1));
         mDesktop->browserThere = false;
         mDesktop->expectBox(u"error [] No browser detected!"_s.mid(0, 5));
         emit link->linkActivated(u"guide"_s);

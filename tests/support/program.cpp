@@ -18,7 +18,7 @@ Program::Program(ScriptedDesktop &desktop)
 Program::~Program()
 {
     mFrame.reset();
-    gConnection.reset();
+    gConnection = std::make_unique<ADODB::Connection>();
     QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
 }
 

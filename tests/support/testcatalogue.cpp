@@ -44,7 +44,7 @@ TestCatalogue::TestCatalogue()
 
 TestCatalogue::~TestCatalogue()
 {
-    gConnection.reset();
+    gConnection = std::make_unique<ADODB::Connection>();
 }
 
 OtherProgram::OtherProgram(const QString &file)

@@ -20,6 +20,7 @@ constexpr Words words[] = {
     {SQLITE_BUSY, errCannotUse, "xErrInUse"},
     {SQLITE_LOCKED, errCannotUse, "xErrInUse"},
     {SQLITE_FULL, errCannotUse, "xErrDiskFull"},
+    {SQLITE_READONLY_DBMOVED, errCannotUse, "xErrMoved"},
     {SQLITE_READONLY, errReadOnly, "xErrReadOnly"},
     {SQLITE_CANTOPEN, errCannotUse, "xErrCannotOpen"},
     {SQLITE_CORRUPT, errCannotUse, "xErrDamaged"},
@@ -35,7 +36,7 @@ Error engineError(int code, const QString &message)
 {
     const auto source = u"SQLite"_s;
     for (const Words &w : words) {
-        if (w.code == (code & 0xFF))
+        if (w.code == code || w.code == (code & 0xFF))
             return {w.number, source, errorText(w.key, message)};
     }
     return {errSyntax, source, errorText("xErrSyntax", message)};
