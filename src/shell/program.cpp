@@ -11,6 +11,8 @@
 #include "shell/singleinstance.h"
 #include "shell/startup.h"
 
+#include <csignal>
+
 namespace
 {
 
@@ -20,10 +22,19 @@ void sayInUse()
     errorBox(GetMessage("xInUse"), GetMessage("MainScreen.Caption"));
 }
 
+// A file that must not grow, or a reader that has gone, is an error of the write and no reason to
+// die. Handled rather than ignored, which programs that are started from here would inherit.
+void outliveWrites()
+{
+    for (const int number : {SIGXFSZ, SIGPIPE})
+        std::signal(number, [](int) {});
+}
+
 } // namespace
 
 int runProgram(int argc, char **argv)
 {
+    outliveWrites();
     nameApplication();
     Application application(argc, argv);
     QtDesktop desktop;
