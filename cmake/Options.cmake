@@ -28,6 +28,21 @@ endfunction()
 songcase_pch(songcase_pch Qt6::Widgets <QtCore> <QtWidgets>)
 songcase_pch(songcase_core_pch Qt6::Core <QtCore>)
 
+# songcase_tidy(): what this folder compiles from here on, clang-tidy reads first; both are done again only
+# where a source or one of its headers has changed.
+option(SONGCASE_TIDY "clang-tidy with each source of src" OFF)
+function(songcase_tidy)
+    if(SONGCASE_TIDY)
+        find_program(CLANG_TIDY clang-tidy REQUIRED)
+        file(SHA1 ${CMAKE_SOURCE_DIR}/.clang-tidy rules) # other rules are a reason to read all again
+        set_property(DIRECTORY APPEND PROPERTY CMAKE_CONFIGURE_DEPENDS ${CMAKE_SOURCE_DIR}/.clang-tidy)
+        # What moc and the resource compiler write is not ours to mend.
+        file(WRITE ${CMAKE_BINARY_DIR}/.clang-tidy "Checks: '-*,readability-misleading-indentation'\n")
+        set(CMAKE_CXX_CLANG_TIDY ${CLANG_TIDY} --quiet --warnings-as-errors=*
+            --extra-arg=-DSONGCASE_TIDY_RULES=0x${rules} PARENT_SCOPE)
+    endif()
+endfunction()
+
 # songcase_use_pch(TARGET PCH)
 function(songcase_use_pch target pch)
     if(SONGCASE_PCH)

@@ -6,6 +6,7 @@ build_packages="g++ cmake ninja-build ccache pkg-config qt6-base-dev qt6-base-de
 run_packages="libqt6svg6 qt6-wayland qt6-qpa-plugins qt6-translations-l10n fonts-dejavu-core xdg-utils"
 headless_packages="xvfb xdotool imagemagick"
 check_packages="mold clang-format sqlite3 python3 poppler-utils desktop-file-utils appstream mandoc tidy"
+tidy_packages="clang-tidy"
 package_packages="dpkg-dev file"
 cleanroot_packages="mmdebstrap"
 

@@ -1,6 +1,5 @@
 #include "services/filelock.h"
 
-#include <QDeadlineTimer>
 #include <QFile>
 #include <cerrno>
 #include <fcntl.h>
@@ -12,7 +11,7 @@ namespace
 {
 
 constexpr off_t lockedByte = off_t(1) << 62;
-constexpr useconds_t betweenAttempts = 5000; // microseconds
+constexpr int betweenAttempts = 5; // milliseconds
 
 bool isPlainFile(int handle)
 {
@@ -70,10 +69,10 @@ FileLock::Outcome FileLock::take(const QString &file)
 
 FileLock::Outcome FileLock::takeWithin(const QString &lockFile, int milliseconds)
 {
-    const QDeadlineTimer deadline(milliseconds);
     auto outcome = take(lockFile, O_CREAT);
-    while (outcome == Outcome::Held && !deadline.hasExpired()) {
-        ::usleep(betweenAttempts);
+    for (int waited = 0; outcome == Outcome::Held && waited < milliseconds;
+         waited += betweenAttempts) {
+        ::usleep(betweenAttempts * 1000);
         outcome = take(lockFile, O_CREAT);
     }
     return outcome;

@@ -58,9 +58,9 @@ bool isOurs(const QJsonDocument &document)
 {
     int ours = 0, others = 0;
     const QJsonObject keys = document.object();
-    for (const QJsonValue &key : keys) {
+    for (const auto &key : keys) {
         const QJsonObject values = key.toObject();
-        for (const QJsonValue &value : values)
+        for (const auto &value : values)
             ++(fromJson(value).typeId() == QMetaType::QJsonValue ? others : ours);
         if (!key.isObject())
             return false;
