@@ -74,12 +74,30 @@ frmCDList::frmCDList() : Form(u"frmCDList"_s), mUi(std::make_unique<Ui::frmCDLis
             all.push_back({ListColumn::Text, caption, 1});
         return new ListColumns(list, std::move(all));
     };
-    mPages = {ListPage{Compilations, mUi->ColList, browserlists::compilations,
-                       columns(mUi->ColList, {"Titel"}), "NumCompCol"},
-              ListPage{Albums, mUi->SngList, browserlists::albums,
-                       columns(mUi->SngList, {"Artiest", "Titel"}), "NumAlbCol"},
-              ListPage{MP3Collections, mUi->MP3List, browserlists::mp3Collections,
-                       columns(mUi->MP3List, {"Map", "Titel"}), "NumMP3Coll"}};
+    mPages = {ListPage{Compilations,
+                       mUi->ColList,
+                       browserlists::compilations,
+                       columns(mUi->ColList, {"Titel"}),
+                       "NumCompCol",
+                       mUi->noCompilations,
+                       "xNoCompilations",
+                       {"xStepTypeDisc", "mnuCDInsert"}},
+              ListPage{Albums,
+                       mUi->SngList,
+                       browserlists::albums,
+                       columns(mUi->SngList, {"Artiest", "Titel"}),
+                       "NumAlbCol",
+                       mUi->noAlbums,
+                       "xNoAlbums",
+                       {"xStepTypeDisc", "mnuInsertEnkelCD"}},
+              ListPage{MP3Collections,
+                       mUi->MP3List,
+                       browserlists::mp3Collections,
+                       columns(mUi->MP3List, {"Map", "Titel"}),
+                       "NumMP3Coll",
+                       mUi->noMP3,
+                       "xNoMP3Collections",
+                       {"xStepMP3", "mnuMP3"}}};
     setCancelButton(mUi->cmdCancel);
     setCaptions();
     connectControls();
@@ -178,9 +196,19 @@ void frmCDList::loadPage(ListPage &page)
     list.sortBy(firstSortKey);
     page.count = rows->RecordCount();
     list.setEnabled(page.count != 0);
+    showSteps(page);
     rows->Close();
     if (page.index > 1)
         RestoreSelection(page);
+}
+
+void frmCDList::showSteps(const ListPage &page)
+{
+    std::vector<FirstSteps::Step> steps{page.firstStep};
+    if (page.page != MP3Collections)
+        steps.insert(steps.end(), {{"xStepTextFile", "Import"}, {"xStepReadCD", "mnuCDDB"}});
+    steps.push_back({"xStepGuide", "mnuHelp"});
+    page.steps->showFor(page.count == 0, page.emptyKey, steps);
 }
 
 frmCDList::ListPage *frmCDList::current()

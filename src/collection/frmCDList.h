@@ -1,5 +1,6 @@
 #pragma once
 
+#include "collection/firststeps.h"
 #include "platform/ado/recordset.h"
 #include "platform/desktop/form.h"
 #include "services/browser.h"
@@ -50,6 +51,9 @@ private:
         ADODB::RecordsetPtr (*read)();
         ListColumns *columns;
         const char *countKey;
+        FirstSteps *steps; // in place of an empty list
+        const char *emptyKey;
+        FirstSteps::Step firstStep;
         qsizetype count = 0;
         int index = 1; // of the remembered row, from 1
     };
@@ -59,6 +63,7 @@ private:
     void setCaptions();
     void LoadLists();
     void loadPage(ListPage &page);
+    static void showSteps(const ListPage &page);
     void CDTab_Click();
     void showPage();
     void setTabStops();

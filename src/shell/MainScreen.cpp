@@ -104,6 +104,7 @@ void MainScreen::setCaptions()
                          {"Import", "Import"},
                          {"mnuSave", "mnuSave"},
                          {"mnuConvertDatabase", "frmAutoUpdateUtilityCaption"},
+                         {"Quit", "xQuit"},
                          {"mnuLiedkist", "mnuLiedkist"},
                          {"mnuSearchArtistsTitles", "mnuSearchArtistsTitles"},
                          {"mnuCDInsert", "mnuCDInsert"},
@@ -126,9 +127,27 @@ void MainScreen::setCaptions()
                          {"tbHelp", "TTHelp"},
                          {"tbCDDB", "TTCDDB"},
                          {"MainToolbar", "xToolbar"}});
+    nameKeys();
     // The keys that a toolbar's commands send go to the control with the focus.
     for (QToolButton *button : mUi->MainToolbar->findChildren<QToolButton *>())
         button->setFocusPolicy(Qt::NoFocus);
+}
+
+// In the tool tip of each button: those of the entry that does the same.
+void MainScreen::nameKeys()
+{
+    const std::pair<QAction *, QAction *> buttons[] = {
+        {mUi->tbImport, mUi->Import},
+        {mUi->tbSave, mUi->mnuSave},
+        {mUi->tbQuicksearch, mUi->mnuSearchArtistsTitles},
+        {mUi->tbCollection, mUi->mnuUpdate},
+        {mUi->tbCredits, mUi->Over},
+        {mUi->tbHelp, mUi->mnuHelp},
+        {mUi->tbCDDB, mUi->mnuCDDB}};
+    for (const auto &[button, entry] : buttons) {
+        const QString keys = entry->shortcut().toString(QKeySequence::NativeText);
+        button->setToolTip(button->text() + u" ("_s + keys + u')');
+    }
 }
 
 void MainScreen::markLanguage()
@@ -145,6 +164,7 @@ void MainScreen::connectActions()
     const auto importText = [] { defaultInstance<frmImportWizard>().Show(); };
     on(mUi->Import, importText);
     on(mUi->tbImport, importText);
+    on(mUi->Quit, &QWidget::close);
     on(mUi->mnuSave, &editors::saveAll);
     on(mUi->tbSave, &editors::saveAll);
     const auto searchTracks = [] { defaultInstance<frmSearchArtistsTitles>().Show(); };
@@ -182,11 +202,11 @@ void MainScreen::Timer1_Timer()
         defaultInstance<frmSplash>().Unload();
         setWindowState(Qt::WindowNoState);
         mTimer1->stop();
-        move(placeAtStart.topLeft());
-        resize(placeAtStart.size());
+        placeOnScreen(this, placeAtStart.topLeft(), placeAtStart.size());
     }
     mStarted = true;
     show();
+    placeOnScreen(this, pos(), QMainWindow::size()); // with what is now drawn around it
     openBrowser();
     if (mStart.session == 1)
         ShowHelpLinks();
@@ -232,6 +252,11 @@ void MainScreen::Over_Click()
     Desktop::current().pump();
 }
 
+QAction *MainScreen::command(const QString &name)
+{
+    return findChild<QAction *>(name);
+}
+
 void MainScreen::setImportEnabled(bool enabled)
 {
     mUi->Import->setEnabled(enabled);
@@ -249,15 +274,47 @@ void MainScreen::adopt(Form *form)
     }
     QMdiSubWindow *child = mUi->Children->addSubWindow(form);
     child->setAttribute(Qt::WA_DeleteOnClose, false);
+    // Tab would come by it on its way around, and screen readers would tell of it last.
+    child->setFocusPolicy(Qt::ClickFocus);
     child->setWindowIcon(form->windowIcon());
     form->show();
     child->show();
     const QSize room = mUi->Children->viewport()->size();
     child->resize((wanted + child->size() - form->size()).boundedTo(room));
-    const QPoint place = form->place().value_or(child->pos());
-    child->move(std::clamp(place.x(), 0, room.width() - child->width()),
-                std::clamp(place.y(), 0, room.height() - child->height()));
+    const QPoint place = form->place() ? *form->place() : freePlaceFor(*child);
+    child->move(std::clamp(place.x(), 0, std::max(0, room.width() - child->width())),
+                std::clamp(place.y(), 0, std::max(0, room.height() - child->height())));
     mUi->Children->setActiveSubWindow(child);
+}
+
+// Where a screen that asks for no place covers the fewest controls of the others; lists are none.
+QPoint MainScreen::freePlaceFor(const QMdiSubWindow &child) const
+{
+    const QSize free = mUi->Children->viewport()->size() - child.size();
+    const int right = free.width(), down = free.height();
+    QPoint best = child.pos();
+    int least = controlsBehind(child, best);
+    for (const QPoint corner : {QPoint(right, down / 2), QPoint(right, 0), QPoint(right, down),
+                                QPoint(0, down), QPoint(0, down / 2)}) {
+        const int covered = controlsBehind(child, corner);
+        if (covered < least) {
+            best = corner;
+            least = covered;
+        }
+    }
+    return best;
+}
+
+int MainScreen::controlsBehind(const QMdiSubWindow &child, QPoint corner) const
+{
+    const auto all = mUi->Children->viewport()->findChildren<QWidget *>();
+    return int(std::count_if(all.begin(), all.end(), [&](const QWidget *w) {
+        const bool isControl = w->focusPolicy() & Qt::TabFocus && w->isVisible() &&
+                               !qobject_cast<const QAbstractScrollArea *>(w) &&
+                               !child.isAncestorOf(w);
+        const QRect place(w->mapTo(mUi->Children->viewport(), QPoint()), w->size());
+        return isControl && place.intersects({corner, child.size()});
+    }));
 }
 
 void MainScreen::bringUp(Form *form)

@@ -39,6 +39,7 @@ public:
     QWidget *window() override { return this; }
     QSize size() const override { return QMainWindow::size(); }
     void setImportEnabled(bool enabled) override;
+    QAction *command(const QString &name) override;
 
     // Form::Host
     void adopt(Form *form) override;
@@ -57,6 +58,7 @@ private:
     void connectActions();
     void InitMainScreen();
     void setCaptions();
+    void nameKeys();
     void markLanguage();
     void showConnectErrors(const Error &error);
     void Timer1_Timer();
@@ -66,6 +68,8 @@ private:
     bool unloadChildren(bool forced);
     void closeCatalogue();
     QMdiSubWindow *subWindowOf(Form *form) const;
+    QPoint freePlaceFor(const QMdiSubWindow &child) const;
+    int controlsBehind(const QMdiSubWindow &child, QPoint corner) const;
 
     std::unique_ptr<Ui::MainScreen> mUi;
     QTimer *mTimer1;

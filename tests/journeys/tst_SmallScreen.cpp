@@ -1,0 +1,67 @@
+// Label: journey
+#include "support/journey.h"
+#include "support/onscreen.h"
+
+#include <QAbstractButton>
+#include <QScreen>
+
+/// A screen of 960 by 540: one of 1920 by 1080 whose owner wants all twice as large.
+class tst_SmallScreen : public Journey
+{
+    Q_OBJECT
+
+private slots:
+    void allStaysOnTheScreen_data() { languages(); }
+    void allStaysOnTheScreen()
+    {
+        QFETCH(int, language);
+        start(language);
+        QCOMPARE(outside(mProgram->frame()), QString());
+        for (const char *entry :
+             {"mnuCDInsert", "mnuInsertEnkelCD", "mnuSearchArtistsTitles", "Import", "mnuHelp"}) {
+            mProgram->choose(entry);
+            QCOMPARE(outside(mProgram->frame()), QString());
+            for (const Form *form : Form::openForms())
+                QCOMPARE(outside(*form), QString());
+        }
+        mProgram->frame().move(500, 300); // a wide report makes the frame grow from where it is
+        mProgram->frame().resize(400, 200);
+        mProgram->control<QAbstractButton>("frmCDList", "cmdStartReport")->click();
+        QVERIFY(mProgram->screen("CompilationReport"));
+        QCOMPARE(outside(mProgram->frame()), QString());
+        QVERIFY(mProgram->frame().QMainWindow::width() > 700);
+    }
+
+    void aMaximizedFrameStaysSo()
+    {
+        start(languageEnglish);
+        mProgram->frame().showMaximized();
+        const QRect before = mProgram->frame().geometry();
+        mProgram->control<QAbstractButton>("frmCDList", "cmdStartReport")->click();
+        mProgram->choose("mnuCDInsert");
+        QVERIFY(mProgram->frame().isMaximized());
+        QCOMPARE(mProgram->frame().geometry(), before);
+    }
+
+private:
+    // The names of the buttons, and of the window itself, that are not on the screen.
+    static QString outside(const QWidget &window)
+    {
+        const QRect screen = window.screen()->availableGeometry();
+        QStringList names;
+        if (window.isWindow() && !screen.contains(window.frameGeometry()))
+            names.append(window.objectName());
+        for (const auto *button : window.findChildren<QAbstractButton *>()) {
+            const QRect place(button->mapToGlobal(QPoint()), button->size());
+            if (button->isVisible() && !screen.contains(place))
+                names.append(button->objectName());
+        }
+        return names.join(u' ');
+    }
+};
+
+int main(int argc, char *argv[])
+{
+    return runOnScreen<tst_SmallScreen>(960, 540, argc, argv);
+}
+#include "tst_SmallScreen.moc"
