@@ -77,6 +77,7 @@ void frmSearchArtistsTitles::setCaptions()
                                                         {mUi->lblYears, "HitYearBetween"}};
     for (const auto &[label, key] : labels)
         label->setText(GetMessage(key) + u':');
+    mUi->txtHitjaartm->setAccessibleName(GetMessage("xLastYear"));
     mUi->ResultList->setAccessibleName(GetMessage("xFoundTracks"));
 }
 

@@ -1,7 +1,9 @@
 #include "collection/recordtree.h"
 
+#include "controls/list/accessiblecells.h"
 #include "services/messages.h"
 
+#include <QAccessible>
 #include <QGuiApplication>
 #include <QIcon>
 #include <QKeyEvent>
@@ -60,6 +62,8 @@ RecordTree::RecordTree(QWidget *parent) : QTreeWidget(parent)
     const auto keyed = [this](auto signal) {
         return [this, signal](QTreeWidgetItem *item) { emit(this->*signal)(keyOf(item)); };
     };
+    for (auto changed : {&QTreeView::expanded, &QTreeView::collapsed})
+        connect(this, changed, this, [this](const QModelIndex &node) { tellExpanded(this, node); });
     connect(this, &QTreeWidget::itemExpanded, this, keyed(&RecordTree::Expand));
     connect(this, &QTreeWidget::itemClicked, this, keyed(&RecordTree::NodeClick));
 }
@@ -119,6 +123,15 @@ void RecordTree::putPlaceholder(QTreeWidgetItem *item, Level level, const Node &
     auto *placeholder = new Item(below[level].key, below[level].text);
     mNodes.insert(below[level].key, placeholder);
     item->addChild(placeholder);
+}
+
+void RecordTree::focusInEvent(QFocusEvent *event)
+{
+    QTreeWidget::focusInEvent(event);
+    // The toolkit tells of the tree behind this.
+    if (QAccessible::isActive())
+        QMetaObject::invokeMethod(
+            this, [this] { tellCurrentRow(this); }, Qt::QueuedConnection);
 }
 
 void RecordTree::keyPressEvent(QKeyEvent *event)

@@ -39,6 +39,7 @@ signals:
     void Expand(const QString &key);
 
 protected:
+    void focusInEvent(QFocusEvent *event) override;
     void keyPressEvent(QKeyEvent *event) override;
 
 private:

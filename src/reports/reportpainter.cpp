@@ -98,6 +98,24 @@ void ReportPainter::paint(QPainter &painter, qsizetype page, const QRectF &part)
     paintFoot(painter, page);
 }
 
+QString ReportPainter::text(qsizetype page) const
+{
+    QStringList lines{mContent->caption()};
+    const auto addLine = [&](auto &&cellOf) {
+        QStringList cells;
+        for (const auto &column : mContent->columns())
+            cells.append(cellOf(column));
+        lines.append(cells.join(u'\t'));
+    };
+    if (mLayout.columnHeads().height() > 0)
+        addLine([](const auto &column) { return column.head; });
+    const auto rows = mLayout.rowsOf(page);
+    for (qsizetype row = rows.first; row < rows.end; ++row)
+        addLine([&](const auto &column) { return mContent->text(row, column); });
+    lines += {mContent->date(), mContent->count(), mContent->pageOf(page, mLayout.pageCount())};
+    return lines.join(u'\n');
+}
+
 void ReportPainter::paintHead(QPainter &painter) const
 {
     const QRectF caption = mLayout.caption(), heads = mLayout.columnHeads();

@@ -20,6 +20,9 @@ public:
     void paint(QPainter &painter, qsizetype page, const QRectF &part) const;
     void paint(QPainter &painter, qsizetype page) const;
 
+    /// The same as text, line by line, cells with a tab between them.
+    QString text(qsizetype page) const;
+
     const ReportContent &content() const { return *mContent; }
     const ReportLayout &layout() const { return mLayout; }
 

@@ -1,5 +1,7 @@
 #include "reports/reportview.h"
 
+#include "reports/accessiblepage.h"
+
 #include <QKeyEvent>
 #include <QPaintEvent>
 #include <QPainter>
@@ -21,6 +23,7 @@ constexpr qint64 longest = std::numeric_limits<int>::max() / 2; // that scroll b
 ReportView::ReportView(QWidget *parent) : QAbstractScrollArea(parent)
 {
     setFocusPolicy(Qt::StrongFocus);
+    AccessiblePage::install();
     // One that came and went would change the width that pages are fitted to.
     setVerticalScrollBarPolicy(Qt::ScrollBarAlwaysOn);
 }
@@ -125,6 +128,7 @@ void ReportView::setPage(qsizetype page)
         return;
     mPage = page;
     emit pageChanged();
+    AccessiblePage::pageChanged(this);
 }
 
 void ReportView::goToPage(qsizetype page)

@@ -24,6 +24,9 @@ public:
     qsizetype pageCount() const;
     void goToPage(qsizetype page);
 
+    /// What stands on the current page, line by line.
+    QString pageText() const { return mReport ? mReport->text(mPage) : QString(); }
+
     /// The steps of the zoom, and how large a page shows now; 1 is the size of the paper.
     static const std::vector<double> &zoomSteps();
     double factor() const { return mFactor; }

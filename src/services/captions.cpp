@@ -4,6 +4,7 @@
 #include "services/messages.h"
 
 #include <QAction>
+#include <QToolBar>
 #include <QWidget>
 
 namespace
@@ -25,11 +26,14 @@ void setToolTip(QObject *control, const QString &text)
     control->setProperty("accessibleName", text);
 }
 
-// Labels and buttons have "text", heads of frames and menus "title", screens "windowTitle".
+// Labels and buttons have "text", heads of frames and menus "title", screens "windowTitle". What is
+// written on a toolbar is for screen readers.
 void setText(QWidget *screen, QObject *control, const QString &text)
 {
     const char *property = "text";
-    if (control == screen)
+    if (qobject_cast<QToolBar *>(control))
+        property = "accessibleName";
+    else if (control == screen)
         property = "windowTitle";
     else if (control->metaObject()->indexOfProperty(property) < 0)
         property = "title";

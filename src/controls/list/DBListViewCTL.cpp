@@ -298,19 +298,21 @@ int DBListViewCTL::columnWidthOf(int column) const
 void DBListViewCTL::setColumnWidthOf(int column, int width)
 {
     setColumnHidden(column, width <= 0);
+    mModel->setHidden(column, width <= 0);
     if (width > 0)
         setColumnWidth(column, width);
     columnsChanged();
 }
 
-// The current cell and the check boxes are always in a column that shows.
+// The current cell and the check boxes are always in the first column that shows.
 void DBListViewCTL::columnsChanged()
 {
     const int first = shownIndex(0).isValid() ? shownIndex(0).column() : 0;
     if (CheckBoxes())
         mModel->setCheckColumn(first);
     const QModelIndex current = currentIndex();
-    if (current.isValid() && isColumnHidden(current.column()))
+    mModel->setFirstShown(first);
+    if (current.isValid() && current.column() != first)
         selectionModel()->setCurrentIndex(shownIndex(current.row()), QItemSelectionModel::NoUpdate);
 }
 

@@ -2,10 +2,12 @@
 
 #include "controls/list/DBListViewCTL.h"
 
+#include "controls/list/accessiblecells.h"
 #include "controls/list/keycodes.h"
 #include "controls/list/listmodel.h"
 #include "controls/list/rowdrag.h"
 
+#include <QAccessible>
 #include <QApplication>
 #include <QMouseEvent>
 #include <QPointer>
@@ -175,6 +177,7 @@ void DBListViewCTL::mousePressEvent(QMouseEvent *event)
     }
     QTableView::mousePressEvent(event);
     keepOneSelected();
+    columnsChanged(); // the cursor stands in the cell that tells of the whole row
     if (index.isValid())
         emit ItemClick(itemAt(index.row()));
 }
@@ -213,6 +216,10 @@ void DBListViewCTL::mouseDoubleClickEvent(QMouseEvent *event)
 void DBListViewCTL::focusInEvent(QFocusEvent *event)
 {
     QTableView::focusInEvent(event);
+    // The toolkit tells of the list behind this.
+    if (QAccessible::isActive())
+        QMetaObject::invokeMethod(
+            this, [this] { tellCurrentRow(this); }, Qt::QueuedConnection);
     if (event->reason() != Qt::PopupFocusReason)
         emit GotFocus();
 }

@@ -22,6 +22,7 @@ void ListModel::fill(std::shared_ptr<const ADODB::Rows> rows)
     mRows = std::move(rows);
     mCaptions.clear();
     mAlignments.clear();
+    mHidden.clear();
     if (mRows) {
         for (const ADODB::FieldInfo &field : mRows->fields())
             mCaptions.append(field.name);
@@ -118,6 +119,24 @@ void ListModel::setAlignment(int column, Qt::Alignment side)
         emit dataChanged(index(0, column), index(rowCount() - 1, column));
 }
 
+void ListModel::setHidden(int column, bool hidden)
+{
+    if (hidden)
+        mHidden.insert(column);
+    else
+        mHidden.remove(column);
+}
+
+QString ListModel::rowText(int record) const
+{
+    QStringList texts;
+    for (int column = 0; column < columnCount(); ++column) {
+        if (!mHidden.contains(column) && !text(record, column).isEmpty())
+            texts.append(text(record, column));
+    }
+    return texts.join(u", ");
+}
+
 QVariant ListModel::alignment(int column) const
 {
     const auto side = mAlignments.constFind(column);
@@ -161,6 +180,8 @@ QVariant ListModel::data(const QModelIndex &index, int role) const
         return text(record, index.column());
     case Qt::TextAlignmentRole:
         return alignment(index.column());
+    case Qt::AccessibleTextRole:
+        return index.column() == mFirstShown ? QVariant(rowText(record)) : QVariant();
     case Qt::FontRole:
         if (marks(record).bold) {
             QFont font;

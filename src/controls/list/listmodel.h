@@ -6,6 +6,7 @@
 #include <QAbstractTableModel>
 #include <QColor>
 #include <QHash>
+#include <QSet>
 #include <QStringList>
 
 /// The rows of a list: those of a recordset, never changed, and over them what the screen has
@@ -48,6 +49,10 @@ public:
 
     void setAlignment(int column, Qt::Alignment side); // until the next fill()
 
+    /// For assistive tools the cell in the first column that shows is its whole row.
+    void setFirstShown(int column) { mFirstShown = column; }
+    void setHidden(int column, bool hidden);
+
     void setCheckColumn(int column); // -1: no check boxes
     int checkColumn() const { return mCheckColumn; }
 
@@ -65,6 +70,7 @@ signals:
 
 private:
     QVariant alignment(int column) const;
+    QString rowText(int record) const;
     bool startsWith(int record, int column, const QString &start) const;
     void setOrder(std::vector<std::uint32_t> order);
     void rowChanged(int record);
@@ -76,6 +82,8 @@ private:
     std::vector<std::uint32_t> mOrder, mRowOf; // empty in the recordset's order
     int mSortedBy = -1;                        // -2: by a column written to since
     int mCheckColumn = -1;
+    int mFirstShown = 0;
+    QSet<int> mHidden;
     QHash<int, WrittenTexts> mWritten; // by column
     QHash<int, Marks> mMarks;
 };

@@ -1,5 +1,6 @@
 #include "platform/desktop/form.h"
 
+#include "platform/desktop/accessibleform.h"
 #include "platform/desktop/desktop.h"
 #include "platform/desktop/nestedloop.h"
 
@@ -63,6 +64,7 @@ Form::Form(const QString &name)
     setObjectName(name);
     gOpenForms.append(this);
     FormActivation::watch();
+    AccessibleForm::install();
 }
 
 Form::~Form()
