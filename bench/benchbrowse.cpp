@@ -1,8 +1,14 @@
 #include "browsepages.h"
 #include "cases.h"
+#include "collection/frmCDList.h"
 #include "platform/ado/recordset.h"
 #include "services/globals.h"
 #include "shell/startup.h"
+
+#include <QApplication>
+#include <QTabWidget>
+
+using namespace Qt::StringLiterals;
 
 namespace
 {
@@ -11,7 +17,7 @@ void browse(benchmark::State &state, const benchdata::Scale &scale)
 {
     startup::openCatalogue(QString::fromStdString(benchdata::catalogue(scale)), false);
     for (auto _ : state)
-        benchmark::DoNotOptimize(loadBrowsePages().tracks);
+        benchmark::DoNotOptimize(loadBrowsePages().albums.order.data());
     gConnection.reset();
 }
 
@@ -22,6 +28,30 @@ void openAndCheck(benchmark::State &state, const benchdata::Scale &scale)
         startup::openCatalogue(file, false);
         gConnection.reset();
     }
+}
+
+// What a save asks of the browser: a title of the page that shows has changed, up to the paint.
+void refresh(benchmark::State &state, const benchdata::Scale &scale)
+{
+    const std::string copy = benchdata::scratchCopy(benchdata::catalogue(scale));
+    startup::openCatalogue(QString::fromStdString(copy), false);
+    gConnection->housekeeping("PRAGMA synchronous=OFF");
+    auto *browser = new frmCDList;
+    browser->Show();
+    browser->findChild<QTabWidget *>(u"CDTab"_s)->setCurrentIndex(int(state.range(0)));
+    QApplication::processEvents();
+    int round = 0;
+    for (auto _ : state) {
+        state.PauseTiming();
+        gConnection->Execute(u"update CDTitels set Titel = 'Title "_s + QString::number(++round) +
+                             u"' where ID in (10, 11, 12, 13, 14, 15)"_s);
+        state.ResumeTiming();
+        browser->RefreshLists();
+        QApplication::processEvents();
+    }
+    browser->Unload();
+    QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+    gConnection.reset();
 }
 
 // A click on a column of the albums: 1 the artist, 2 the title.
@@ -43,6 +73,10 @@ void registerBrowseCases()
         benchmark::RegisterBenchmark(caseName("open", scale).c_str(), openAndCheck, scale)
             ->Unit(benchmark::kMillisecond);
         benchmark::RegisterBenchmark(caseName("browse", scale).c_str(), browse, scale)
+            ->Unit(benchmark::kMillisecond);
+        benchmark::RegisterBenchmark(caseName("refresh the browser", scale).c_str(), refresh, scale)
+            ->ArgName("page")
+            ->DenseRange(0, 1)
             ->Unit(benchmark::kMillisecond);
         benchmark::RegisterBenchmark(caseName("sort albums", scale).c_str(), sortAlbums, scale)
             ->ArgName("column")

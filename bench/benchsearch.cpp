@@ -1,6 +1,15 @@
 #include "cases.h"
+#include "collection/frmSearchArtistsTitles.h"
 #include "names.h"
+#include "platform/ado/connection.h"
 #include "rawdatabase.h"
+#include "services/globals.h"
+#include "shell/startup.h"
+
+#include <QApplication>
+#include <QPushButton>
+
+using namespace Qt::StringLiterals;
 
 namespace
 {
@@ -42,10 +51,30 @@ void registerPattern(const std::string &name, bool accented, const std::string &
         ->Unit(benchmark::kMillisecond);
 }
 
+// All rows of an owner's catalogue, up to the paint.
+void everythingOnTheScreen(benchmark::State &state)
+{
+    startup::openCatalogue(QString::fromStdString(benchdata::catalogue(benchdata::scales()[0])),
+                           false);
+    auto *search = new frmSearchArtistsTitles;
+    search->Show();
+    QApplication::processEvents();
+    auto *button = search->findChild<QPushButton *>(u"cmdSearch"_s);
+    for (auto _ : state) {
+        button->click();
+        QApplication::processEvents();
+    }
+    search->Unload();
+    QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+    gConnection.reset();
+}
+
 } // namespace
 
 void registerSearchCases()
 {
+    benchmark::RegisterBenchmark("search everything, on the screen", everythingOnTheScreen)
+        ->Unit(benchmark::kMillisecond);
     registerPattern("ASCII titles", false, "%maan%");
     registerPattern("ASCII titles, none found", false, "%qqq%");
     registerPattern("accented titles", true, "%été%");

@@ -19,7 +19,6 @@ BrowsePages loadBrowsePages()
     BrowsePages pages;
     pages.compilations = page(browserlists::compilations());
     pages.albums = page(browserlists::albums());
-    pages.tracks = browserlists::trackCount();
     pages.collections = page(browserlists::mp3Collections());
     return pages;
 }

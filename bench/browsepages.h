@@ -13,7 +13,6 @@ struct BrowsePage {
 /// What a load of the browser brings in.
 struct BrowsePages {
     BrowsePage compilations, albums, collections;
-    qint64 tracks = 0;
 };
 
 /// Reads and sorts all pages from gConnection, as the browser does when it is loaded and at each

@@ -34,8 +34,7 @@ void browse(const QStringList &arguments)
         const BrowsePages pages = loadBrowsePages();
         return count("compilations", pages.compilations.rows->rowCount()) +
                count("albums", pages.albums.rows->rowCount()) +
-               count("collections", pages.collections.rows->rowCount()) +
-               count("tracks", pages.tracks);
+               count("collections", pages.collections.rows->rowCount());
     });
 }
 

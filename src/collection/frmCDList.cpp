@@ -23,7 +23,8 @@ using namespace Qt::StringLiterals;
 namespace
 {
 
-constexpr int firstSortKey = 1; // sort keys from 0: the first column that shows
+constexpr qsizetype readAtOnce = 10'000; // rows: some milliseconds
+constexpr int firstSortKey = 1;          // sort keys from 0: the first column that shows
 constexpr int keyEnter = 13, keyInsert = 45, keyDelete = 46;
 
 using TextOf = std::function<QString(const ADODB::Rows &rows, qsizetype row)>;
@@ -173,14 +174,14 @@ void frmCDList::RefreshLists()
 
 void frmCDList::LoadLists()
 {
+    read(&frmCDList::readPages);
+}
+
+void frmCDList::read(void (frmCDList::*what)())
+{
     setFramePointer(vbHourglass);
     try {
-        loadPage(mPages[0]);
-        loadPage(mPages[1]);
-        mTrackCount = browserlists::trackCount();
-        mUi->Platenbak->resetRoots();
-        loadPage(mPages[2]);
-        showPage();
+        (this->*what)();
     } catch (const Error &error) {
         showDatabaseErrors(error, GetMessage("UFL"));
         releaseFrame();
@@ -188,10 +189,34 @@ void frmCDList::LoadLists()
     setFramePointer(vbDefault);
 }
 
+// Large pages that do not show are read when they are looked at: a save must not wait for them.
+void frmCDList::readPages()
+{
+    for (ListPage &page : mPages)
+        page.stale = true;
+    mTrackCount.reset();
+    mUi->Platenbak->resetRoots();
+    for (ListPage &page : mPages) {
+        if (page.count <= readAtOnce)
+            loadPage(page);
+    }
+    readWhatShows();
+    showPage();
+}
+
+void frmCDList::readWhatShows()
+{
+    if (ListPage *page = current(); page && page->stale)
+        loadPage(*page);
+    else if (!page && !mTrackCount)
+        mTrackCount = browserlists::trackCount();
+}
+
 void frmCDList::loadPage(ListPage &page)
 {
     DBListViewCTL &list = *page.list;
     const auto rows = page.read();
+    page.stale = false;
     page.columns->show(rows);
     list.sortBy(firstSortKey);
     page.count = rows->RecordCount();
@@ -225,6 +250,7 @@ void frmCDList::CDTab_Click()
     if (mLoading)
         return;
     const Freeze freeze(this);
+    read(&frmCDList::readWhatShows);
     setTabStops();
     showPage();
     focusList();
@@ -257,7 +283,7 @@ void frmCDList::showCount()
 {
     const ListPage *page = current();
     const QString text = page ? GetMessage(page->countKey) + QString::number(page->count)
-                              : GetMessage("DiffTracks") + QString::number(mTrackCount);
+                              : GetMessage("DiffTracks") + QString::number(mTrackCount.value_or(0));
     mUi->TheStatusBar->showMessage(text);
 }
 

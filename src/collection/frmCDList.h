@@ -7,6 +7,7 @@
 
 #include <array>
 #include <memory>
+#include <optional>
 #include <vector>
 
 class DBListViewCTL;
@@ -55,13 +56,17 @@ private:
         const char *emptyKey;
         FirstSteps::Step firstStep;
         qsizetype count = 0;
-        int index = 1; // of the remembered row, from 1
+        bool stale = true; // to be read when it is looked at
+        int index = 1;     // of the remembered row, from 1
     };
 
     void connectControls();
     void connectList(ListPage &page);
     void setCaptions();
     void LoadLists();
+    void read(void (frmCDList::*what)());
+    void readPages();
+    void readWhatShows();
     void loadPage(ListPage &page);
     static void showSteps(const ListPage &page);
     void CDTab_Click();
@@ -86,7 +91,7 @@ private:
 
     std::unique_ptr<Ui::frmCDList> mUi;
     std::array<ListPage, 3> mPages;
-    qint64 mTrackCount = 0;
-    bool mColFocusDone = false; // the remembered row of ColList was restored on this focus
+    std::optional<qint64> mTrackCount; // counted when its page shows
+    bool mColFocusDone = false;        // the remembered row of ColList was restored on this focus
     bool mLoading = true;
 };

@@ -218,6 +218,40 @@ private slots:
         QVERIFY(openEditors().isEmpty());
     }
 
+    void aLargePageIsReadWhenItIsLookedAt()
+    {
+        fill();
+        mCatalogue->exec(u"with recursive n(i) as (select 11 union all select i+1 from n where "
+                         "i<10100) insert into CDTitels select i,'T'||i,2,'E',null,null from n"_s);
+        show();
+        const int before = list("SngList")->ListItems().Count();
+        mCatalogue->exec(u"delete from CDTitels where ID in (1, 5)"_s);
+        mScreen->RefreshLists();
+        QCOMPARE(column(list("ColList"), 1), texts("Best, the"));
+        QCOMPARE(list("SngList")->ListItems().Count(), before);
+        page(1);
+        QCOMPARE(list("SngList")->ListItems().Count(), before - 1);
+        QCOMPARE(status(),
+                 u"Number of albums in your collection: "_s + QString::number(before - 1));
+        mCatalogue->exec(u"delete from CDTitels where ID = 3"_s);
+        mScreen->RefreshLists();
+        QCOMPARE(list("SngList")->ListItems().Count(), before - 2);
+    }
+
+    void tracksAreCountedWhenTheirPageShows()
+    {
+        mCatalogue->exec(u"alter table Tracks rename to Elsewhere"_s);
+        show();
+        mScreen->RefreshLists();
+        mDesktop->expectBox(u"error [Unable to initialise list!]"_s);
+        mDesktop->expectBox(u"no such table"_s);
+        page(2);
+        mCatalogue->exec(u"alter table Elsewhere rename to Tracks;"
+                         "insert into Tracks values (1,1,'One',null,null)"_s);
+        mScreen->RefreshLists();
+        QCOMPARE(status(), u"Number of different tracks in your collection: 1"_s);
+    }
+
     void aFailureOfTheLoadIsTold()
     {
         mCatalogue->exec(u"drop table MP3Collections"_s);

@@ -13,12 +13,38 @@ bool asciiEqual(char a, char16_t b)
     return small(char16_t(a)) == small(b);
 }
 
+bool sameCell(const ADODB::Rows &a, const ADODB::Rows &b, qsizetype row, int column)
+{
+    using Kind = ADODB::Rows::Kind;
+    const Kind kind = a.kind(row, column);
+    if (kind != b.kind(row, column))
+        return false;
+    if (kind == Kind::Text)
+        return a.utf8(row, column) == b.utf8(row, column);
+    return kind == Kind::Integer ? a.integer(row, column) == b.integer(row, column)
+                                 : a.text(row, column) == b.text(row, column);
+}
+
+bool sameRows(const ADODB::Rows &a, const ADODB::Rows &b)
+{
+    if (a.columnCount() != b.columnCount() || a.rowCount() != b.rowCount())
+        return false;
+    for (qsizetype row = 0; row < a.rowCount(); ++row) {
+        for (int column = 0; column < a.columnCount(); ++column) {
+            if (!sameCell(a, b, row, column))
+                return false;
+        }
+    }
+    return true;
+}
+
 } // namespace
 
 void ListModel::fill(std::shared_ptr<const ADODB::Rows> rows)
 {
     beginResetModel();
     ++mFilling;
+    keepOrderFor(rows.get());
     mRows = std::move(rows);
     mCaptions.clear();
     mAlignments.clear();
@@ -88,9 +114,27 @@ void ListModel::sortBy(int column)
 {
     if (hasOrderOf(column))
         return;
-    setOrder(column < 0 ? std::vector<std::uint32_t>()
-                        : sortedRows(*mRows, column, mWritten.value(column)));
+    setOrder(orderBy(column));
     mSortedBy = column;
+}
+
+std::vector<std::uint32_t> ListModel::orderBy(int column)
+{
+    if (column < 0)
+        return {};
+    const WrittenTexts written = mWritten.value(column);
+    if (column == mLastSortedBy && written.isEmpty())
+        return mLastOrder;
+    return sortedRows(*mRows, column, written);
+}
+
+// Rows that are the same again need not be sorted again.
+void ListModel::keepOrderFor(const ADODB::Rows *rows)
+{
+    const bool byOwnTexts = mSortedBy >= 0 && !mWritten.contains(mSortedBy);
+    const bool same = byOwnTexts && rows && mRows && sameRows(*rows, *mRows);
+    mLastSortedBy = same ? mSortedBy : -1;
+    mLastOrder = same ? std::move(mOrder) : std::vector<std::uint32_t>();
 }
 
 void ListModel::setOrder(std::vector<std::uint32_t> order)

@@ -72,7 +72,9 @@ private:
     QVariant alignment(int column) const;
     QString rowText(int record) const;
     bool startsWith(int record, int column, const QString &start) const;
+    std::vector<std::uint32_t> orderBy(int column);
     void setOrder(std::vector<std::uint32_t> order);
+    void keepOrderFor(const ADODB::Rows *rows);
     void rowChanged(int record);
 
     std::shared_ptr<const ADODB::Rows> mRows;
@@ -81,6 +83,8 @@ private:
     QHash<int, Qt::Alignment> mAlignments;     // by column, where it is not the left
     std::vector<std::uint32_t> mOrder, mRowOf; // empty in the recordset's order
     int mSortedBy = -1;                        // -2: by a column written to since
+    std::vector<std::uint32_t> mLastOrder;     // of the same rows by mLastSortedBy, before fill()
+    int mLastSortedBy = -1;
     int mCheckColumn = -1;
     int mFirstShown = 0;
     QSet<int> mHidden;

@@ -4,6 +4,7 @@
 
 #include <algorithm>
 #include <charconv>
+#include <numeric>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -115,6 +116,18 @@ std::vector<Row> byText(const ColumnTexts &texts)
     return result;
 }
 
+// A statement may have brought the rows in this order.
+bool areSorted(const ColumnTexts &texts)
+{
+    const auto &collation = text::Collation::root();
+    for (Row row = 1; row < texts.count(); ++row) {
+        const auto before = texts.text(row - 1), text = texts.text(row);
+        if (!before.empty() && (text.empty() || collation.compare(before, text) > 0))
+            return false;
+    }
+    return true;
+}
+
 } // namespace
 
 std::vector<std::uint32_t> sortedRows(const ADODB::Rows &rows, int column,
@@ -124,5 +137,9 @@ std::vector<std::uint32_t> sortedRows(const ADODB::Rows &rows, int column,
     if (auto order = byNumber(texts))
         return *std::move(order);
     texts.spellNumbers();
-    return byText(texts);
+    if (!areSorted(texts))
+        return byText(texts);
+    std::vector<Row> asTheyAre(texts.count());
+    std::iota(asTheyAre.begin(), asTheyAre.end(), 0);
+    return asTheyAre;
 }

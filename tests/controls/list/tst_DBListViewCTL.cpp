@@ -203,6 +203,27 @@ private slots:
         QVERIFY(list.Sorted() && list.SortKey() == 1);
     }
 
+    // The order of the rows is kept if they come again; what was written over them is not.
+    void sortsRowsThatComeAgain()
+    {
+        ShownList list;
+        list.sortBy(1);
+        for (const QString &written : {QString(), u"Zappa"_s, QString()}) {
+            if (!written.isEmpty())
+                list.ListItems().Item(1).setSubItems(1, written);
+            list.Populate();
+            QVERIFY(!list.Sorted());
+            list.sortBy(1);
+            QCOMPARE(shown(list), u"9 4 30 5 11*<"_s);
+        }
+        list.setRecordset(recordset({u"Id"_s, u"Artiest"_s, u"Titel"_s},
+                                    {u"11|Abba|Jazz"_s, u"9|Zappa|Arrival"_s, u"30|Eno|Milord"_s,
+                                     u"4|Devo|Waterloo"_s, u"5|B-52's|War"_s}));
+        list.Populate();
+        list.sortBy(1);
+        QCOMPARE(shown(list), u"11*< 5 4 30 9"_s);
+    }
+
     void writesFollowTheRecord()
     {
         ShownList list;
