@@ -120,8 +120,7 @@ void CdEditor::command(const std::function<void()> &routine)
     try {
         routine();
     } catch (const Error &error) {
-        if (gConnection)
-            gConnection->RollbackTrans();
+        gConnection->RollbackTrans();
         releaseFrame();
         errorBox(error.numbered(), GetMessage("MsgSysErr"));
     }
@@ -147,8 +146,6 @@ void CdEditor::Form_Load()
 
 void CdEditor::load()
 {
-    if (!gConnection)
-        throw makeError(errObjectClosed);
     if (Mode == modeNew)
         loadNew();
     else if (Mode != modeExisting)

@@ -42,8 +42,7 @@ void CdEditor::save(bool reload)
         setPointer(vbDefault);
         releaseFrame();
         errorBox(error.numbered(), GetMessage("MsgSysErr"));
-        if (gConnection)
-            gConnection->RollbackTrans();
+        gConnection->RollbackTrans();
     }
 }
 
@@ -67,8 +66,6 @@ void CdEditor::write(const Header &header, bool reload)
     const bool isNew = Mode == modeNew;
     if (!isNew && Mode != modeExisting)
         throw Error(0, Name(), QString());
-    if (!gConnection)
-        throw makeError(errObjectClosed);
     const bool anew = isNew || !mRecord.isStored();
     const qint64 earlyId = anew && mKind.idBeforeTransaction ? nextId(nextTitleId, idField) : 0;
     ADODB::Transaction transaction(*gConnection);

@@ -161,11 +161,13 @@ private slots:
         const DataRows<QString, QString, QString> row("call", "places", "example");
         row("events", "\\bprocessEvents\\b", "platform/desktop/|platform/work/",
             "QApplication::processEvents();");
-        // How long ago a letter was typed belongs to the list alone.
+        // How long ago a letter was typed belongs to the list alone, how long to wait for a lock
+        // to the lock.
         row("clock",
             "\\b(QElapsedTimer|QDeadlineTimer|std::chrono|current(Date|Time|DateTime)(Utc)?|"
             "current(M?)SecsSinceEpoch)\\b",
-            "platform/|controls/list/DBListViewCTL", "QDateTime::currentDateTime()");
+            "platform/|controls/list/DBListViewCTL|services/filelock",
+            "QDateTime::currentDateTime()");
         row("chained arg", "\\.arg\\((?:[^()]|\\([^()]*\\))*\\)\\s*\\.arg\\(", "nowhere",
             "text.arg(f(x))\n    .arg(y)");
     }

@@ -119,7 +119,8 @@ const State states[] = {
      [] {
          chooseOutput();
          const auto *bar = find<QStatusBar>("frmSearchArtistsTitles", "StatusBar");
-         return bar && bar->currentMessage().contains(u'%');
+         const QString message = bar ? bar->currentMessage() : QString();
+         return message.contains(u'%') || message.contains(outputFile()); // done already
      }},
     {"pdf",
      [] {

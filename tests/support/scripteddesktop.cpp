@@ -34,12 +34,17 @@ const char *kindOf(BoxKind kind, BoxButtons buttons)
 } // namespace
 
 ScriptedDesktop::ScriptedDesktop()
-    : folder(mTemporary.path()), settings(mTemporary.filePath(u"config/settings.json"_s))
+    : mBefore(setCurrent(this)),
+      folder(mTemporary.path()),
+      settings(mTemporary.filePath(u"config/settings.json"_s))
 {
-    setCurrent(this);
 }
 
-ScriptedDesktop::~ScriptedDesktop() = default;
+ScriptedDesktop::~ScriptedDesktop()
+{
+    if (Desktop *now = setCurrent(mBefore); now != this)
+        setCurrent(now);
+}
 
 void ScriptedDesktop::expectBox(const QString &part, BoxAnswer answer)
 {

@@ -16,6 +16,7 @@
 class ScriptedDesktop : public Desktop
 {
     QTemporaryDir mTemporary; // first: folder and settings lie in it
+    Desktop *mBefore;
 
 public:
     ScriptedDesktop();

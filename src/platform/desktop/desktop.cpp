@@ -1,5 +1,7 @@
 #include "platform/desktop/desktop.h"
 
+#include <utility>
+
 using namespace Qt::StringLiterals;
 
 namespace
@@ -21,9 +23,9 @@ Desktop &Desktop::current()
     return *gDesktop;
 }
 
-void Desktop::setCurrent(Desktop *desktop)
+Desktop *Desktop::setCurrent(Desktop *desktop)
 {
-    gDesktop = desktop;
+    return std::exchange(gDesktop, desktop);
 }
 
 void setBoxTitle(const QString &title)

@@ -60,7 +60,7 @@ public:
     virtual QString programFolder() = 0; // App.Path
 
     static Desktop &current();
-    static void setCurrent(Desktop *desktop); // not owned; to be set before the first use
+    static Desktop *setCurrent(Desktop *desktop); // not owned; gives the one before
 };
 
 /// The title of boxes that have none of their own: the program's name in the language of the run.
