@@ -1,17 +1,25 @@
 #include "catalogue/ids.h"
 
+#include "platform/ado/command.h"
 #include "platform/ado/recordset.h"
 #include "services/globals.h"
 
-qint64 nextId(const QString &statement, QLatin1String field)
+namespace
 {
-    return nextId(statement, field, *gConnection);
+
+// One row always; the number of an empty table's NULL is 0.
+constexpr const char *highestId[] = {"select max(ID) from Artiesten", "select max(ID) from Tracks",
+                                     "select max(ID) from CDTitels",
+                                     "select max(ID) from CompactDiscs"};
+
+} // namespace
+
+qint64 nextId(Table table)
+{
+    return nextId(table, *gConnection);
 }
 
-qint64 nextId(const QString &statement, QLatin1String field, ADODB::Connection &connection)
+qint64 nextId(Table table, ADODB::Connection &connection)
 {
-    ADODB::Recordset answer;
-    answer.Open(statement, connection);
-    const ADODB::Value id = answer.Fields(QString(field)).Value();
-    return id.isNull() ? 1 : id.toLong();
+    return ADODB::Command(connection, highestId[int(table)]).find({}).id + 1;
 }

@@ -15,14 +15,6 @@
 
 using namespace Qt::StringLiterals;
 
-namespace
-{
-
-const auto nextTitleId = u"Select max(id) + 1 as N from CDTitels"_s;
-const auto idField = "N"_L1;
-
-} // namespace
-
 // By design: an error of the database does not set mSaveFailed. It has been told, and who called
 // goes on as after a success.
 void CdEditor::save(bool reload)
@@ -67,7 +59,7 @@ void CdEditor::write(const Header &header, bool reload)
     if (!isNew && Mode != modeExisting)
         throw Error(0, Name(), QString());
     const bool anew = isNew || !mRecord.isStored();
-    const qint64 earlyId = anew && mKind.idBeforeTransaction ? nextId(nextTitleId, idField) : 0;
+    const qint64 earlyId = anew && mKind.idBeforeTransaction ? nextId(Table::CDTitels) : 0;
     ADODB::Transaction transaction(*gConnection);
     const bool another = !anew && !mRecord.isThere(CdId);
     mSaveFailed = another;
@@ -99,7 +91,7 @@ void CdEditor::writeTitle(bool anew, qint64 newId, const Header &header)
         afterTitle(header, mSaved);
         return;
     }
-    CdId = newId ? newId : nextId(nextTitleId, idField);
+    CdId = newId ? newId : nextId(Table::CDTitels);
     gConnection->Execute(insertTitle(CdId, header));
     mControls.disk->setCdId(CdId);
     if (mRecord.state() == HeldRecord::State::Lost)

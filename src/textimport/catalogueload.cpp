@@ -1,168 +1,84 @@
 #include "textimport/catalogueload.h"
 
-#include "catalogue/ids.h"
 #include "catalogue/quoting.h"
 #include "platform/ado/recordset.h"
+#include "platform/text/normalform.h"
 #include "services/globals.h"
 #include "services/messages.h"
 #include "textimport/importrecords.h"
 
+#include <charconv>
+
 using namespace Qt::StringLiterals;
 
-/// One track as the statements take it: texts with their quotes doubled, genre and year as finished
-/// values, numbers as digits.
+/// One track as its row has it; the texts are those of the row.
 struct CatalogueLoad::Track {
     Track(const ADODB::Rows &rows, qsizetype row);
 
-    QString artist, title, mainTitle;
-    QString genre, year;
-    QString listIndex, mainTitleIndex, disk, track;
+    std::string_view artist, title, genre, year, mainTitle;
+    qint64 listIndex, mainTitleIndex, disk, track;
 };
 
 namespace
 {
-
-using Literal = QLatin1String;
-
-QString selectArtist(const QString &artist)
-{
-    return Literal("Select ID, Naam From Artiesten where Naam = '") + artist + Literal("'");
-}
-
-QString insertArtist(const QString &id, const QString &artist)
-{
-    return Literal("Insert into Artiesten(ID,Naam) values (") + id + Literal(",'") + artist +
-           Literal("')");
-}
-
-QString selectTrack(const QString &title, const QString &artistId)
-{
-    return Literal("select tr.ID as trackid,  "
-                   "       ar.id as artistid, "
-                   "       tr.Titel as titel  "
-                   " from Tracks tr, "
-                   "      Artiesten ar "
-                   " where ar.id = tr.artiest_id "
-                   " and tr.Titel = '") +
-           title + Literal("' and tr.artiest_id = ") + artistId;
-}
-
-QString insertTrack(const QString &id, const QString &artistId, const QString &title,
-                    const QString &genre, const QString &year)
-{
-    return Literal("Insert into Tracks(ID,Artiest_ID,Titel,Genre,Hitjaar) values (") + id +
-           Literal(",") + artistId + Literal(",'") + title + Literal("',") + genre + Literal(",") +
-           year + Literal(")");
-}
-
-QString selectCompilation(const QString &title)
-{
-    return Literal("select '1' from CDTitels where Titel = '") + title + Literal("'");
-}
-
-QString selectAlbum(const QString &title, const QString &artistId)
-{
-    return Literal("select '1' from CDTitels where Titel = '") + title +
-           Literal("' and Artiest_ID = ") + artistId;
-}
-
-QString insertCompilation(const QString &id, const QString &title)
-{
-    return Literal("Insert into CDTitels(ID,Titel,CD_Type) values (") + id + Literal(",'") + title +
-           Literal("','V')");
-}
-
-QString insertAlbum(const QString &id, const QString &title, const QString &artistId)
-{
-    return Literal("Insert into CDTitels(ID,Titel,Artiest_ID,CD_Type) values (") + id +
-           Literal(",'") + title + Literal("',") + artistId + Literal(",'E')");
-}
-
-QString insertLink(const QString &id, const QString &cd, const QString &disk, const QString &track,
-                   const QString &trackId)
-{
-    return Literal("Insert into Compactdiscs(id,cdtitels_id,diskno,trackno,track_id) values (") +
-           id + Literal(",") + cd + Literal(",") + disk + Literal(",") + track + Literal(",") +
-           trackId + Literal(")");
-}
-
-const auto nextArtistId = u"Select max(ID)+1 as ID from Artiesten"_s;
-const auto nextTrackId = u"select max(id+1) as ID from tracks"_s;
 
 bool compilations()
 {
     return gImportCompilationNested || gImportCompilationFlat;
 }
 
-// By design: an apostrophe in a genre is not doubled; it breaks the statement and so refuses the
-// import.
-QString genreValue(const QString &genre)
+std::string_view textOf(const ADODB::Rows &rows, qsizetype row, importfield::Column column)
 {
-    return genre.isEmpty() ? u"NULL"_s : QString(u'\'' + genre + u'\'');
+    const bool isText = rows.kind(row, column) == ADODB::Rows::Kind::Text;
+    return isText ? rows.utf8(row, column) : std::string_view();
 }
 
-bool isThere(const QString &statement)
+// The readers write most numbers as texts.
+qint64 numberOf(const ADODB::Rows &rows, qsizetype row, importfield::Column column)
 {
-    ADODB::Recordset answer;
-    answer.Open(statement, *gConnection);
-    return answer.RecordCount() >= 1;
-}
-
-// The id, in digits, that the only row of the answer has in this field; empty for any other number
-// of rows.
-QString onlyId(const QString &statement, QStringView field)
-{
-    ADODB::Recordset answer;
-    answer.Open(statement, *gConnection);
-    return answer.RecordCount() == 1 ? answer.Fields(field).Value().toText() : QString();
-}
-
-QString findOrMakeArtist(const QString &artist)
-{
-    QString id = onlyId(selectArtist(artist), u"ID");
-    if (id.isEmpty()) {
-        id = QString::number(nextId(nextArtistId, "ID"_L1));
-        gConnection->Execute(insertArtist(id, artist));
-    }
-    return id;
-}
-
-// A track that is there already keeps its genre and year, whatever the file says.
-QString findOrMakeTrack(const QString &title, const QString &artistId, const QString &genre,
-                        const QString &year)
-{
-    QString id = onlyId(selectTrack(title, artistId), u"trackid");
-    if (id.isEmpty()) {
-        id = QString::number(nextId(nextTrackId, "ID"_L1));
-        gConnection->Execute(insertTrack(id, artistId, title, genre, year));
-    }
-    return id;
+    if (rows.kind(row, column) == ADODB::Rows::Kind::Integer)
+        return rows.integer(row, column);
+    qint64 number = 0;
+    const auto digits = textOf(rows, row, column);
+    std::from_chars(digits.data(), digits.data() + digits.size(), number);
+    return number;
 }
 
 // By design: the names in the questions have their apostrophes doubled, as the statements do.
-QString compilationQuestion(const QString &mainTitle)
+QString compilationQuestion(std::string_view mainTitle)
 {
-    return GetMessage("QuestImpMainTitlePart1") + mainTitle + GetMessage("QuestImpMainTitlePart2");
+    return GetMessage("QuestImpMainTitlePart1") + doubled(text::fromUtf8(mainTitle)) +
+           GetMessage("QuestImpMainTitlePart2");
 }
 
-QString albumQuestion(const QString &artist, const QString &mainTitle)
+QString albumQuestion(std::string_view artist, std::string_view mainTitle)
 {
-    return GetMessage("QuestImpAlbPart1") + artist + GetMessage("QuestImpAlbPart2") + mainTitle +
+    return GetMessage("QuestImpAlbPart1") + doubled(text::fromUtf8(artist)) +
+           GetMessage("QuestImpAlbPart2") + doubled(text::fromUtf8(mainTitle)) +
            GetMessage("QuestImpAlbPart3");
+}
+
+bool isThere(std::initializer_list<ADODB::Parameter> values)
+{
+    ADODB::Command titles(*gConnection,
+                          values.size() == 1
+                              ? "select ID from CDTitels where Titel = ?"
+                              : "select ID from CDTitels where Titel = ? and Artiest_ID = ?");
+    return titles.find(values).rows >= 1;
 }
 
 } // namespace
 
 CatalogueLoad::Track::Track(const ADODB::Rows &rows, qsizetype row)
-    : artist(doubled(rows.text(row, importfield::Artist))),
-      title(doubled(rows.text(row, importfield::TrackTitle))),
-      mainTitle(doubled(rows.text(row, importfield::MainTitle))),
-      genre(genreValue(rows.text(row, importfield::Genre))),
-      year(numberOrNull(rows.text(row, importfield::Hitjaar))),
-      listIndex(rows.text(row, importfield::ListIndex)),
-      mainTitleIndex(rows.text(row, importfield::MainTitleIndex)),
-      disk(rows.text(row, importfield::DiskIndex)),
-      track(rows.text(row, importfield::TrackIndex))
+    : artist(textOf(rows, row, importfield::Artist)),
+      title(textOf(rows, row, importfield::TrackTitle)),
+      genre(textOf(rows, row, importfield::Genre)),
+      year(textOf(rows, row, importfield::Hitjaar)),
+      mainTitle(textOf(rows, row, importfield::MainTitle)),
+      listIndex(numberOf(rows, row, importfield::ListIndex)),
+      mainTitleIndex(numberOf(rows, row, importfield::MainTitleIndex)),
+      disk(numberOf(rows, row, importfield::DiskIndex)),
+      track(numberOf(rows, row, importfield::TrackIndex))
 {
 }
 
@@ -172,6 +88,8 @@ CatalogueLoad::Outcome CatalogueLoad::run()
     mImportedCount = 0;
     mLastCdIndex = 0;
     const auto rows = gImportRecords->rows();
+    mSongs.emplace(*gConnection);
+    takeIds(*rows);
     for (qsizetype row = 0; row < rows->rowCount(); ++row) {
         if (!step(row + 1, rows->rowCount()) || !load(Track(*rows, row))) {
             transaction.RollbackTrans();
@@ -182,42 +100,59 @@ CatalogueLoad::Outcome CatalogueLoad::run()
     return Outcome::Committed;
 }
 
+// The ids of titles and links are those that the readers counted. What has been saved since the
+// file was read may have taken some of them: then all move up behind it.
+void CatalogueLoad::takeIds(const ADODB::Rows &rows)
+{
+    if (rows.rowCount() == 0)
+        return;
+    const Track first(rows, 0);
+    mTitleShift = std::max<qint64>(0, nextId(Table::CDTitels) - first.mainTitleIndex);
+    mLinkShift = std::max<qint64>(0, nextId(Table::CompactDiscs) - first.listIndex);
+}
+
 // By design: artist and track come before the question about their CD and stay when it is answered
 // No; the next clean-up takes those that nothing else points at.
 bool CatalogueLoad::load(const Track &track)
 {
-    const QString artistId = findOrMakeArtist(track.artist);
-    const QString trackId = findOrMakeTrack(track.title, artistId, track.genre, track.year);
-    const bool newCd = track.mainTitleIndex.toLongLong() != mLastCdIndex;
-    if (newCd && !beginCd(track, artistId))
+    const qint64 artist = mSongs->findOrMakeArtist(track.artist);
+    const qint64 trackId = findOrMakeTrack(track, artist);
+    if (track.mainTitleIndex != mLastCdIndex && !beginCd(track, artist))
         return false;
     if (mCdAnswer == vbYes) {
-        gConnection->Execute(
-            insertLink(track.listIndex, track.mainTitleIndex, track.disk, track.track, trackId));
+        mSongs->makeLink(track.listIndex + mLinkShift,
+                         {track.mainTitleIndex + mTitleShift, track.disk, track.track, trackId});
         ++mImportedCount;
     }
     return true;
 }
 
-bool CatalogueLoad::beginCd(const Track &track, const QString &artistId)
+// A track that is there already keeps its genre and year, whatever the file says.
+// By design: an apostrophe in the genre of a new one is not doubled, and so refuses the import.
+qint64 CatalogueLoad::findOrMakeTrack(const Track &track, qint64 artist)
 {
-    mCdAnswer = answerFor(track, artistId);
+    if (const auto found = mSongs->findTrack(artist, track.title))
+        return *found;
+    const std::string genre = undoubled(*gConnection, track.genre);
+    return mSongs->makeTrack(artist, track.title, textOrNull(genre), wholeOrNull(track.year));
+}
+
+bool CatalogueLoad::beginCd(const Track &track, qint64 artist)
+{
+    mCdAnswer = answerFor(track, artist);
     if (mCdAnswer == vbCancel)
         return false;
     if (mCdAnswer == vbYes)
-        gConnection->Execute(compilations()
-                                 ? insertCompilation(track.mainTitleIndex, track.mainTitle)
-                                 : insertAlbum(track.mainTitleIndex, track.mainTitle, artistId));
-    mLastCdIndex = track.mainTitleIndex.toLongLong();
+        mSongs->makeTitle({track.mainTitleIndex + mTitleShift, track.mainTitle,
+                           compilations() ? std::nullopt : std::optional(artist)});
+    mLastCdIndex = track.mainTitleIndex;
     return true;
 }
 
-BoxAnswer CatalogueLoad::answerFor(const Track &track, const QString &artistId) const
+BoxAnswer CatalogueLoad::answerFor(const Track &track, qint64 artist)
 {
-    const bool isCompilation = compilations();
-    if (!isThere(isCompilation ? selectCompilation(track.mainTitle)
-                               : selectAlbum(track.mainTitle, artistId)))
-        return vbYes;
-    return ask(isCompilation ? compilationQuestion(track.mainTitle)
-                             : albumQuestion(track.artist, track.mainTitle));
+    if (compilations())
+        return isThere({track.mainTitle}) ? ask(compilationQuestion(track.mainTitle)) : vbYes;
+    return isThere({track.mainTitle, artist}) ? ask(albumQuestion(track.artist, track.mainTitle))
+                                              : vbYes;
 }

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "catalogue/songs.h"
 #include "platform/ado/rows.h"
 #include "platform/desktop/desktop.h"
 
@@ -30,10 +31,14 @@ public:
 
 private:
     struct Track;
+    void takeIds(const ADODB::Rows &rows);
     bool load(const Track &track); // false: cancelled
-    bool beginCd(const Track &track, const QString &artistId);
-    BoxAnswer answerFor(const Track &track, const QString &artistId) const;
+    bool beginCd(const Track &track, qint64 artist);
+    BoxAnswer answerFor(const Track &track, qint64 artist);
+    qint64 findOrMakeTrack(const Track &track, qint64 artist);
 
+    std::optional<Songs> mSongs; // of the transaction
+    qint64 mTitleShift = 0, mLinkShift = 0;
     qsizetype mImportedCount = 0;
     qint64 mLastCdIndex = 0;
     BoxAnswer mCdAnswer = vbYes; // holds for the CD in work

@@ -11,9 +11,6 @@ using namespace Qt::StringLiterals;
 namespace
 {
 
-const auto nextCompactDiscId = u"select max(id+1) as ID from CompactDiscs"_s;
-const auto nextCdTitelId = u"select max(id+1) as ID from CDtitels"_s;
-
 // By design: where a reader does not take the word behind the percentage from the table, it is
 // Dutch in both languages.
 bool wordIsFromTable(FilePart part)
@@ -26,8 +23,8 @@ bool wordIsFromTable(FilePart part)
 void FileReading::run()
 {
     gImportRecords = newImportRecords();
-    const qint64 discRow = nextId(nextCompactDiscId, "ID"_L1);
-    const qint64 cd = nextId(nextCdTitelId, "ID"_L1);
+    const qint64 discRow = nextId(Table::CompactDiscs);
+    const qint64 cd = nextId(Table::CDTitels);
     if (!FileExists(gImportFile))
         return;
     InputTextFile file;

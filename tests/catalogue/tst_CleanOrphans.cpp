@@ -90,8 +90,7 @@ private slots:
 
     void firstAndNextIds()
     {
-        const QString statement = u"SELECT max(ID)+1 as ID FROM Tracks"_s;
-        const auto next = [&] { return nextId(statement, "ID"_L1); };
+        const auto next = [] { return nextId(Table::Tracks); };
         QCOMPARE(next(), 3);
         mCatalogue->exec("delete from tracks where id=2");
         QCOMPARE(next(), 2);

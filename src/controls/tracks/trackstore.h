@@ -1,14 +1,10 @@
 #pragma once
 
+#include "catalogue/songs.h"
 #include "controls/tracks/trackrow.h"
 
 #include <QHash>
 #include <QSet>
-
-namespace ADODB
-{
-class Connection;
-}
 
 /// The tracks of one disc in the catalogue: how they are read, written and removed. A Tracks row is
 /// shared by all discs that hold the song, so a track that is changed is looked for anew, and the
@@ -50,6 +46,8 @@ private:
     };
     using Links = QHash<qint64, Link>; // by their ids
 
+    ADODB::Recordset run(std::string_view statement,
+                         std::initializer_list<ADODB::Parameter> values) const;
     Links readLinks() const;
     bool readTitle();
     void deleteLinks(const QList<TrackToSave> &tracks, const QList<qint64> &was,
@@ -58,7 +56,7 @@ private:
     qint64 artistOf(const TrackTexts &texts, bool &otherSpelling);
     qint64 trackOf(qint64 artistId, const TrackToSave &track, bool &keptValues);
     qint64 addTrack(qint64 artistId, const TrackTexts &texts);
-    qint64 addLink(qint64 trackNo, qint64 trackId);
+    TrackTexts readTrack(qint64 id) const;
     bool heldElsewhere(qint64 trackId) const;
 
     ADODB::Connection &mConnection;
@@ -66,5 +64,6 @@ private:
     const int mDiscNo;
     const Artists mArtists;
     qint64 mTitleArtist = 0;
-    QSet<qint64> mSettled; // rows of Tracks about which a track of this save has had its say
+    std::optional<Songs> mSongs; // of a save
+    QSet<qint64> mSettled;       // rows of Tracks about which a track of this save has had its say
 };
