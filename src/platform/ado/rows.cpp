@@ -15,6 +15,8 @@ namespace
 // A cell: its kind in the low two bits; above them a whole number, or the place of the bytes in the
 // heap (chunk above, offset below). What does not fit 62 bits goes to the heap as eight bytes.
 constexpr int kindBits = 2;
+constexpr std::uint64_t kindMask = (1 << kindBits) - 1;
+constexpr std::uint64_t inHeap = std::uint64_t(1) << 63; // of a whole number
 constexpr int offsetBits = 28;
 constexpr std::size_t chunkSize = std::size_t(1) << 20;
 constexpr std::size_t firstChunkSize = 256;
@@ -30,14 +32,14 @@ Rows::Rows(std::shared_ptr<const FieldList> fields)
 Rows::Kind Rows::kind(qsizetype row, int column) const
 {
     const Cell c = cell(row, column);
-    const auto kind = Kind(c & 3);
-    return kind == Kind::Real && (c >> 63) ? Kind::Integer : kind;
+    const auto kind = Kind(c & kindMask);
+    return kind == Kind::Real && (c & inHeap) ? Kind::Integer : kind;
 }
 
 qint64 Rows::integer(qsizetype row, int column) const
 {
     const Cell c = cell(row, column);
-    if (Kind(c & 3) == Kind::Integer)
+    if (Kind(c & kindMask) == Kind::Integer)
         return qint64(c) >> kindBits;
     qint64 v;
     std::memcpy(&v, stored(c), sizeof v);
@@ -46,7 +48,12 @@ qint64 Rows::integer(qsizetype row, int column) const
 
 std::string_view Rows::utf8(qsizetype row, int column) const
 {
-    const char *p = stored(cell(row, column));
+    return storedText(cell(row, column));
+}
+
+std::string_view Rows::storedText(Cell c) const
+{
+    const char *p = stored(c);
     std::uint32_t size;
     std::memcpy(&size, p, sizeof size);
     return {p + sizeof size, size};
@@ -85,6 +92,8 @@ qsizetype Rows::addRow()
 void Rows::removeRow(qsizetype row)
 {
     const auto from = mCells.begin() + row * mColumns;
+    for (int column = 0; column < mColumns; ++column)
+        mDead += bytesOf(from[column]);
     mCells.erase(from, from + mColumns);
 }
 
@@ -108,25 +117,34 @@ std::shared_ptr<Rows> Rows::clone() const
 
 void Rows::setNull(qsizetype row, int column)
 {
-    cell(row, column) = Cell(Kind::Null);
+    put(cell(row, column), Cell(Kind::Null));
 }
 
 void Rows::setInteger(qsizetype row, int column, qint64 v)
 {
-    if (v >= smallest && v <= largest)
-        cell(row, column) = Cell(v) << kindBits | Cell(Kind::Integer);
-    else
-        cell(row, column) = store(&v, sizeof v, Kind::Real) | Cell(1) << 63;
+    const bool fits = v >= smallest && v <= largest;
+    put(cell(row, column), fits ? Cell(v) << kindBits | Cell(Kind::Integer)
+                                : store(&v, sizeof v, Kind::Real) | inHeap);
 }
 
 void Rows::setReal(qsizetype row, int column, double v)
 {
-    cell(row, column) = store(&v, sizeof v, Kind::Real);
+    put(cell(row, column), store(&v, sizeof v, Kind::Real));
 }
 
 void Rows::setUtf8(qsizetype row, int column, std::string_view v)
 {
-    cell(row, column) = store(v.data(), v.size(), Kind::Text);
+    put(cell(row, column), store(v.data(), v.size(), Kind::Text));
+}
+
+// Rows come in an order: what one says, the next one often says again.
+void Rows::setUtf8OrShare(qsizetype row, int column, std::string_view v)
+{
+    const Cell above = row > 0 ? cell(row - 1, column) : Cell(Kind::Null);
+    if (isText(above) && storedText(above) == v)
+        cell(row, column) = above;
+    else
+        setUtf8(row, column, v);
 }
 
 void Rows::setValue(qsizetype row, int column, const Value &v)
@@ -136,18 +154,70 @@ void Rows::setValue(qsizetype row, int column, const Value &v)
     } else if (const auto *fraction = std::get_if<double>(&v.variant())) {
         setReal(row, column, *fraction);
     } else if (const auto *words = std::get_if<QString>(&v.variant())) {
-        cell(row, column) = storeText(*words);
+        put(cell(row, column), storeText(*words, cell(row, column)));
     } else {
         setNull(row, column);
     }
 }
 
-// Room for so many bytes behind the last ones stored; all that is used of it is to be added to
-// mChunkUsed.
+std::size_t Rows::bytesOf(Cell c) const
+{
+    switch (Kind(c & kindMask)) {
+    case Kind::Text:
+        return sizeof(std::uint32_t) + storedText(c).size();
+    case Kind::Real:
+        return sizeof(double);
+    default:
+        return 0;
+    }
+}
+
+// Making the heap anew takes time for each cell: it waits until that is worth it.
+void Rows::put(Cell &place, Cell c)
+{
+    if (place == c)
+        return;
+    mDead += bytesOf(place);
+    place = c;
+    if (mDead > firstChunkSize && mDead > mStored / 2 && mDead > mCells.size() * sizeof(Cell) / 2)
+        compact();
+}
+
+// The bytes of a cell of other rows, as a cell of these.
+Rows::Cell Rows::copyOf(const char *from, std::size_t bytes, Cell c)
+{
+    std::memcpy(room(bytes), from, bytes);
+    return used(bytes, Kind(c & kindMask)) | (c & inHeap);
+}
+
+// Cells that share a text with the one above share the new one.
+void Rows::compact()
+{
+    Rows fresh(mFields);
+    fresh.mCells.resize(mCells.size());
+    for (std::size_t i = 0; i < mCells.size(); ++i) {
+        const Cell c = mCells[i];
+        const std::size_t bytes = bytesOf(c);
+        const bool shares =
+            bytes > 0 && i >= std::size_t(mColumns) && mCells[i - std::size_t(mColumns)] == c;
+        if (bytes == 0)
+            fresh.mCells[i] = c;
+        else if (shares)
+            fresh.mCells[i] = fresh.mCells[i - std::size_t(mColumns)];
+        else
+            fresh.mCells[i] = fresh.copyOf(stored(c), bytes, c);
+    }
+    *this = std::move(fresh);
+}
+
+// Room for so many bytes behind the last ones stored; all that is used of it is to be told to
+// used().
 char *Rows::room(std::size_t need)
 {
     if (!mOwnsChunk || mChunkUsed + need > mChunkSize) {
-        mChunkSize = std::max(need, mChunks.empty() ? firstChunkSize : chunkSize);
+        mStored += mChunkSize - mChunkUsed; // the rest is lost
+        mDead += mChunkSize - mChunkUsed;
+        mChunkSize = std::max(need, std::clamp(mStored, firstChunkSize, chunkSize));
         mChunks.emplace_back(new char[mChunkSize]);
         mChunkUsed = 0;
         mOwnsChunk = true;
@@ -168,14 +238,17 @@ Rows::Cell Rows::store(const void *bytes, std::size_t size, Kind kind)
     return used(head + size, kind);
 }
 
-// Written where it stays: building a table of a hundred thousand rows allocates nothing per cell.
-Rows::Cell Rows::storeText(QStringView text)
+// Written where it stays: building a table of a hundred thousand rows allocates nothing per cell. A
+// text that the cell has already does not stay.
+Rows::Cell Rows::storeText(QStringView text, Cell before)
 {
     constexpr std::size_t head = sizeof(std::uint32_t), mostPerUnit = 3;
     char *to = room(head + mostPerUnit * std::size_t(text.size()));
     QStringEncoder encoder(QStringEncoder::Utf8, QStringEncoder::Flag::Stateless);
     const char *end = encoder.appendToBuffer(to + head, text);
     const auto length = std::uint32_t(end - to - head);
+    if (isText(before) && storedText(before) == std::string_view(to + head, length))
+        return before;
     std::memcpy(to, &length, head);
     return used(head + length, Kind::Text);
 }
@@ -184,12 +257,13 @@ Rows::Cell Rows::used(std::size_t bytes, Kind kind)
 {
     const Cell place = Cell(mChunks.size() - 1) << offsetBits | mChunkUsed;
     mChunkUsed += bytes;
+    mStored += bytes;
     return place << kindBits | Cell(kind);
 }
 
 const char *Rows::stored(Cell c) const
 {
-    const Cell place = (c & ~(Cell(1) << 63)) >> kindBits;
+    const Cell place = (c & ~inHeap) >> kindBits;
     return mChunks[place >> offsetBits].get() + (place & ((Cell(1) << offsetBits) - 1));
 }
 

@@ -21,9 +21,10 @@ struct FieldInfo {
 };
 using FieldList = std::vector<FieldInfo>;
 
-/// The rows behind a recordset or a list: eight bytes a cell, and each text once in a heap of
-/// UTF-8. A million rows take tens of megabytes and no object each. Rows are shared as
-/// shared_ptr<const Rows>; who wants to change shared ones clones them first.
+/// The rows behind a recordset or a list: eight bytes a cell, and the texts in a heap of UTF-8. A
+/// million rows take tens of megabytes and no object each. What is written over stays in the heap
+/// until half of it is dead; then the heap is made anew, and texts seen before are gone. Rows are
+/// shared as shared_ptr<const Rows>; who wants to change shared ones clones them first.
 class Rows
 {
 public:
@@ -56,6 +57,7 @@ public:
     void setInteger(qsizetype row, int column, qint64 v);
     void setReal(qsizetype row, int column, double v);
     void setUtf8(qsizetype row, int column, std::string_view v);
+    void setUtf8OrShare(qsizetype row, int column, std::string_view v); // with the row above
     void setValue(qsizetype row, int column, const Value &v);
 
     std::shared_ptr<Rows> clone() const;
@@ -67,8 +69,14 @@ private:
     char *room(std::size_t need);
     Cell used(std::size_t bytes, Kind kind);
     Cell store(const void *bytes, std::size_t size, Kind kind);
-    Cell storeText(QStringView text);
+    Cell storeText(QStringView text, Cell before);
+    Cell copyOf(const char *from, std::size_t bytes, Cell c);
+    static bool isText(Cell c) { return Kind(c & 3) == Kind::Text; }
     const char *stored(Cell c) const;
+    std::string_view storedText(Cell c) const;
+    std::size_t bytesOf(Cell c) const;
+    void put(Cell &place, Cell c);
+    void compact();
 
     std::shared_ptr<const FieldList> mFields;
     int mColumns;
@@ -78,6 +86,10 @@ private:
     std::vector<std::shared_ptr<char[]>> mChunks;
     std::size_t mChunkUsed = 0, mChunkSize = 0;
     bool mOwnsChunk = false;
+
+    // Bytes of the heap, and those of them that no cell has any more. Too many rather than too few:
+    // a text that cells share counts with each.
+    std::size_t mStored = 0, mDead = 0;
 };
 
 } // namespace ADODB

@@ -1,8 +1,9 @@
 // Label: unit
 #include "platform/ado/recordset.h"
+#include "support/datarows.h"
 #include "support/testcatalogue.h"
 
-#include <QTest>
+#include <malloc.h>
 
 using namespace ADODB;
 
@@ -131,6 +132,70 @@ private slots:
         rows->removeRow(0);
         QCOMPARE(rows->rowCount(), texts.size());
         QCOMPARE(rows->text(0, 0), u"a"_s);
+    }
+
+    // As a refresh of tags rewrites all cells again and again: the memory in use must not grow.
+    void rewritingTakesNoMemory_data()
+    {
+        const DataRows<bool, bool> row("sameValues", "shared");
+        row("the same values", true, false);
+        row("others each time", false, false);
+        row("others, in rows that a list still holds", false, true);
+    }
+
+    void rewritingTakesNoMemory()
+    {
+        QFETCH(bool, sameValues);
+        QFETCH(bool, shared);
+        constexpr int count = 3000, columns = 4, rounds = 40;
+        Recordset rs;
+        for (int column = 0; column < columns; ++column)
+            rs.appendField(QString::number(column), adVarWChar, 100);
+        rs.Open();
+        std::shared_ptr<const Rows> held;
+        const auto value = [&](int row, int round) {
+            return u"The title of number %1, in the round %2"_s.arg(
+                QString::number(row), QString::number(sameValues ? 0 : round));
+        };
+        for (int row = 0; row < count; ++row)
+            rs.AddNew();
+        std::size_t afterFirst = 0;
+        for (int round = 0; round < rounds; ++round) {
+            if (shared)
+                held = rs.rows();
+            rs.MoveFirst();
+            for (int row = 0; row < count; ++row, rs.MoveNext()) {
+                for (int column = 0; column < columns; ++column)
+                    rs.Fields(column).setValue(value(row + column, round));
+            }
+            if (round == 1)
+                afterFirst = mallinfo2().uordblks + mallinfo2().hblkhd;
+        }
+        const std::size_t grown = mallinfo2().uordblks + mallinfo2().hblkhd - afterFirst;
+        QVERIFY2(qint64(grown) < qint64(2) << 20, qPrintable(QString::number(grown)));
+        rs.MoveLast();
+        for (int column = 0; column < columns; ++column)
+            QCOMPARE(rs.Fields(column).Value().toText(), value(count - 1 + column, rounds - 1));
+    }
+
+    // Numbers of 64 bits, NULLs and texts that cells share come through a heap made anew.
+    void whatStaysIsKept()
+    {
+        const auto rows = oneColumn();
+        constexpr qint64 large = std::numeric_limits<qint64>::max();
+        for (int row = 0; row < 100; ++row)
+            rows->setUtf8OrShare(rows->addRow(), 0, "shared");
+        rows->setInteger(1, 0, large);
+        rows->setReal(2, 0, 1.5);
+        rows->setNull(3, 0);
+        for (int i = 0; i < 10000; ++i)
+            rows->setUtf8(0, 0, std::string(100, char('a' + i % 26)));
+        QCOMPARE(rows->text(0, 0), QString(100, QLatin1Char(char('a' + 9999 % 26))));
+        QCOMPARE(rows->value(1, 0), Value(large));
+        QCOMPARE(rows->value(2, 0), Value(1.5));
+        QCOMPARE(rows->kind(3, 0), Rows::Kind::Null);
+        for (int row = 4; row < 100; ++row)
+            QCOMPARE(rows->utf8(row, 0), "shared");
     }
 
     void clonesBothWrite()
