@@ -19,23 +19,13 @@ namespace ADODB
 namespace
 {
 
-int bind(sqlite3_stmt *s, const Dialect &dialect)
+// Asked for as a text, the engine would copy it to put a NUL behind it.
+std::string_view textOf(sqlite3_value *cell)
 {
-    int code = SQLITE_OK, place = 0;
-    for (const auto &l : dialect.literals()) {
-        ++place;
-        const auto text = dialect.text(l);
-        if (l.kind == Literal::Text)
-            code =
-                sqlite3_bind_text64(s, place, text.data(), text.size(), SQLITE_STATIC, SQLITE_UTF8);
-        else if (l.kind == Literal::Integer)
-            code = sqlite3_bind_int64(s, place, l.integer);
-        else
-            code = sqlite3_bind_double(s, place, l.real);
-        if (code != SQLITE_OK)
-            break;
-    }
-    return code;
+    const bool asItIs = sqlite3_value_encoding(cell) == SQLITE_UTF8;
+    const auto *bytes = static_cast<const char *>(
+        asItIs ? sqlite3_value_blob(cell) : static_cast<const void *>(sqlite3_value_text(cell)));
+    return {bytes ? bytes : "", std::size_t(sqlite3_value_bytes(cell))};
 }
 
 // A cell is asked for once, not for each thing about it: a connection without locks permits it.
@@ -53,10 +43,8 @@ void readRow(sqlite3_stmt *s, Rows &rows)
             break;
         case SQLITE_NULL:
             break;
-        default: {
-            const auto *bytes = reinterpret_cast<const char *>(sqlite3_value_text(cell));
-            rows.setUtf8(row, i, {bytes ? bytes : "", std::size_t(sqlite3_value_bytes(cell))});
-        }
+        default:
+            rows.setUtf8OrShare(row, i, textOf(cell));
         }
     }
 }
@@ -72,7 +60,6 @@ std::vector<std::uint32_t> firstOf(std::vector<std::uint32_t> order, int atMost)
 
 struct Connection::Engine {
     sqlite3 *db = nullptr;
-    Dialect dialect;
     PreparedStatements prepared;
 
     // The transaction: who has it, and whether its routine has ended without closing it.
@@ -223,15 +210,18 @@ void Connection::refuse(const Error &error)
 std::shared_ptr<const Rows> Connection::run(const QString &statement, int atMost)
 {
     requireOpen();
+    const auto prepared = prepare(sqlOf(statement));
+    const Running running(*prepared);
+    return fetch(*prepared, atMost);
+}
+
+std::string Connection::sqlOf(const QString &statement)
+{
     try {
-        mEngine->dialect.translate(statement);
+        return translated(statement);
     } catch (const Error &error) {
         refuse(error);
     }
-    const auto prepared = prepare(mEngine->dialect.sql());
-    const Running running(*prepared);
-    check(bind(running.statement(), mEngine->dialect));
-    return fetch(*prepared, atMost);
 }
 
 std::shared_ptr<PreparedStatement> Connection::prepare(const std::string &sql)

@@ -102,6 +102,7 @@ private:
 
     static constexpr int allRows = -1;
     std::shared_ptr<const Rows> run(const QString &statement, int atMost = allRows);
+    std::string sqlOf(const QString &statement);
     std::shared_ptr<PreparedStatement> prepare(const std::string &sql);
     std::shared_ptr<const Rows> fetch(PreparedStatement &prepared, int atMost = allRows);
     [[noreturn]] void fail(int code);

@@ -1,6 +1,7 @@
 #include "platform/ado/dialect.h"
 
 #include "platform/error/error.h"
+#include "platform/text/normalform.h"
 
 #include <QString>
 #include <algorithm>
@@ -13,23 +14,25 @@ namespace ADODB
 namespace
 {
 
-// Every statement of the program passes through here, those of long loads a hundred thousand times:
-// the small functions below are kept free of calls and allocations.
-
 bool startsWord(QChar c)
 {
     const char16_t u = c.unicode(), small = u | 0x20;
     return (small >= u'a' && small <= u'z') || u == u'_' || u >= 0x80;
 }
 
-bool inWord(QChar c)
-{
-    return startsWord(c) || (c >= u'0' && c <= u'9');
-}
-
 bool isBlank(QChar c)
 {
     return c == u' ' || c == u'\t' || c == u'\n' || c == u'\r';
+}
+
+bool isDigit(QChar c)
+{
+    return c >= u'0' && c <= u'9';
+}
+
+bool inWord(QChar c)
+{
+    return startsWord(c) || isDigit(c);
 }
 
 QChar charAt(QStringView s, qsizetype i)
@@ -51,6 +54,58 @@ qsizetype wordEnd(QStringView s, qsizetype i)
     return i;
 }
 
+bool startsNumber(QStringView s, qsizetype at)
+{
+    return isDigit(charAt(s, at)) || (charAt(s, at) == u'.' && isDigit(charAt(s, at + 1)));
+}
+
+qsizetype digitsEnd(QStringView s, qsizetype at)
+{
+    while (isDigit(charAt(s, at)))
+        ++at;
+    return at;
+}
+
+// Where the number that starts here ends: digits, a point, an exponent.
+qsizetype numberEnd(QStringView s, qsizetype at)
+{
+    auto end = digitsEnd(s, at);
+    if (charAt(s, end) == u'.')
+        end = digitsEnd(s, end + 1);
+    if (charAt(s, end) != u'e' && charAt(s, end) != u'E')
+        return end;
+    auto exponent = end + 1;
+    if (charAt(s, exponent) == u'+' || charAt(s, exponent) == u'-')
+        ++exponent;
+    const auto exponentEnd = digitsEnd(s, exponent);
+    return exponentEnd > exponent ? exponentEnd : end;
+}
+
+// The place of the quote that closes the one here, or -1.
+qsizetype closingQuote(QStringView s, qsizetype at)
+{
+    const QChar quote = s[at];
+    for (auto end = s.indexOf(quote, at + 1); end >= 0; end = s.indexOf(quote, end + 2)) {
+        if (charAt(s, end + 1) != quote)
+            return end;
+    }
+    return -1;
+}
+
+// A text as the engine reads it, of what stands between these quotes. A NUL would end the statement
+// there.
+std::string literal(QStringView content, QChar quote)
+{
+    QString text = content.toString();
+    text.replace(QString(2, quote), QString(quote));
+    text.replace(u'\'', "''"_L1);
+    const bool parts = text.contains(QChar::Null);
+    if (parts)
+        text.replace(QString(QChar::Null), "'||char(0)||'"_L1);
+    const std::string quoted = '\'' + text::nfc(text).toStdString() + '\'';
+    return parts ? '(' + quoted + ')' : quoted;
+}
+
 // The keyword is in small letters.
 bool is(QStringView word, QLatin1String keyword)
 {
@@ -61,12 +116,6 @@ bool is(QStringView word, QLatin1String keyword)
             return false;
     }
     return true;
-}
-
-bool nextWordIs(QStringView s, qsizetype i, QLatin1String keyword)
-{
-    i = skipBlanks(s, i);
-    return is(s.sliced(i, wordEnd(s, i) - i), keyword);
 }
 
 // SHAPE { select ... } as X compute X by a, b: the select alone, each row once.
@@ -114,98 +163,99 @@ bool conditionEnds(QStringView s, qsizetype at)
            isOneOf(s.sliced(at, wordEnd(s, at) - at), {"and", "or", "order", "group"});
 }
 
-} // namespace
-
-void Dialect::refuse(const QString &why) const
+/// One reading of a statement, from its start to its end. What the signs to come mean depends on
+/// these:
+///
+/// state     becomes                                            and then
+/// mDepth    one more at each "(", one less at its ")"          a ")" too many is refused
+/// mEnded    true at ";"                                        all but blanks is refused
+/// mValues   Expected at "values", Inside at its "(",           all but ";" is refused
+///           Behind at the ")" that closes that
+/// mDelete   From if "delete" is the first word, Table at       the word behind the table gets its
+///           the first one behind "from", Done at the next      "as", unless it is "as" or "where"
+/// mBetween  Lower at "between", Upper at its "and", None at    a LIKE belongs to the upper bound
+///           the next "and" or "or"                             unless it is None
+/// mNameAt   where in mSql the last word begins, of one with    a LIKE takes its column from there
+///           points its first part; 0 behind a number
+class Translation
 {
-    throw makeError(errSyntax, why);
-}
+public:
+    explicit Translation(QStringView statement) : mText(statement) {}
+    std::string run();
 
-void Dialect::translate(QStringView statement)
-{
-    mKnown = mShapes.match(statement, mLiterals);
-    if (mKnown)
-        return;
-    begin(statement);
-    const QStringView first = statement.sliced(mAt, wordEnd(statement, mAt) - mAt);
-    mLifts = !isOneOf(first, {"create", "alter", "drop"});
-    if (is(first, "shape"_L1)) {
-        translateShape(statement);
-        return;
-    }
-    if (mLifts && !isOneOf(first, {"select", "insert", "update", "delete"}))
-        refuse(first.toString());
-    translatePiece(statement);
-    mShapes.remember(statement, mGaps, mSql);
-}
+private:
+    void word();
+    void quoted();
+    void number();
+    void otherSign();
+    void parenthesis(QChar c);
+    bool maxOfSum();
+    bool likeText(QStringView w);
+    void deleteAlias(QStringView w);
+    [[noreturn]] void refuse(const QString &near) const { throw makeError(errSyntax, near); }
+    QStringView upTo(qsizetype end) const { return mText.sliced(mAt, end - mAt); }
+    void append(QStringView s) { mSql += s.toUtf8().toStdString(); }
 
-void Dialect::begin(QStringView statement)
-{
-    mSql.clear();
-    mLiterals.clear();
-    mGaps.clear();
-    mAt = skipBlanks(statement, 0);
-    mEnded = false;
-    mOrdinals.assign(1, false);
-    mValues = Values::None;
-    mBetween = Between::None;
-    mDelete = Delete::None;
-}
+    QStringView mText;
+    qsizetype mAt = 0;
+    std::string mSql;
 
-void Dialect::translateShape(QStringView statement)
-{
-    const QString content = shapeContent(statement);
-    mAt = 0;
-    translatePiece(content);
-}
+    int mDepth = 0;
+    bool mEnded = false;
+    enum class Values { None, Expected, Inside, Behind } mValues = Values::None;
+    enum class Delete { None, From, Table, Done } mDelete = Delete::None;
+    enum class Between { None, Lower, Upper } mBetween = Between::None;
+    static Between betweenAfter(Between now, QStringView w);
+    std::size_t mNameAt = 0;
+};
 
-void Dialect::translatePiece(QStringView s)
+std::string Translation::run()
 {
-    while (mAt < s.size()) {
-        const QChar c = s[mAt];
+    while (mAt < mText.size()) {
+        const QChar c = mText[mAt];
         if (isBlank(c)) {
-            mAt = skipBlanks(s, mAt);
-            if (!mSql.empty() && mAt < s.size())
+            mAt = skipBlanks(mText, mAt);
+            if (!mSql.empty() && mAt < mText.size())
                 mSql.push_back(' ');
             continue;
         }
         if (mEnded || (mValues == Values::Behind && c != u';'))
             refuse(QString(c));
         if (startsWord(c))
-            word(s);
-        else if (startsNumber(s, mAt))
-            number(s);
+            word();
+        else if (startsNumber(mText, mAt))
+            number();
         else if (c == u'\'' || c == u'"')
-            quoted(s);
+            quoted();
         else
-            otherSign(s);
+            otherSign();
     }
+    return mSql;
 }
 
-void Dialect::word(QStringView s)
+void Translation::word()
 {
-    const auto end = wordEnd(s, mAt);
-    const QStringView w = s.sliced(mAt, end - mAt);
-    mAt = end;
-    if (is(w, "left"_L1) && charAt(s, skipBlanks(s, end)) == u'(') {
+    const QStringView w = upTo(wordEnd(mText, mAt));
+    mAt += w.size();
+    if (is(w, "left"_L1) && charAt(mText, skipBlanks(mText, mAt)) == u'(') {
         mSql.append("\"left\"");
         return;
     }
-    if (is(w, "max"_L1) && maxOfSum(s))
+    if ((is(w, "max"_L1) && maxOfSum()) || (is(w, "like"_L1) && likeText(w)))
         return;
-    if (is(w, "like"_L1) && likeText(s, w))
-        return;
+    if (is(w, "x"_L1) && (charAt(mText, mAt) == u'\'' || charAt(mText, mAt) == u'"'))
+        refuse(w.toString()); // bytes, to the engine
+    if (is(w, "values"_L1))
+        mValues = Values::Expected;
     deleteAlias(w);
     mBetween = betweenAfter(mBetween, w);
     const auto last = mSql.find_last_not_of(' ');
     if (last == std::string::npos || mSql[last] != '.')
         mNameAt = mSql.size();
-    appendUtf8(mSql, w);
-    afterWord(s, w);
+    append(w);
 }
 
-// "between a and b": a condition may begin behind the next "and" only.
-Dialect::Between Dialect::betweenAfter(Between now, QStringView w)
+Translation::Between Translation::betweenAfter(Between now, QStringView w)
 {
     if (is(w, "between"_L1))
         return Between::Lower;
@@ -214,42 +264,29 @@ Dialect::Between Dialect::betweenAfter(Between now, QStringView w)
     return now == Between::Lower ? Between::Upper : Between::None;
 }
 
-void Dialect::afterWord(QStringView s, QStringView w)
-{
-    const bool orders = is(w, "order"_L1) || is(w, "group"_L1);
-    if (orders && nextWordIs(s, mAt, "by"_L1)) {
-        mOrdinals.back() = true;
-    } else if (is(w, "having"_L1) || is(w, "union"_L1)) {
-        mOrdinals.back() = false;
-    } else if (is(w, "values"_L1)) {
-        mValues = Values::Expected;
-    }
-}
-
 // max(id+1): as it stands it reads the whole table; as max(id)+1 it reads one entry of the index.
-// So with any number: a shape that is remembered stands for all of them.
-bool Dialect::maxOfSum(QStringView s)
+bool Translation::maxOfSum()
 {
-    const auto open = skipBlanks(s, mAt);
-    const auto from = skipBlanks(s, open + 1), to = wordEnd(s, from);
-    const auto plus = skipBlanks(s, to), one = skipBlanks(s, plus + 1);
-    const bool sum = charAt(s, open) == u'(' && to > from && charAt(s, plus) == u'+';
-    if (!sum || one >= s.size() || !startsNumber(s, one))
+    const auto open = skipBlanks(mText, mAt);
+    const auto from = skipBlanks(mText, open + 1), to = wordEnd(mText, from);
+    const auto plus = skipBlanks(mText, to), addend = skipBlanks(mText, plus + 1);
+    const bool sum = charAt(mText, open) == u'(' && to > from && charAt(mText, plus) == u'+';
+    if (!sum || !startsNumber(mText, addend))
         return false;
-    const auto close = skipBlanks(s, numberEnd(s, one));
-    if (charAt(s, close) != u')')
+    const auto close = skipBlanks(mText, numberEnd(mText, addend));
+    if (charAt(mText, close) != u')')
         return false;
     mSql.append("(max(");
-    appendUtf8(mSql, s.sliced(from, to - from));
+    append(mText.sliced(from, to - from));
     mSql.append(")+");
-    mAt = one;
-    number(s);
+    mAt = addend;
+    number();
     mSql.push_back(')');
     mAt = close + 1;
     return true;
 }
 
-void Dialect::deleteAlias(QStringView w)
+void Translation::deleteAlias(QStringView w)
 {
     switch (mDelete) {
     case Delete::None:
@@ -269,102 +306,89 @@ void Dialect::deleteAlias(QStringView w)
     }
 }
 
-// "a.name like 'text'" becomes "unlikely(a.name like ?)", if it is a condition of its own.
-bool Dialect::likeText(QStringView s, QStringView w)
+// "a.name like 'text'" becomes "unlikely(a.name like 'text')", if it is a condition of its own.
+bool Translation::likeText(QStringView w)
 {
-    const auto from = skipBlanks(s, mAt);
-    const auto end = charAt(s, from) == u'\'' ? closingQuote(s, from) : -1;
-    if (!mLifts || mBetween != Between::None || end < 0 || !isCondition(mSql, mNameAt) ||
-        !conditionEnds(s, end + 1))
+    const auto from = skipBlanks(mText, mAt);
+    const auto end = charAt(mText, from) == u'\'' ? closingQuote(mText, from) : -1;
+    if (mBetween != Between::None || end < 0 || !isCondition(mSql, mNameAt) ||
+        !conditionEnds(mText, end + 1))
         return false;
     mSql.insert(mNameAt, "unlikely(");
-    appendUtf8(mSql, w);
+    append(w);
     mSql.push_back(' ');
     mAt = from;
-    quoted(s);
+    quoted();
     mSql.push_back(')');
     return true;
 }
 
-void Dialect::quoted(QStringView s)
+void Translation::quoted()
 {
-    const char16_t quote = s[mAt].unicode();
-    const auto end = closingQuote(s, mAt);
+    const QChar quote = mText[mAt];
+    const auto end = closingQuote(mText, mAt);
     if (end < 0)
-        refuse(QString(QChar(quote)));
-    if (inWord(charAt(s, end + 1)))
-        refuse(s.sliced(end + 1, wordEnd(s, end + 1) - end - 1).toString());
-    if (mLifts) {
-        mLiterals.addText(s.sliced(mAt + 1, end - mAt - 1), quote);
-        mGaps.push_back({mAt, end + 1, quote});
-        mSql.push_back('?');
-    } else {
-        keepText(s.sliced(mAt + 1, end - mAt - 1), quote);
-    }
+        refuse(QString(quote));
+    if (const auto glued = wordEnd(mText, end + 1); glued > end + 1)
+        refuse(mText.sliced(end + 1, glued - end - 1).toString());
+    mSql += literal(mText.sliced(mAt + 1, end - mAt - 1), quote);
     mAt = end + 1;
 }
 
-// A text that cannot be lifted, between single quotes.
-void Dialect::keepText(QStringView content, char16_t quote)
+void Translation::number()
 {
-    if (content.contains(QChar::Null))
-        refuse(QString(QChar(quote)));
-    QString text = content.toString();
-    text.replace(QString(2, QChar(quote)), QString(1, QChar(quote)));
-    text.replace(u'\'', "''"_L1);
-    mSql.push_back('\'');
-    appendUtf8(mSql, text.normalized(QString::NormalizationForm_C));
-    mSql.push_back('\'');
+    const QStringView digits = upTo(numberEnd(mText, mAt));
+    const QChar before = mAt > 0 ? mText[mAt - 1] : QChar(),
+                behind = charAt(mText, mAt + digits.size());
+    if (inWord(behind))
+        refuse(digits.toString() + behind);
+    if (inWord(before)) // "a.5"
+        refuse(before + digits.toString());
+    append(digits);
+    mAt += digits.size();
+    mNameAt = 0;
 }
 
-void Dialect::number(QStringView s)
+void Translation::otherSign()
 {
-    const auto from = mAt;
-    mAt = numberEnd(s, from);
-    const QStringView digits = s.sliced(from, mAt - from);
-    if (inWord(charAt(s, mAt)))
-        refuse(digits.toString() + s[mAt]);
-    if (from > 0 && inWord(s[from - 1])) // "a.5": remembered, its gap would take "a5" for the same
-        refuse(s[from - 1] + digits.toString());
-    if (liftsHere()) {
-        mLiterals.addNumber(digits);
-        mGaps.push_back({from, mAt, 0});
-        mSql.push_back('?');
-    } else {
-        appendUtf8(mSql, digits);
-    }
-}
-
-void Dialect::otherSign(QStringView s)
-{
-    const QChar c = s[mAt], next = charAt(s, mAt + 1);
+    const QChar c = mText[mAt], next = charAt(mText, mAt + 1);
     const bool comment = (c == u'-' && next == u'-') || (c == u'/' && next == u'*');
     const bool control = c < u' '; // SQLite takes a NUL for the end of the statement
     const bool parameter = c == u'?' || c == u':' || c == u'@' || c == u'$' || c == u'#';
     if (comment || control || parameter || (c == u'|' && next == u'|'))
         refuse(QString(c) + next);
-    if (c == u';')
-        mEnded = true;
-    else
-        sign(s);
     ++mAt;
+    if (c == u';') {
+        mEnded = true;
+        return;
+    }
+    parenthesis(c);
+    append(QStringView(&c, 1));
 }
 
-void Dialect::sign(QStringView s)
+void Translation::parenthesis(QChar c)
 {
-    const char16_t c = s[mAt].unicode();
-    if (c == u'(') {
-        mOrdinals.push_back(mOrdinals.back());
-        if (mValues == Values::Expected)
-            mValues = Values::Inside;
-    } else if (c == u')') {
-        if (mOrdinals.size() == 1)
-            refuse(QString(QChar(c)));
-        mOrdinals.pop_back();
-        if (mValues == Values::Inside && mOrdinals.size() == 1)
-            mValues = Values::Behind;
-    }
-    appendUtf8(mSql, s.sliced(mAt, 1));
+    if (c == u'(' && mDepth++ == 0 && mValues == Values::Expected)
+        mValues = Values::Inside;
+    if (c != u')')
+        return;
+    if (mDepth-- == 0)
+        refuse(QString(c));
+    if (mDepth == 0 && mValues == Values::Inside)
+        mValues = Values::Behind;
+}
+
+} // namespace
+
+std::string translated(QStringView statement)
+{
+    const auto from = skipBlanks(statement, 0);
+    const QStringView first = statement.sliced(from, wordEnd(statement, from) - from);
+    if (is(first, "shape"_L1))
+        return Translation(shapeContent(statement)).run();
+    if (!isOneOf(first, {"select", "insert", "update", "delete", "create", "alter", "drop"}))
+        throw makeError(errSyntax, first.toString());
+    return Translation(statement).run();
 }
 
 } // namespace ADODB

@@ -28,12 +28,23 @@ bool dropWord(std::string_view &text, std::string_view word)
     return text.ends_with(' ');
 }
 
-// No literal can be taken for one of these words: those were lifted out.
+// The words outside of its texts, in small letters; a doubled quote in a text ends one and begins
+// another.
+std::string words(std::string_view sql)
+{
+    std::string small;
+    bool inText = false;
+    for (const char c : sql) {
+        inText ^= c == '\'';
+        if (!inText)
+            small.push_back(char(std::tolower(static_cast<unsigned char>(c))));
+    }
+    return small;
+}
+
 bool isCompound(std::string_view sql)
 {
-    std::string small(sql);
-    std::transform(small.begin(), small.end(), small.begin(),
-                   [](unsigned char c) { return char(std::tolower(c)); });
+    const std::string small = words(sql);
     return small.find("union") != std::string::npos || small.find("except") != std::string::npos ||
            small.find("intersect") != std::string::npos;
 }

@@ -20,6 +20,8 @@ private slots:
                                  << u"0 1 4 2 3"_s;
         QTest::newRow("capitals, blanks")
             << QByteArray("select a from t ORDER  BY 2 , 1") << u"1 0"_s;
+        QTest::newRow("a word of others in a text")
+            << QByteArray("select a from t where b='d''Union' order by 1") << u"0"_s;
         for (const char *other :
              {"select a from t order by 1 desc", "select a from t order by a, 1", "select a from t",
               "select a from t group by 1",
@@ -41,7 +43,7 @@ private slots:
             columns.append(QString::number(column));
         QTEST(columns.join(u' '), "columns");
         if (!columns.isEmpty())
-            QCOMPARE(sql.left(qsizetype(tail.from)).trimmed(), QByteArray("select a from t"));
+            QVERIFY(sql.left(qsizetype(tail.from)).trimmed().startsWith("select a from t"));
     }
 
     void rowsComeAsTheEngineSortsThem_data()
