@@ -1,6 +1,6 @@
 #include "controls/tracks/trackcompletion.h"
 
-#include "catalogue/quoting.h"
+#include "platform/ado/command.h"
 #include "platform/ado/recordset.h"
 
 namespace trackcompletion
@@ -9,43 +9,26 @@ namespace trackcompletion
 namespace
 {
 
-using Literal = QLatin1String;
-
-constexpr int suggestions = 10;
+// So many and no more are read.
+constexpr std::string_view selectArtists =
+    "select Naam from Artiesten where Naam >= ? and Naam < ? order by Naam limit 10";
+constexpr std::string_view selectTitlesOfArtist =
+    "select distinct Titel from Tracks where Artiest_ID = (select ID from Artiesten where Naam = ?) "
+    "and Titel >= ? and Titel < ? order by Titel limit 10";
+constexpr std::string_view selectTitlesOfDisc =
+    "select distinct Titel from Tracks where Artiest_ID = (select Artiest_ID from CDTitels where "
+    "ID = ?) and Titel >= ? and Titel < ? order by Titel limit 10";
 
 // The code point U+FFFF sorts behind all others.
-QString beginsWith(Literal column, const QString &start)
+QString behindAll(const QString &start)
 {
-    return column + Literal(" >= ") + quoted(start) + Literal(" and ") + column + Literal(" < ") +
-           quoted(start + QChar(0xFFFF));
+    return start + QChar(0xFFFF);
 }
 
-QString selectArtists(const QString &start)
+QStringList run(ADODB::Connection &connection, std::string_view statement,
+                std::initializer_list<ADODB::Parameter> values)
 {
-    return Literal("select Naam from Artiesten where ") + beginsWith(Literal("Naam"), start) +
-           Literal(" order by Naam");
-}
-
-QString selectTitles(const QString &artists, const QString &start)
-{
-    return Literal("select distinct trk.Titel from Tracks trk where trk.Artiest_ID = (") + artists +
-           Literal(") and ") + beginsWith(Literal("trk.Titel"), start) +
-           Literal(" order by trk.Titel");
-}
-
-QString selectArtist(const QString &name)
-{
-    return Literal("select ID from Artiesten where Naam = ") + quoted(name);
-}
-
-QString selectArtistOf(qint64 cdId)
-{
-    return Literal("select Artiest_ID from CDTitels where ID = ") + QString::number(cdId);
-}
-
-QStringList firstOf(ADODB::Connection &connection, const QString &statement)
-{
-    const auto rows = connection.firstRows(statement, suggestions).rows();
+    const auto rows = ADODB::Command(connection, statement).Execute(values).rows();
     QStringList texts;
     for (qsizetype row = 0; row < rows->rowCount(); ++row)
         texts.append(rows->text(row, 0));
@@ -56,17 +39,17 @@ QStringList firstOf(ADODB::Connection &connection, const QString &statement)
 
 QStringList artists(ADODB::Connection &connection, const QString &start)
 {
-    return firstOf(connection, selectArtists(start));
+    return run(connection, selectArtists, {start, behindAll(start)});
 }
 
 QStringList titles(ADODB::Connection &connection, const QString &artist, const QString &start)
 {
-    return firstOf(connection, selectTitles(selectArtist(artist), start));
+    return run(connection, selectTitlesOfArtist, {artist, start, behindAll(start)});
 }
 
 QStringList titles(ADODB::Connection &connection, qint64 cdId, const QString &start)
 {
-    return firstOf(connection, selectTitles(selectArtistOf(cdId), start));
+    return run(connection, selectTitlesOfDisc, {cdId, start, behindAll(start)});
 }
 
 } // namespace trackcompletion
