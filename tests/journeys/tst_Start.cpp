@@ -139,8 +139,7 @@ private slots:
         QCOMPARE(gConnection->State(), ADODB::adStateClosed);
 
         // With this the reading of a text file begins.
-        QCOMPARE(numberOf([] { nextId(u"select max(id+1) as ID from CDtitels"_s, "ID"_L1); }),
-                 int(errObjectClosed));
+        QCOMPARE(numberOf([] { nextId(Table::CDTitels); }), int(errObjectClosed));
         mDesktop->verifyAllCame();
         mDesktop->expectBox(u"[Systeemfout]"_s);
         mDesktop->expectBox(u"[System error]"_s);
