@@ -307,14 +307,17 @@ QPoint MainScreen::freePlaceFor(const QMdiSubWindow &child) const
 
 int MainScreen::controlsBehind(const QMdiSubWindow &child, QPoint corner) const
 {
-    const auto all = mUi->Children->viewport()->findChildren<QWidget *>();
-    return int(std::count_if(all.begin(), all.end(), [&](const QWidget *w) {
+    constexpr int worstFirst = 100; // a button is worth more than any number of links
+    int covered = 0;
+    for (const QWidget *w : mUi->Children->viewport()->findChildren<QWidget *>()) {
         const bool isControl = w->focusPolicy() & Qt::TabFocus && w->isVisible() &&
                                !qobject_cast<const QAbstractScrollArea *>(w) &&
                                !child.isAncestorOf(w);
         const QRect place(w->mapTo(mUi->Children->viewport(), QPoint()), w->size());
-        return isControl && place.intersects({corner, child.size()});
-    }));
+        if (isControl && place.intersects({corner, child.size()}))
+            covered += qobject_cast<const QAbstractButton *>(w) ? worstFirst : 1;
+    }
+    return covered;
 }
 
 void MainScreen::bringUp(Form *form)
