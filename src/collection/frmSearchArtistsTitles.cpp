@@ -280,7 +280,7 @@ bool frmSearchArtistsTitles::writeResult(const QString &name, LongWork &work)
     written = written && CloseTextFile(file);
     if (!written) {
         mUi->StatusBar->showMessage(failure);
-        errorBox(failure, GetMessage("FileError"));
+        errorBox(failure + u'\r' + file.reason(), GetMessage("FileError"));
     }
     return written;
 }

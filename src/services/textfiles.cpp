@@ -67,6 +67,11 @@ bool CloseTextFile(InputTextFile &file)
 OutputTextFile::OutputTextFile() = default;
 OutputTextFile::~OutputTextFile() = default;
 
+QString OutputTextFile::reason() const
+{
+    return mFile ? mFile->reason() : mReason;
+}
+
 bool OpenOutputFile(const QString &name, OutputTextFile &file)
 {
     // Not a stored name but one just chosen: a "\" in it is a plain character.
@@ -87,6 +92,7 @@ bool WriteTextLine(OutputTextFile &file, const QString &line)
 bool CloseTextFile(OutputTextFile &file)
 {
     const bool done = file.mFile && file.mFile->commit();
+    file.mReason = file.reason();
     file.mFile.reset();
     return done;
 }

@@ -38,11 +38,15 @@ public:
     OutputTextFile();
     ~OutputTextFile();
 
+    /// Why it could not be written, in the words of the system.
+    QString reason() const;
+
 private:
     friend bool OpenOutputFile(const QString &name, OutputTextFile &file);
     friend bool WriteTextLine(OutputTextFile &file, const QString &line);
     friend bool CloseTextFile(OutputTextFile &file);
     std::unique_ptr<WholeFile> mFile;
+    QString mReason; // of one that is closed
 };
 
 /// False if the file cannot be opened; nothing is shown.

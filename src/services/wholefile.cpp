@@ -20,11 +20,13 @@ qint64 WholeFile::writeData(const char *data, qint64 size)
     return written;
 }
 
-// The base class overlooks a write that fell short, and an error of its sync.
+// The base class overlooks a write that fell short, and an error of its sync. One that falls short
+// leaves no error of the system's: the disk took what there was room for.
 bool WholeFile::reachesTheDisk()
 {
+    errno = 0;
     if (mReason.isEmpty() && (!flush() || error() != QFileDevice::NoError))
-        mReason = errorString();
+        mReason = qt_error_string(errno != 0 ? errno : ENOSPC);
     if (mReason.isEmpty() && ::fsync(handle()) != 0)
         mReason = qt_error_string();
     return mReason.isEmpty();

@@ -11,7 +11,10 @@
 #include "shell/singleinstance.h"
 #include "shell/startup.h"
 
+#include <QCommandLineParser>
 #include <csignal>
+
+using namespace Qt::StringLiterals;
 
 namespace
 {
@@ -30,12 +33,29 @@ void outliveWrites()
         std::signal(number, [](int) {});
 }
 
+// What can be asked of the program without a display. All other words are the toolkit's.
+void answerQuestions(int argc, char **argv)
+{
+    const QStringList questions{u"--version"_s, u"-v"_s, u"--help"_s, u"-h"_s};
+    if (argc != 2 || !questions.contains(QString::fromLocal8Bit(argv[1])))
+        return;
+    const QCoreApplication application(argc, argv);
+    QCommandLineParser options;
+    options.setApplicationDescription(
+        u"The catalogue of a private music collection. It is started without options; the "
+        "catalogue lies in $SONGCASE_FOLDER, beside the program, or in your data folder."_s);
+    options.addVersionOption();
+    options.addHelpOption();
+    options.process(application); // which ends
+}
+
 } // namespace
 
 int runProgram(int argc, char **argv)
 {
     outliveWrites();
     nameApplication();
+    answerQuestions(argc, argv);
     Application application(argc, argv);
     QtDesktop desktop;
     Desktop::setCurrent(&desktop);

@@ -8,6 +8,7 @@
 #include "support/referencelike.h"
 #include "support/screentest.h"
 
+#include <cerrno>
 #include <QLineEdit>
 #include <QPushButton>
 #include <QRadioButton>
@@ -358,7 +359,7 @@ private slots:
         mDesktop->expectBox(u"already exists!"_s, vbYes);
         if (diskFull) {
             const FullDisk full(4000);
-            mDesktop->expectBox(u"The file could not be written"_s);
+            mDesktop->expectBox(u"/sub/out\r"_s + qt_error_string(EFBIG));
             exportTo(name);
         } else {
             QFile::setPermissions(folder, QFile::ReadOwner | QFile::ExeOwner | QFile::ReadOther |

@@ -11,6 +11,20 @@ class tst_program : public QObject
     Q_OBJECT
 
 private slots:
+    void answersWithoutADisplay()
+    {
+        for (const QString &question : {u"--version"_s, u"--help"_s}) {
+            QProcess program;
+            auto environment = QProcessEnvironment::systemEnvironment();
+            environment.insert(u"QT_QPA_PLATFORM"_s, u"no such"_s);
+            program.setProcessEnvironment(environment);
+            program.start(qEnvironmentVariable("SONGCASE_BIN") + u"/bin/songcase"_s, {question});
+            QVERIFY(program.waitForFinished());
+            QCOMPARE(program.exitCode(), 0);
+            QVERIFY(program.readAllStandardOutput().contains("songcase"));
+        }
+    }
+
     // A file that must not grow is an error like a full disk: told, and survived.
     void aLimitOfFileSizesKillsNobody()
     {

@@ -386,7 +386,7 @@ void DBListViewCTL::selectionChanged(const QItemSelection &selected, const QItem
         QTableView::selectionChanged(selected, old);
         return;
     }
-    QAbstractItemView::selectionChanged(selected, old);
+    QAbstractItemView::selectionChanged(selected, old); // NOLINT: the table's own is what costs
     QAccessibleEvent event(this, QAccessible::SelectionWithin);
     QAccessible::updateAccessibility(&event);
 }
