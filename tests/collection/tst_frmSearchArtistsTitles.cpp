@@ -8,12 +8,12 @@
 #include "support/referencelike.h"
 #include "support/screentest.h"
 
-#include <cerrno>
 #include <QLineEdit>
 #include <QPushButton>
 #include <QRadioButton>
 #include <QStatusBar>
 #include <QTabBar>
+#include <cerrno>
 
 /// The search on a real catalogue file, held against a slow matcher of its own.
 class tst_frmSearchArtistsTitles : public ScreenTest
