@@ -49,9 +49,9 @@ create index MP3FilesCollection on MP3Files(CollectionId, Volgnummer);
 // each day. The numbers were found by trial on made-up catalogues of 3,000 and of 100,000 discs and
 // are not quite the shape of either: with these a search begins with the artists if it asks for
 // one, with the tracks if it asks for something of theirs, and with the discs if it asks for
-// nothing, each the fastest way; without them a search for an artist reads all discs. To find
-// better ones: bench/trystatistics.py moves one number after the other and tells what becomes of
-// the plans and the times.
+// nothing or for a span of years alone, each the fastest way; without them a search for an artist
+// reads all discs. To find better ones: bench/trystatistics.py moves one number after the other and
+// tells what becomes of the plans and the times.
 constexpr char statistics[] = R"sql(
 analyze;
 insert into sqlite_stat1(tbl, idx, stat) values
