@@ -1,6 +1,7 @@
 // Label: unit
 #include "platform/ado/ordertail.h"
 #include "platform/ado/recordset.h"
+#include "platform/text/collation.h"
 #include "services/globals.h"
 #include "support/testcatalogue.h"
 
@@ -76,6 +77,30 @@ private slots:
         // Of rows that differ in case alone a "distinct" may leave either.
         QCOMPARE(rows.join(u'\n').toCaseFolded(),
                  rowsOf(gConnection->Execute(byName)).join(u'\n').toCaseFolded());
+    }
+
+    void alikeRowsStayAsTheyAre_data()
+    {
+        QTest::addColumn<QString>("column");
+        for (const char *column : {"titel", "artiest_id"})
+            QTest::newRow(column) << QString(QLatin1String(column));
+    }
+
+    void alikeRowsStayAsTheyAre()
+    {
+        QFETCH(QString, column);
+        TestCatalogue catalogue;
+        fill(catalogue);
+        const QString select = u"select %1, id from Tracks where titel <> '' "_s.arg(column);
+        const auto asRead = rowsOf(gConnection->Execute(select)),
+                   sorted = rowsOf(gConnection->Execute(select + u"order by 1"_s));
+        const auto key = [&](qsizetype row) {
+            return sorted[row].section(u'|', 0, 0).toStdString();
+        };
+        for (qsizetype row = 1; row < sorted.size(); ++row) {
+            if (text::Collation::root().compare(key(row - 1), key(row)) == 0)
+                QVERIFY(asRead.indexOf(sorted[row - 1]) < asRead.indexOf(sorted[row]));
+        }
     }
 
     void theFirstRowsAreTheFirstOfTheOrder()
