@@ -50,6 +50,10 @@ private slots:
         row("ж%", "ЖУК", true);
         row("σ", "ς", true);
         row("\u212A", "k", true);
+        row("%k_", "ri\u212As", true); // the Kelvin sign and the long s are folded into ASCII
+        row("%k%", "Bri\u212As", true);
+        row("kiss", "ki\u017F\u017F", true);
+        row("kit", "ki\u017F", false);
         row("ß", "ss", false);
         row("a.c*[b]", "a.c*[B]", true); // nothing else is wild
         row("a.c", "abc", false);
