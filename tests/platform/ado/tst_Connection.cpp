@@ -108,6 +108,23 @@ private slots:
             QCOMPARE(single(u"select 1 as c%1"_s.arg(distinct)).toLong(), 1);
     }
 
+    // A statement is kept prepared; the columns of its answer are those of the table by then.
+    void columnsOfAnotherShape()
+    {
+        TestCatalogue catalogue;
+        addArtist(1);
+        for (const char *change : {"select 1", "alter table Artiesten add column More",
+                                   "alter table Artiesten rename column More to Less",
+                                   "alter table Artiesten drop column Less"}) {
+            catalogue.exec(change);
+            const auto answer = gConnection->Execute(u"select * from Artiesten"_s);
+            QStringList names;
+            for (const FieldInfo &field : answer.rows()->fields())
+                names.append(field.name);
+            QCOMPARE(names, catalogue.rows("select name from pragma_table_info('Artiesten')"));
+        }
+    }
+
     void commitsAndRollsBack()
     {
         TestCatalogue catalogue;
@@ -130,31 +147,42 @@ private slots:
 
     void joinedRoutineTakesBackItsOwn()
     {
-        TestCatalogue catalogue;
-        Transaction outer(*gConnection);
-        addArtist(1);
-        {
-            Transaction inner(*gConnection);
-            addArtist(2);
+        for (const bool commits : {true, false}) {
+            TestCatalogue catalogue;
+            QVERIFY(!gConnection->fate());
+            std::vector<std::shared_ptr<const TransactionFate>> fates; // by the artist added
+            const auto add = [&](int id) {
+                addArtist(id);
+                fates.push_back(gConnection->fate());
+            };
+            Transaction outer(*gConnection);
+            add(1);
             {
-                Transaction innermost(*gConnection);
-                addArtist(3);
-                innermost.CommitTrans();
+                Transaction inner(*gConnection);
+                add(2);
+                {
+                    Transaction innermost(*gConnection);
+                    add(3);
+                    innermost.CommitTrans();
+                }
+                inner.RollbackTrans();
             }
-            inner.RollbackTrans();
+            {
+                Transaction inner(*gConnection);
+                add(4);
+                inner.CommitTrans();
+            }
+            {
+                Transaction left(*gConnection); // ends without a word: its changes go
+                add(5);
+            }
+            QCOMPARE(catalogue.count("select count(*) from artiesten"), 0);
+            commits ? outer.CommitTrans() : outer.RollbackTrans();
+            const auto kept = catalogue.rows("select id from artiesten");
+            QCOMPARE(kept, commits ? texts("1", "4") : QStringList());
+            for (int id = 1; id <= 5; ++id)
+                QCOMPARE(fates[std::size_t(id - 1)]->undone(), !kept.contains(QString::number(id)));
         }
-        {
-            Transaction inner(*gConnection);
-            addArtist(4);
-            inner.CommitTrans();
-        }
-        {
-            Transaction left(*gConnection); // ends without a word: its changes go, the others stay
-            addArtist(5);
-        }
-        QCOMPARE(catalogue.count("select count(*) from artiesten"), 0);
-        outer.CommitTrans();
-        QCOMPARE(catalogue.rows("select id from artiesten"), texts("1", "4"));
     }
 
     void abandonedTransaction()
