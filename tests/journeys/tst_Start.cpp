@@ -6,6 +6,7 @@
 #include "services/clsRegistry.h"
 #include "services/globals.h"
 #include "services/messages.h"
+#include "support/datarows.h"
 #include "support/program.h"
 #include "support/testcatalogue.h"
 
@@ -51,6 +52,9 @@ private slots:
             QCOMPARE(program.frame().windowTitle(),
                      dutch ? u"Dr. Orvanta's Liedkist"_s : u"Dr. Orvanta's Songcase"_s);
             QCOMPARE(gConnection->State(), ADODB::adStateOpen);
+            QVERIFY(program.screen("frmCDList")->Unload());
+            QTest::keyClick(&program.frame(), Qt::Key_F5);
+            QVERIFY(program.screen("frmCDList"));
             QVERIFY(program.end());
             QCOMPARE(gConnection->State(), ADODB::adStateClosed);
         }
@@ -78,31 +82,21 @@ private slots:
 
     void aFileThatCannotBeUsedIsLeftAsItWas_data()
     {
-        QTest::addColumn<QString>("fault");
-        QTest::addColumn<QString>("said");
-        QTest::newRow("text") << u"text"_s << u"not a catalogue"_s;
-        QTest::newRow("truncated") << u"truncated"_s << u"damaged"_s;
-        QTest::newRow("read-only") << u"readonly"_s << u"read-only"_s;
-        QTest::newRow("locked") << u"locked"_s << u"in use"_s;
+        const DataRows<bool, QString> row("locked", "said");
+        row("text", false, "not a catalogue"); // before it is opened
+        row("locked", true, "in use");         // and after
     }
 
     void aFileThatCannotBeUsedIsLeftAsItWas()
     {
-        QFETCH(QString, fault);
+        QFETCH(bool, locked);
         QFETCH(QString, said);
         makeCatalogue();
         const QString file = mDesktop->folder + u"/Compact4.orv"_s;
-        sqlite3 *other = nullptr;
-        if (fault == "text"_L1)
+        if (!locked)
             writeFile(file, QByteArray(5000, 'x'));
-        else if (fault == "truncated"_L1)
-            QVERIFY(QFile::resize(file, 4096 * 3));
-        else if (fault == "readonly"_L1)
-            QVERIFY(QFile::setPermissions(file, QFile::ReadOwner));
-        if (fault == "locked"_L1) {
-            sqlite3_open(file.toUtf8().constData(), &other);
-            QCOMPARE(sqlite3_exec(other, "BEGIN EXCLUSIVE", nullptr, nullptr, nullptr), SQLITE_OK);
-        }
+        const OtherProgram other(file);
+        QCOMPARE(other.run("begin exclusive") == SQLITE_OK, locked);
         const QByteArray before = readFile(file);
 
         mDesktop->expectBox(u"error [System error] ADO Connect Error: "_s);
@@ -118,7 +112,6 @@ private slots:
             mDesktop->expectBox(u"[System error]"_s);
             QVERIFY(program.end());
         }
-        sqlite3_close(other);
         QCOMPARE(readFile(file), before);
         QCOMPARE(QDir(mDesktop->folder).entryList({u"Compact4*"_s}).size(), 1);
     }
@@ -273,44 +266,6 @@ private slots:
         mDesktop->expectBox(u"error [] No browser detected!"_s.mid(0, 5));
         emit link->linkActivated(u"guide"_s);
         QVERIFY(mDesktop->boxes.last().endsWith("No browser detected!"_L1));
-        QVERIFY(program.end());
-    }
-
-    void keysOfTheMenu()
-    {
-        makeCatalogue();
-        storeLanguage(languageEnglish);
-        Program program(*mDesktop);
-        QVERIFY(program.start());
-        for (const QString &line :
-             texts("Import Ctrl+Ins", "mnuSave Ctrl+S", "mnuConvertDatabase Shift+Ins",
-                   "mnuSearchArtistsTitles Ctrl+F1", "mnuCDInsert F2", "mnuInsertEnkelCD F3",
-                   "mnuMP3 F4", "mnuUpdate F5", "mnuCDDB F6", "mnuRegisterCDDB F7", "mnuProxy F8",
-                   "mnuHelp F1", "Over Ctrl+I", "mnuOverCDDB Ctrl+G")) {
-            const QByteArray entry = line.section(u' ', 0, 0).toLatin1();
-            QCOMPARE(program.entry(entry.constData())->shortcut(),
-                     QKeySequence(line.section(u' ', 1)));
-        }
-        QVERIFY(program.screen("frmCDList")->Unload());
-        QTest::keyClick(&program.frame(), Qt::Key_F5);
-        QVERIFY(program.screen("frmCDList"));
-        QVERIFY(program.end());
-    }
-
-    void whatComesLaterIsDisabled()
-    {
-        makeCatalogue();
-        storeLanguage(languageEnglish);
-        Program program(*mDesktop);
-        QVERIFY(program.start());
-        for (const char *entry :
-             {"Import", "mnuSave", "mnuCDInsert", "mnuInsertEnkelCD", "mnuUpdate",
-              "mnuSearchArtistsTitles", "mnuHelp", "Over", "mnuEngels", "tbImport", "tbSave",
-              "tbQuicksearch", "tbCollection", "tbCredits", "tbHelp"})
-            QVERIFY2(program.entry(entry)->isEnabled(), entry);
-        for (const char *entry :
-             {"mnuConvertDatabase", "mnuMP3", "mnuCDDB", "mnuProxy", "mnuOverCDDB", "tbCDDB"})
-            QVERIFY2(!program.entry(entry)->isEnabled(), entry);
         QVERIFY(program.end());
     }
 
