@@ -91,23 +91,6 @@ private slots:
               "found");
     }
 
-    // One prepared statement, other values: nothing of the earlier run may be left in it.
-    void bindsAgain()
-    {
-        TestCatalogue catalogue;
-        addArtist(1, "Abba");
-        addArtist(2, "");
-        addArtist(3, "Zz Top");
-        for (const auto &[pattern, ids] :
-             {std::pair("A%", "1"), {"%", "1,2,3"}, {"%", "1,2,3"}, {"_z%", "3"}})
-            QCOMPARE(single(u"select group_concat(ID) from artiesten where naam like '"_s +
-                            QLatin1String(pattern) + u'\'')
-                         .toText(),
-                     QLatin1String(ids));
-        for (int distinct = 0; distinct < 500; ++distinct) // more than are kept
-            QCOMPARE(single(u"select 1 as c%1"_s.arg(distinct)).toLong(), 1);
-    }
-
     // A statement is kept prepared; the columns of its answer are those of the table by then.
     void columnsOfAnotherShape()
     {
