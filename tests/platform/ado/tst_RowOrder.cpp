@@ -3,9 +3,8 @@
 #include "platform/ado/recordset.h"
 #include "platform/text/collation.h"
 #include "services/globals.h"
+#include "support/datarows.h"
 #include "support/testcatalogue.h"
-
-#include <QTest>
 
 /// Rows of "order by 1,2" are sorted in memory; the engine's own order is what they must be in.
 class tst_RowOrder : public QObject
@@ -15,14 +14,10 @@ class tst_RowOrder : public QObject
 private slots:
     void theEndOfAStatement_data()
     {
-        QTest::addColumn<QByteArray>("sql");
-        QTest::addColumn<QString>("columns"); // empty: the engine sorts
-        QTest::newRow("several") << QByteArray("select a from t order by 1,2,5,3,4 ")
-                                 << u"0 1 4 2 3"_s;
-        QTest::newRow("capitals, blanks")
-            << QByteArray("select a from t ORDER  BY 2 , 1") << u"1 0"_s;
-        QTest::newRow("a word of others in a text")
-            << QByteArray("select a from t where b='d''Union' order by 1") << u"0"_s;
+        const DataRows<QByteArray, QString> row("sql", "columns"); // none: the engine sorts
+        row("several", "select a from t order by 1,2,5,3,4 ", "0 1 4 2 3");
+        row("capitals, blanks", "select a from t ORDER  BY 2 , 1", "1 0");
+        row("a word of others in a text", "select a from t where b='d''Union' order by 1", "0");
         for (const char *other :
              {"select a from t order by 1 desc", "select a from t order by a, 1", "select a from t",
               "select a from t group by 1",
@@ -32,7 +27,7 @@ private slots:
               "select a from t limit 2", "select a from t where x between 1 and 2",
               "select a from (select b order by 1)", "select a from t order by 1,",
               "select a from t order by 99999999999"})
-            QTest::newRow(other) << QByteArray(other) << QString();
+            row(other, "");
     }
 
     void theEndOfAStatement()
@@ -49,13 +44,12 @@ private slots:
 
     void rowsComeAsTheEngineSortsThem_data()
     {
-        QTest::addColumn<QString>("byNumber");
-        QTest::addColumn<QString>("byName");
+        const DataRows<QString, QString> row("byNumber", "byName");
         const auto from = u" from Tracks as trk "_s;
         const auto add = [&](const char *columns, const char *numbers, const char *names) {
             const QString select = u"select "_s + QLatin1String(columns) + from;
-            QTest::newRow(names) << QString(select + u"order by "_s + QLatin1String(numbers))
-                                 << QString(select + u"order by "_s + QLatin1String(names));
+            row(names, select + u"order by "_s + QLatin1String(numbers),
+                select + u"order by "_s + QLatin1String(names));
         };
         add("titel, genre, id", "1,2,3", "trk.titel, trk.genre, trk.id");
         add("hitjaar, titel, id", "1,2,3", "trk.hitjaar, trk.titel, trk.id");
@@ -81,9 +75,9 @@ private slots:
 
     void alikeRowsStayAsTheyAre_data()
     {
-        QTest::addColumn<QString>("column");
-        for (const char *column : {"titel", "artiest_id"})
-            QTest::newRow(column) << QString(QLatin1String(column));
+        const DataRows<QString> row("column");
+        row("titel");
+        row("artiest_id");
     }
 
     void alikeRowsStayAsTheyAre()

@@ -1,11 +1,10 @@
 // Label: unit
 #include "platform/desktop/programfolder.h"
+#include "support/datarows.h"
 
 #include <QProcess>
 #include <QTemporaryDir>
 #include <QtTest>
-
-using namespace Qt::StringLiterals;
 
 /// Where a program looks for its catalogue goes by where it lies itself, so each case runs a copy
 /// of this test in a folder of its own, which only tells what it has found.
@@ -16,24 +15,13 @@ class tst_ProgramFolder : public QObject
 private slots:
     void find_data()
     {
-        QTest::addColumn<QString>("catalogue"); // beside the executable
-        QTest::addColumn<QString>("told");      // $SONGCASE_FOLDER
-        QTest::addColumn<QString>("found");
-        QTest::newRow("installed") << ""
-                                   << ""
-                                   << "data/songcase";
-        QTest::newRow("portable") << "bin/Compact4.orv"
-                                  << ""
-                                  << "bin";
-        QTest::newRow("portable, of an older generation") << "bin/Compact3.orv"
-                                                          << ""
-                                                          << "bin";
-        QTest::newRow("a catalogue above it") << "Compact4.orv"
-                                              << ""
-                                              << "data/songcase";
-        QTest::newRow("told, and portable") << "bin/Compact4.orv"
-                                            << "mine"
-                                            << "mine";
+        // catalogue: beside the executable; told: $SONGCASE_FOLDER
+        const DataRows<QString, QString, QString> row("catalogue", "told", "found");
+        row("installed", "", "", "data/songcase");
+        row("portable", "bin/Compact4.orv", "", "bin");
+        row("portable, of an older generation", "bin/Compact3.orv", "", "bin");
+        row("a catalogue above it", "Compact4.orv", "", "data/songcase");
+        row("told, and portable", "bin/Compact4.orv", "mine", "mine");
     }
 
     void find()
