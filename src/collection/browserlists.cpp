@@ -1,6 +1,5 @@
 #include "collection/browserlists.h"
 
-#include "collection/editors.h"
 #include "services/globals.h"
 
 using namespace Qt::StringLiterals;
@@ -85,9 +84,7 @@ qint64 trackCount()
 
 void deleteTitle(qint64 id)
 {
-    editors::aboutToDelete(id);
     executeBoth(deleteDiscsOf(id), deleteTitleRow(id));
-    editors::deleted(id);
 }
 
 void deleteMP3Collection(qint64 id)

@@ -1,5 +1,6 @@
 #include "collection/editors.h"
 
+#include "collection/browserlists.h"
 #include "collection/frmCDRoot.h"
 #include "collection/frmCDRootE.h"
 #include "platform/desktop/desktop.h"
@@ -96,15 +97,13 @@ void offerUnsaved()
     }
 }
 
-void aboutToDelete(qint64 id)
+void deleteRecord(qint64 id)
 {
-    if (auto *editor = find<CdEditor>(id))
+    const QPointer<CdEditor> editor = find<CdEditor>(id);
+    if (editor)
         editor->keepForAnew();
-}
-
-void deleted(qint64 id)
-{
-    if (auto *editor = find<CdEditor>(id))
+    browserlists::deleteTitle(id);
+    if (editor)
         editor->recordDeleted();
 }
 

@@ -16,10 +16,9 @@ void editAlbum(qint64 id);
 /// Brings up the editor of a record at one of its tracks, both counted from 1.
 void editTrack(bool isCompilation, qint64 id, int disc, int track);
 
-/// Before a record is deleted, in the same transaction, and behind it: its editor keeps what it
-/// does not show, and knows that the record is gone. Throws Error.
-void aboutToDelete(qint64 id);
-void deleted(qint64 id);
+/// Deletes a record. An editor that is open on it keeps what it does not show, and knows that the
+/// record is gone. Throws Error.
+void deleteRecord(qint64 id);
 
 /// Offers what earlier runs have not saved, one after the other. What is not wanted is gone then.
 void offerUnsaved();

@@ -10,6 +10,7 @@
 #include "controls/list/listcolumns.h"
 #include "platform/desktop/desktop.h"
 #include "platform/text/textrules.h"
+#include "platform/work/longwork.h"
 #include "reports/reports.h"
 #include "services/captions.h"
 #include "services/frame.h"
@@ -408,6 +409,8 @@ void frmCDList::cmdUpdate_Click()
 
 void frmCDList::cmdDelete_Click()
 {
+    if (!LongWork::mayBegin(*this))
+        return;
     if (mUi->CDTab->currentIndex() == MP3Collections)
         DeleteMP3Collection();
     else
@@ -437,7 +440,7 @@ void frmCDList::DeleteCD()
 {
     ListPage *page = current();
     if (page && askYesNo(GetMessage("QuestDelete"), GetMessage("Delete")) == vbYes)
-        deleteSelected(*page, browserlists::deleteTitle);
+        deleteSelected(*page, editors::deleteRecord);
     // By design: also after a no. What nothing points at goes, whoever left it.
     CleanOrphans();
     releaseFrame();

@@ -1,7 +1,7 @@
 // Label: screen
 #include "catalogue/cleanorphans.h"
 #include "catalogue/quoting.h"
-#include "collection/browserlists.h"
+#include "collection/editors.h"
 #include "collection/frmCDRoot.h"
 #include "collection/frmCDRootE.h"
 #include "platform/ado/connection.h"
@@ -257,7 +257,7 @@ private:
         if (mShown.isNew || mShown.isLost || !mPicture.contains(id) || random(3) > 0)
             return;
         const Record before = mPicture[id];
-        browserlists::deleteTitle(id);
+        editors::deleteRecord(id);
         CleanOrphans();
         mPicture.erase(id);
         mShown.isLost = true;

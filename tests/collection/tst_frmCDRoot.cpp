@@ -1,5 +1,5 @@
 // Label: screen
-#include "collection/browserlists.h"
+#include "collection/editors.h"
 #include "collection/frmCDRoot.h"
 #include "platform/ado/connection.h"
 #include "support/editing.h"
@@ -497,7 +497,7 @@ private slots:
     void aRecordDeletedInTheBrowser()
     {
         openThree();
-        browserlists::deleteTitle(3);
+        editors::deleteRecord(3);
         mE->catalogue.exec("insert into CDTitels values (3,'It''s 100%1',null,'V','Rock',1999);"
                            "insert into CompactDiscs values (9,3,2,1,1,null)");
         const QStringList retyped = three();
