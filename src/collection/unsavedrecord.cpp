@@ -1,5 +1,7 @@
 #include "collection/unsavedrecord.h"
 
+#include "catalogue/discnumber.h"
+
 #include <QJsonArray>
 
 using namespace Qt::StringLiterals;
@@ -8,7 +10,6 @@ namespace
 {
 
 constexpr int version = 1;
-constexpr int mostDiscs = 10000;
 
 QJsonArray jsonOf(const QList<StoredTrack> &tracks)
 {
@@ -64,11 +65,11 @@ std::optional<UnsavedRecord> UnsavedRecord::fromJson(const QJsonObject &object)
     const QJsonArray header = object.value("header"_L1).toArray();
     record.header = {header.at(0).toString(), header.at(1).toString(), header.at(2).toString(),
                      header.at(3).toString()};
-    record.disc = qBound(1, object.value("disc"_L1).toInt(), mostDiscs);
+    record.disc = qBound(1, object.value("disc"_L1).toInt(), highestDisc);
     record.tracks = tracksIn(object.value("tracks"_L1).toArray());
     const QJsonObject others = object.value("others"_L1).toObject();
     for (auto other = others.begin(); other != others.end(); ++other)
-        record.otherDiscs[qBound(1, other.key().toInt(), mostDiscs)] =
+        record.otherDiscs[qBound(1, other.key().toInt(), highestDisc)] =
             tracksIn(other.value().toArray());
     return record;
 }
