@@ -81,8 +81,7 @@ Connection::Connection() = default;
 
 Connection::~Connection()
 {
-    if (mEngine)
-        Close();
+    disconnect();
 }
 
 QString Connection::dataSource(const QString &connectionString)
@@ -168,6 +167,13 @@ void Connection::Open(const QString &, const QString &, const QString &connectio
 void Connection::Close()
 {
     requireOpen();
+    disconnect();
+}
+
+void Connection::disconnect() noexcept
+{
+    if (!mEngine)
+        return;
     for (Transaction *routine : mEngine->routines)
         routine->mRunning = false;
     mEngine.reset();

@@ -109,6 +109,7 @@ private:
     void check(int code);
     sqlite3 *handle() const; // null while closed
     void requireOpen() const;
+    void disconnect() noexcept;
     void settleBefore(bool readOnly);
     void requireKept() const; // that the engine has not taken an open transaction back
     void begin(class Transaction *owner);
