@@ -26,7 +26,7 @@ QProcess *makeOpener()
 
 } // namespace
 
-void openInBrowser(const QString &url, std::function<void()> notOpened)
+void openInBrowser(const QString &url, const std::function<void()> &notOpened)
 {
     QProcess *opener = makeOpener();
     QElapsedTimer since;
