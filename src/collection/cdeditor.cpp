@@ -449,6 +449,7 @@ void CdEditor::keepCopy()
 {
     if (isBusy())
         return;
+    mDropCopy = false; // of a close that did not come about
     if (isChanged())
         mCopy.keep(unsaved());
     else

@@ -6,7 +6,10 @@
 
 #include <QApplication>
 #include <QClipboard>
+#include <QFileInfo>
 #include <QPushButton>
+#include <QScopedValueRollback>
+#include <QTimer>
 #include <ctime>
 
 namespace
@@ -567,6 +570,26 @@ private slots:
         QCOMPARE(mE->tabs()->count(), 3);
         QCOMPARE(mE->tabs()->currentIndex(), 0);
         QCOMPARE(mE->cell(1, 3), u"One"_s);
+    }
+
+    // Another screen refused to go, so typing went on: the No is none for what came later.
+    void aNoCountsForThatCloseAlone()
+    {
+        struct Refusing : Form {
+            Refusing() : Form(u"frmRefusing"_s) {}
+            bool QueryUnload() override { return false; }
+        };
+        const QScopedValueRollback<QString> path(gDatabasePath, mE->catalogue.file());
+        CdEditor *editor = openThree();
+        const auto refusing = std::make_unique<Refusing>();
+        mE->field("txtTitel")->setText(u"Given up"_s);
+        mE->desktop.expectBox(GetMessage("QuestSaveChanges"), vbNo);
+        QVERIFY(!Form::UnloadAll({}));
+        mE->field("txtTitel")->setText(u"Typed later"_s);
+        editor->findChild<QTimer *>(u"RecoveryTimer"_s)->setInterval(0);
+        QTRY_VERIFY(QFileInfo::exists(mE->catalogue.path("Unsaved")));
+        QVERIFY(Form::UnloadAll({}, true));
+        QVERIFY(QFileInfo::exists(mE->catalogue.path("Unsaved")));
     }
 };
 
