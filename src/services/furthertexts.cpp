@@ -121,6 +121,7 @@ const Message furtherTexts[] = {
     {"xErrNoCatalogue", "The file is not a catalogue of this program.", "Het bestand is geen database van dit programma."},
     {"xErrDisk", "The disk reported an error.", "De schijf meldt een fout."},
     {"xErrMemory", "There is not enough memory.", "Er is niet genoeg geheugen."},
+    {"xServiceTakesNone", "This service takes no discs from here.", "Deze dienst neemt hiervandaan geen CD's aan."},
 };
 // clang-format on
 

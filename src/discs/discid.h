@@ -1,0 +1,15 @@
+#pragma once
+
+#include "discs/toc.h"
+
+/// The id of a disc at CDDB-type services: 8 hexadecimal digits. Data tracks count.
+QString cddbId(const TableOfContents &toc);
+
+/// The arguments of a query there: id, number of tracks, offsets, seconds; blanks between.
+QString cddbQuery(const TableOfContents &toc);
+
+/// The id of a disc at MusicBrainz: 28 characters. Data tracks at the end do not count.
+QString musicBrainzId(const TableOfContents &toc);
+
+/// The table as MusicBrainz takes it: first, last, lead-out, offsets; blanks between.
+QString musicBrainzToc(const TableOfContents &toc);

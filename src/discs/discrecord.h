@@ -1,0 +1,62 @@
+#pragma once
+
+#include <QDate>
+#include <QString>
+#include <QStringList>
+#include <vector>
+
+/// A name as printed and, of a person, in its parts; the parts are empty for groups and where a
+/// service does not tell them.
+struct ArtistName {
+    QString name;
+    QString first, last;
+    bool operator==(const ArtistName &) const = default;
+};
+
+struct TrackRecord {
+    QString title;
+    ArtistName artist; // the disc's where the track has none of its own
+    QString year;      // four digits or empty
+    QString genre;     // name or empty
+    QString notes;
+    int length = -1; // milliseconds; -1 unknown
+    bool operator==(const TrackRecord &) const = default;
+};
+
+/// What is known of a disc: a record of a service, one of its candidates (whose tracks may still be
+/// missing), or what the user has typed. Texts hold no control signs.
+struct DiscRecord {
+    QString title;
+    ArtistName artist;
+    QString year; // four digits or empty
+    QString genre;
+    QString numberInSet = QStringLiteral("1"), totalInSet = QStringLiteral("1");
+    bool isCompilation = false;
+    std::vector<TrackRecord> tracks;
+    QString notes;
+
+    // What else a list of candidates shows.
+    QString label, country, barcode;
+    int trackCount = 0;
+
+    // Where it comes from: the service's name, and what it finds the whole record by. Both keys are
+    // empty where the record is whole.
+    QString service;
+    QString keyA; // category, or release
+    QString keyB; // disc id, or number of the medium
+
+    // Of a record of a CDDB server, for sending it back.
+    QString category;
+    QStringList discIds;
+    int revision = -1; // -1: not known there
+
+    bool isWhole() const { return keyA.isEmpty() && keyB.isEmpty(); }
+    bool operator==(const DiscRecord &) const = default;
+};
+
+/// Words that a search goes by; those that are empty do not count.
+struct SearchWords {
+    QString artist, title, barcode;
+    bool isEmpty() const { return artist.isEmpty() && title.isEmpty() && barcode.isEmpty(); }
+    bool operator==(const SearchWords &) const = default;
+};

@@ -1,0 +1,26 @@
+#pragma once
+
+#include "discs/discrecord.h"
+#include "discs/toc.h"
+
+#include <QByteArray>
+
+/// What an answer of the web service in JSON says. All throw Error (errSyntax) where it is none of
+/// theirs: cut off, HTML, another shape.
+
+/// An answer to a look-up by disc id or, for a disc that is not known there, by the lengths of its
+/// tracks (the nearest first, those too far off left out). Whole where tracks are listed.
+std::vector<DiscRecord> musicBrainzDiscs(const QByteArray &json, const TableOfContents &toc);
+
+/// One medium of a release; the numbers are those of the set, from 1.
+DiscRecord musicBrainzRelease(const QByteArray &json, int medium);
+
+/// The hits of a search for releases: candidates with both keys, release and medium. One of several
+/// media gives a candidate for each.
+std::vector<DiscRecord> musicBrainzSearch(const QByteArray &json);
+
+/// The text of an "error" answer; empty if there is none.
+QString musicBrainzError(const QByteArray &json);
+
+/// The search text for these words, its special signs escaped; not yet encoded for an address.
+QString musicBrainzQuery(const SearchWords &words);
