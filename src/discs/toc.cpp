@@ -9,11 +9,6 @@ constexpr int mostTracks = 99;
 constexpr int mostFrames = 100 * 60 * framesPerSecond;
 constexpr int millisecondsPerSecond = 1000;
 
-int framesOf(qint64 milliseconds)
-{
-    return int(milliseconds * framesPerSecond / millisecondsPerSecond);
-}
-
 } // namespace
 
 bool TableOfContents::isValid() const
@@ -45,16 +40,22 @@ std::vector<int> TableOfContents::lengths() const
     return all;
 }
 
+int framesOfSound(qint64 milliseconds)
+{
+    constexpr int rounding = framesPerSecond / 2 + 1; // half a millisecond
+    return int((milliseconds * framesPerSecond + millisecondsPerSecond - 1 - rounding) /
+               millisecondsPerSecond);
+}
+
 std::optional<TableOfContents> tocOfLengths(const std::vector<int> &milliseconds)
 {
     TableOfContents toc;
-    qint64 passed = 0;
+    toc.leadOut = firstFrame;
     for (const int length : milliseconds) {
-        toc.tracks.push_back({firstFrame + framesOf(passed)});
-        passed += std::max(length, 0);
-        if (framesOf(passed) > mostFrames)
+        toc.tracks.push_back({toc.leadOut});
+        toc.leadOut += framesOfSound(std::max(length, 0));
+        if (toc.leadOut > mostFrames)
             return std::nullopt;
     }
-    toc.leadOut = firstFrame + framesOf(passed);
     return toc.isValid() ? std::optional(toc) : std::nullopt;
 }

@@ -34,6 +34,10 @@ struct TableOfContents {
 constexpr int framesPerSecond = 75;
 constexpr int firstFrame = 150; // the two seconds before block 0
 
+/// The frames that a sound of this length in milliseconds takes: a started one counts, the rounding
+/// of the last millisecond does not.
+int framesOfSound(qint64 milliseconds);
+
 /// The disc that files of these playing times (milliseconds) would make, one behind the other;
 /// nothing where no disc can have it.
 std::optional<TableOfContents> tocOfLengths(const std::vector<int> &milliseconds);

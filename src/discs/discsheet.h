@@ -1,0 +1,38 @@
+#pragma once
+
+#include "discs/discrecord.h"
+#include "discs/toc.h"
+
+#include <functional>
+#include <optional>
+
+/// What the sheet beside the image of a disc says: a cue sheet, or a text of cdrdao.
+struct DiscSheet {
+    TableOfContents toc; // no tracks where a file that counts could not be measured
+    DiscRecord known;    // titles and names; trackCount holds whatever became of the table
+    QString missing;     // the first file that could not be measured
+};
+
+enum class LengthIn { Bytes, Frames };
+
+/// Measures a file that a sheet names: in bytes where it holds raw sectors, in frames of 1/75 s
+/// where it is sound in a format of its own. Nothing if there is no such file.
+using LengthOfFile = std::function<std::optional<qint64>(const QString &name, LengthIn unit)>;
+
+namespace discsheet
+{
+
+/// "mm:ss:ff" as frames; nothing if it is none.
+std::optional<qint64> framesOf(const QString &minutesSecondsFrames);
+
+/// A text of a sheet as a record has it.
+QString plain(const QString &text);
+
+/// The year of a date; empty if there is none.
+QString yearIn(const QString &date);
+
+/// Fills in what follows from the rest: whose the tracks are, how long they are, how many, and
+/// whether it is a compilation. False if no disc can have such a table.
+bool complete(DiscSheet &sheet);
+
+} // namespace discsheet
