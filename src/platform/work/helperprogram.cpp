@@ -2,7 +2,11 @@
 
 #include "platform/work/longwork.h"
 
+#include <QCoreApplication>
+#include <QDir>
 #include <sys/resource.h>
+
+using namespace Qt::StringLiterals;
 
 namespace
 {
@@ -15,6 +19,12 @@ void limit(int what, qint64 to)
 }
 
 } // namespace
+
+QString HelperProgram::placeOf(const QString &name)
+{
+    return QDir::cleanPath(QCoreApplication::applicationDirPath() + u"/../libexec/songcase/"_s +
+                           name);
+}
 
 HelperProgram::HelperProgram(LongWork &work, const QString &program, const QStringList &arguments,
                              const Limits &limits)

@@ -21,6 +21,9 @@ public:
         int work = 600;                    // seconds of the processor
     };
 
+    /// Where a program of ours is: from the place of this one, so that both can be moved.
+    static QString placeOf(const QString &name);
+
     HelperProgram(LongWork &work, const QString &program, const QStringList &arguments,
                   const Limits &limits);
     ~HelperProgram() override;
