@@ -121,6 +121,15 @@ const Message furtherTexts[] = {
     {"xErrNoCatalogue", "The file is not a catalogue of this program.", "Het bestand is geen database van dit programma."},
     {"xErrDisk", "The disk reported an error.", "De schijf meldt een fout."},
     {"xErrMemory", "There is not enough memory.", "Er is niet genoeg geheugen."},
+    {"xDiscReading", "The disc is being read...", "De CD wordt gelezen..."},
+    {"xDiscFileUnreadable", "This file cannot be read: ", "Dit bestand kan niet worden gelezen: "},
+    {"xDiscNoTable", "There is no table of contents of an audio CD in this file: ", "In dit bestand staat geen inhoudsopgave van een audio-CD: "},
+    {"xDiscNoSheet", "An image needs its cue sheet beside it, with the same name: ", "Naast een CD-image hoort een cue-bestand met dezelfde naam te staan: "},
+    {"xDiscImageMissing", "The sheet names a file that is not there, or that cannot be read: ", "De cue- of toc-tekst noemt een bestand dat er niet is, of dat niet kan worden gelezen: "},
+    {"xDiscNoSound", "There are no sound files in this folder: ", "Er staan geen geluidsbestanden in deze map: "},
+    {"xDiscTooLong", "The sound files of this folder do not fit on one CD: ", "De geluidsbestanden in deze map passen niet op één CD: "},
+    {"xDiscTooSlow", "This does not answer, and was given up: ", "Er komt geen antwoord; het lezen is gestopt: "},
+    {"xDiscNoHelper", "A part of the program is missing. Please install it again: ", "Een onderdeel van het programma ontbreekt. Installeer het opnieuw: "},
     {"xServiceTakesNone", "This service takes no discs from here.", "Deze dienst neemt hiervandaan geen CD's aan."},
 };
 // clang-format on

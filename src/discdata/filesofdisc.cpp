@@ -1,0 +1,230 @@
+#include "discdata/filesofdisc.h"
+
+#include "discs/cuesheet.h"
+#include "discs/tocsheet.h"
+#include "tags/playingtime.h"
+
+#include <QCollator>
+#include <QDir>
+#include <QFile>
+#include <QFileInfo>
+#include <QRegularExpression>
+#include <QSet>
+
+using namespace Qt::StringLiterals;
+
+namespace
+{
+
+constexpr qint64 largestSheet = 1 << 20; // bytes; an image with the ending of a sheet is larger
+constexpr int longestName = 255;         // of a file, in what is shown
+constexpr int mostFiles = 999;           // of a folder; more than that is no disc
+
+FoundDisc nothing(const char *problem, const QString &about)
+{
+    return {{}, 0, problem, QDir::toNativeSeparators(about), false};
+}
+
+FoundDisc found(const DiscSheet &sheet)
+{
+    FoundDisc disc;
+    disc.toc.toc = sheet.toc;
+    disc.toc.known = sheet.known;
+    if (sheet.toc.tracks.empty())
+        disc.toc.words = {sheet.known.artist.name, sheet.known.title, sheet.known.barcode};
+    if (sheet.toc.tracks.empty() && disc.toc.words.isEmpty())
+        return nothing("xDiscImageMissing", discsheet::plain(sheet.missing.left(longestName)));
+    disc.tracks = sheet.known.trackCount;
+    return disc;
+}
+
+bool isFile(const QString &name)
+{
+    return QFileInfo(name).isFile(); // not so for pipes and devices
+}
+
+/// Finds the files that a sheet names. They have often been moved or converted since.
+class SheetFolder
+{
+public:
+    explicit SheetFolder(const QString &sheet)
+        : mSheet(sheet), mFolder(mSheet.dir()), mNames(mFolder.entryList(QDir::Files, QDir::Name))
+    {
+    }
+    std::optional<qint64> lengthOf(const QString &name, LengthIn unit) const;
+
+private:
+    QString find(const QString &name, LengthIn unit) const;
+    QString like(const QString &base, const QString &ending, LengthIn unit) const;
+
+    QFileInfo mSheet;
+    QDir mFolder;
+    QStringList mNames;
+};
+
+// In any case of letters, and with any ending of the kind if there is none with that one.
+QString SheetFolder::like(const QString &base, const QString &ending, LengthIn unit) const
+{
+    QString other;
+    for (const QString &name : mNames) {
+        const QFileInfo file(name);
+        if (file.completeBaseName().compare(base, Qt::CaseInsensitive) != 0)
+            continue;
+        if (file.suffix().compare(ending, Qt::CaseInsensitive) == 0)
+            return mFolder.filePath(name);
+        if (unit == LengthIn::Frames && isSoundFile(name))
+            other = mFolder.filePath(name);
+    }
+    return other;
+}
+
+QString SheetFolder::find(const QString &name, LengthIn unit) const
+{
+    if (const QString exact = mFolder.filePath(name); isFile(exact))
+        return exact;
+    const QFileInfo plain(QString(name).replace(u'\\', u'/'));
+    if (const QString below = mFolder.filePath(plain.filePath()); isFile(below))
+        return below;
+    const QString similar = like(plain.completeBaseName(), plain.suffix(), unit);
+    return similar.isEmpty() ? like(mSheet.completeBaseName(), plain.suffix(), unit) : similar;
+}
+
+std::optional<qint64> SheetFolder::lengthOf(const QString &name, LengthIn unit) const
+{
+    const QString file = find(name, unit);
+    if (file.isEmpty())
+        return {};
+    if (unit == LengthIn::Bytes)
+        return QFileInfo(file).size();
+    const auto sound = readSoundFile(file);
+    return sound ? std::optional<qint64>(framesOfSound(sound->length)) : std::nullopt;
+}
+
+struct RippedFile {
+    QString name;
+    SoundFile sound;
+};
+
+bool haveNumbers(const std::vector<RippedFile> &files)
+{
+    QSet<int> numbers;
+    for (const RippedFile &file : files)
+        numbers.insert(file.sound.track);
+    return !numbers.contains(0) && numbers.size() == qsizetype(files.size());
+}
+
+// "2 Second" stands before "10 Tenth".
+void sortAsTracks(std::vector<RippedFile> &files)
+{
+    QCollator order(QLocale(QLocale::English)); // that of C knows no numbers
+    order.setNumericMode(true);
+    order.setCaseSensitivity(Qt::CaseInsensitive);
+    if (haveNumbers(files))
+        std::ranges::sort(files, {}, [](const RippedFile &file) { return file.sound.track; });
+    else
+        std::ranges::sort(files, [&](const RippedFile &a, const RippedFile &b) {
+            return order.compare(a.name, b.name) < 0;
+        });
+}
+
+TrackRecord trackOf(const RippedFile &file)
+{
+    static const QRegularExpression number(u"^[0-9]{1,3}[ ._-]+"_s);
+    TrackRecord track;
+    track.title = discsheet::plain(file.sound.title);
+    if (track.title.isEmpty())
+        track.title = discsheet::plain(QFileInfo(file.name).completeBaseName().remove(number));
+    track.artist.name = discsheet::plain(file.sound.artist);
+    return track;
+}
+
+// What all files say alike; else nothing.
+template <typename Value>
+Value common(const std::vector<RippedFile> &files, Value SoundFile::*value)
+{
+    const Value first = files.front().sound.*value;
+    const bool same = std::ranges::all_of(
+        files, [&](const RippedFile &file) { return file.sound.*value == first; });
+    return same ? first : Value();
+}
+
+std::optional<DiscSheet> discOf(const std::vector<RippedFile> &files)
+{
+    DiscSheet sheet;
+    std::vector<int> lengths;
+    for (const RippedFile &file : files) {
+        lengths.push_back(file.sound.length);
+        sheet.known.tracks.push_back(trackOf(file));
+    }
+    const auto toc = tocOfLengths(lengths);
+    if (!toc)
+        return {};
+    sheet.toc = *toc;
+    sheet.known.title = discsheet::plain(common(files, &SoundFile::album));
+    sheet.known.genre = discsheet::plain(common(files, &SoundFile::genre));
+    sheet.known.year = discsheet::yearIn(QString::number(common(files, &SoundFile::year)));
+    return discsheet::complete(sheet) ? std::optional(sheet) : std::nullopt;
+}
+
+std::vector<RippedFile> soundFilesIn(const QDir &folder, const std::stop_token &stop)
+{
+    std::vector<RippedFile> files;
+    for (const QString &name : folder.entryList(QDir::Files, QDir::Name)) {
+        if (stop.stop_requested() || files.size() > mostFiles)
+            break;
+        if (!isSoundFile(name))
+            continue;
+        if (const auto sound = readSoundFile(folder.filePath(name)))
+            files.push_back({name, *sound});
+    }
+    return files;
+}
+
+} // namespace
+
+FoundDisc readSheetFile(const QString &name)
+{
+    QFile file(name);
+    if (!isFile(name) || !file.open(QIODevice::ReadOnly))
+        return nothing("xDiscFileUnreadable", name);
+    const QByteArray bytes = file.read(largestSheet + 1);
+    if (bytes.size() > largestSheet)
+        return nothing("xDiscNoTable", name);
+    const SheetFolder folder(name);
+    const LengthOfFile lengthOf = [&folder](const QString &named, LengthIn unit) {
+        return folder.lengthOf(named, unit);
+    };
+    const bool isCue = QFileInfo(name).suffix().compare(u"cue", Qt::CaseInsensitive) == 0;
+    const auto sheet = isCue ? readCueSheet(bytes, lengthOf) : readTocSheet(bytes, lengthOf);
+    return sheet ? found(*sheet) : nothing("xDiscNoTable", name);
+}
+
+FoundDisc readSoundFolder(const QString &name, const std::stop_token &stop)
+{
+    const QDir folder(name);
+    const QStringList sheets = folder.entryList({u"*.cue"_s}, QDir::Files);
+    if (sheets.size() == 1) {
+        const FoundDisc disc = readSheetFile(folder.filePath(sheets.first()));
+        if (!disc.toc.toc.tracks.empty())
+            return disc;
+    }
+    std::vector<RippedFile> files = soundFilesIn(folder, stop);
+    if (files.empty())
+        return nothing("xDiscNoSound", name);
+    sortAsTracks(files);
+    const auto sheet = discOf(files);
+    return sheet ? found(*sheet) : nothing("xDiscTooLong", name);
+}
+
+QString sheetBeside(const QString &image)
+{
+    const QFileInfo file(image);
+    for (const QString &ending : {u"cue"_s, u"toc"_s}) {
+        for (const QString &base : {file.completeBaseName(), file.fileName()}) {
+            const QStringList names = file.dir().entryList({base + u'.' + ending}, QDir::Files);
+            if (!names.isEmpty())
+                return file.dir().filePath(names.first());
+        }
+    }
+    return {};
+}

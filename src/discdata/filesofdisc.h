@@ -1,0 +1,19 @@
+#pragma once
+
+#include "discdata/founddisc.h"
+
+#include <stop_token>
+
+// Discs as files of the user. These read many files and take their time: for a worker.
+
+/// A cue sheet or a text of cdrdao, told apart by the ending. Where its image is missing, the
+/// names in it are words to search by.
+FoundDisc readSheetFile(const QString &name);
+
+/// The sound files of a folder, as the tracks of one disc: in the order of the numbers in their
+/// tags if all have one, else of their names. A cue sheet that lies there alone tells more, and is
+/// read instead.
+FoundDisc readSoundFolder(const QString &folder, const std::stop_token &stop);
+
+/// The sheet that describes an image; empty if none lies beside it.
+QString sheetBeside(const QString &image);
