@@ -10,10 +10,9 @@ namespace
 
 using End = HelperProgram::End;
 
-// A disc is some hundred short lines. An image is read at once; a drive has to spin up.
-constexpr qint64 memory = qint64(256) << 20, output = 1 << 20; // bytes
-constexpr HelperProgram::Limits imageLimits{memory, output, 15, 15};
-constexpr HelperProgram::Limits driveLimits{memory, output, 60, 30};
+// A disc is some hundred short lines, and hardly any work.
+constexpr qint64 mostMemory = qint64(256) << 20, mostOutput = 1 << 20; // bytes
+constexpr int mostWork = 15;                                           // seconds
 
 class Answer
 {
@@ -101,29 +100,28 @@ FoundDisc found(Answer &answer, End end)
     return disc;
 }
 
-FoundDisc ask(LongWork &work, const QString &program, const QStringList &arguments,
-              const HelperProgram::Limits &limits)
+} // namespace
+
+FoundDisc DiscReader::ask(const QStringList &arguments)
 {
-    HelperProgram helper(work, program, arguments, limits);
+    HelperProgram helper(mWork, mProgram, arguments, {mostMemory, mostOutput, mPatience, mostWork});
     Answer answer;
     while (const auto line = helper.line())
         answer.take(*line);
     FoundDisc disc = found(answer, helper.end());
-    disc.about = helper.end() == End::NotStarted ? program : arguments.last();
+    disc.about = helper.end() == End::NotStarted ? mProgram : arguments.last();
     return disc;
 }
 
-} // namespace
-
 FoundDisc DiscReader::readImage(const QString &file)
 {
-    FoundDisc disc = ask(mWork, mProgram, {u"image"_s, file}, imageLimits);
-    if (disc.tracks == 0 && !disc.problem)
+    FoundDisc disc = ask({u"image"_s, file});
+    if (disc.tracks == 0 && !disc.problem && !disc.cancelled)
         disc.problem = "xDiscNoTable";
     return disc;
 }
 
 FoundDisc DiscReader::readDrive(const QString &device)
 {
-    return ask(mWork, mProgram, {u"drive"_s, device}, driveLimits);
+    return ask({u"drive"_s, device});
 }

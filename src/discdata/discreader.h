@@ -9,12 +9,19 @@ class LongWork;
 class DiscReader
 {
 public:
-    DiscReader(LongWork &work, const QString &program) : mWork(work), mProgram(program) {}
+    /// patience: the seconds that it may be silent.
+    DiscReader(LongWork &work, const QString &program, int patience)
+        : mWork(work), mProgram(program), mPatience(patience)
+    {
+    }
 
     FoundDisc readImage(const QString &file);
     FoundDisc readDrive(const QString &device);
 
 private:
+    FoundDisc ask(const QStringList &arguments);
+
     LongWork &mWork;
     const QString mProgram;
+    const int mPatience;
 };

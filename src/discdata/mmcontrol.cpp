@@ -92,7 +92,7 @@ FoundDisc MMControl::read(LongWork &work) const
         return {};
     if (QFileInfo(name).isDir())
         return inWorker(work, [name](std::stop_token stop) { return readSoundFolder(name, stop); });
-    DiscReader disc(work, reader);
+    DiscReader disc(work, reader, patience);
     if (!isImage(name))
         return disc.readDrive(name);
     if (isNero(name) && QFileInfo(name).isFile())

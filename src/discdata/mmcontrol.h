@@ -33,8 +33,9 @@ public:
     /// Whether the user had enough of waiting.
     bool wasCancelled() const { return mFound.cancelled; }
 
-    /// The program that reads drives and images.
+    /// The program that reads drives and images, and how long it may be silent.
     QString reader;
+    int patience = 60; // seconds
 
 private:
     void open();
