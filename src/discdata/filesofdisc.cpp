@@ -51,15 +51,17 @@ public:
         : mSheet(sheet), mFolder(mSheet.dir()), mNames(mFolder.entryList(QDir::Files, QDir::Name))
     {
     }
-    std::optional<qint64> lengthOf(const QString &name, LengthIn unit) const;
+    std::optional<qint64> lengthOf(const QString &name, LengthIn unit);
 
 private:
+    std::optional<qint64> measure(const QString &name, LengthIn unit) const;
     QString find(const QString &name, LengthIn unit) const;
     QString like(const QString &base, const QString &ending, LengthIn unit) const;
 
     QFileInfo mSheet;
     QDir mFolder;
     QStringList mNames;
+    QHash<QString, std::optional<qint64>> mLengths; // a file may be named for each track
 };
 
 // In any case of letters, and with any ending of the kind if there is none with that one.
@@ -89,7 +91,14 @@ QString SheetFolder::find(const QString &name, LengthIn unit) const
     return similar.isEmpty() ? like(mSheet.completeBaseName(), plain.suffix(), unit) : similar;
 }
 
-std::optional<qint64> SheetFolder::lengthOf(const QString &name, LengthIn unit) const
+std::optional<qint64> SheetFolder::lengthOf(const QString &name, LengthIn unit)
+{
+    if (!mLengths.contains(name))
+        mLengths[name] = measure(name, unit);
+    return mLengths[name];
+}
+
+std::optional<qint64> SheetFolder::measure(const QString &name, LengthIn unit) const
 {
     const QString file = find(name, unit);
     if (file.isEmpty())
@@ -166,7 +175,9 @@ std::optional<DiscSheet> discOf(const std::vector<RippedFile> &files)
     return discsheet::complete(sheet) ? std::optional(sheet) : std::nullopt;
 }
 
-std::vector<RippedFile> soundFilesIn(const QDir &folder, const std::stop_token &stop)
+// One that cannot be read is told: without it the others would be another disc.
+std::vector<RippedFile> soundFilesIn(const QDir &folder, const std::stop_token &stop,
+                                     QString &unreadable)
 {
     std::vector<RippedFile> files;
     for (const QString &name : folder.entryList(QDir::Files, QDir::Name)) {
@@ -174,8 +185,10 @@ std::vector<RippedFile> soundFilesIn(const QDir &folder, const std::stop_token &
             break;
         if (!isSoundFile(name))
             continue;
-        if (const auto sound = readSoundFile(folder.filePath(name)))
-            files.push_back({name, *sound});
+        const auto sound = readSoundFile(folder.filePath(name));
+        if (!sound && unreadable.isEmpty())
+            unreadable = folder.filePath(name);
+        files.push_back({name, sound.value_or(SoundFile())});
     }
     return files;
 }
@@ -190,7 +203,7 @@ FoundDisc readSheetFile(const QString &name)
     const QByteArray bytes = file.read(largestSheet + 1);
     if (bytes.size() > largestSheet)
         return nothing("xDiscNoTable", name);
-    const SheetFolder folder(name);
+    SheetFolder folder(name);
     const LengthOfFile lengthOf = [&folder](const QString &named, LengthIn unit) {
         return folder.lengthOf(named, unit);
     };
@@ -208,7 +221,10 @@ FoundDisc readSoundFolder(const QString &name, const std::stop_token &stop)
         if (!disc.toc.toc.tracks.empty())
             return disc;
     }
-    std::vector<RippedFile> files = soundFilesIn(folder, stop);
+    QString unreadable;
+    std::vector<RippedFile> files = soundFilesIn(folder, stop, unreadable);
+    if (!unreadable.isEmpty())
+        return nothing("xDiscFileUnreadable", unreadable);
     if (files.empty())
         return nothing("xDiscNoSound", name);
     sortAsTracks(files);

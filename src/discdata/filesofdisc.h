@@ -12,7 +12,7 @@ FoundDisc readSheetFile(const QString &name);
 
 /// The sound files of a folder, as the tracks of one disc: in the order of the numbers in their
 /// tags if all have one, else of their names. A cue sheet that lies there alone tells more, and is
-/// read instead.
+/// read instead. All of them must be readable.
 FoundDisc readSoundFolder(const QString &folder, const std::stop_token &stop);
 
 /// The sheet that describes an image; empty if none lies beside it.

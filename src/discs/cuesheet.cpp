@@ -1,7 +1,5 @@
 #include "discs/cuesheet.h"
 
-#include "platform/text/codepage.h"
-
 #include <QHash>
 #include <QRegularExpression>
 
@@ -10,6 +8,7 @@ using namespace Qt::StringLiterals;
 namespace
 {
 
+constexpr size_t mostFiles = 200;
 constexpr int soundSector = 2352;                      // bytes
 constexpr int largestSector = 2448;                    // with the bytes of subchannels
 constexpr qint64 betweenSessions = (90 + 60 + 2) * 75; // lead-out, lead-in, gap; in frames
@@ -112,7 +111,10 @@ void CueReader::file(const QString &rest)
     if (!mFiles.empty() && mFiles.back().name == name)
         return; // named once for each track
     const bool raw = type.isEmpty() || type == "BINARY"_L1 || type == "MOTOROLA"_L1;
-    mFiles.push_back({name, raw ? LengthIn::Bytes : LengthIn::Frames, {}});
+    if (mFiles.size() == mostFiles)
+        mDamaged = true;
+    else
+        mFiles.push_back({name, raw ? LengthIn::Bytes : LengthIn::Frames, {}});
 }
 
 void CueReader::track(const QString &rest)
@@ -283,8 +285,7 @@ std::optional<DiscSheet> CueReader::result()
 
 std::optional<DiscSheet> readCueSheet(QByteArrayView bytes, const LengthOfFile &lengthOf)
 {
-    const QByteArrayView content = text::withoutByteOrderMark(bytes);
     CueReader reader(lengthOf);
-    reader.read(text::decode(content, text::encodingOf(content)));
+    reader.read(discsheet::decoded(bytes));
     return reader.result();
 }

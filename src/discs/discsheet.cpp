@@ -1,7 +1,10 @@
 #include "discs/discsheet.h"
 
+#include "platform/text/codepage.h"
+
 #include <QRegularExpression>
 #include <QSet>
+#include <QStringConverter>
 
 using namespace Qt::StringLiterals;
 
@@ -23,6 +26,15 @@ QSet<QString> artistsOf(const DiscRecord &disc)
 }
 
 } // namespace
+
+QString decoded(QByteArrayView bytes)
+{
+    const auto marked = QStringConverter::encodingForData(bytes);
+    if (marked && *marked != QStringConverter::Utf8)
+        return QStringDecoder(*marked).decode(bytes);
+    const QByteArrayView content = text::withoutByteOrderMark(bytes);
+    return text::decode(content, text::encodingOf(content));
+}
 
 std::optional<qint64> framesOf(const QString &minutesSecondsFrames)
 {

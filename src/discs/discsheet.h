@@ -3,6 +3,7 @@
 #include "discs/discrecord.h"
 #include "discs/toc.h"
 
+#include <QByteArrayView>
 #include <functional>
 #include <optional>
 
@@ -21,6 +22,9 @@ using LengthOfFile = std::function<std::optional<qint64>(const QString &name, Le
 
 namespace discsheet
 {
+
+/// The text of a sheet: UTF-16 or UTF-8 by their mark, else UTF-8 or Windows-1252.
+QString decoded(QByteArrayView bytes);
 
 /// "mm:ss:ff" as frames; nothing if it is none.
 std::optional<qint64> framesOf(const QString &minutesSecondsFrames);

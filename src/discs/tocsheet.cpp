@@ -1,7 +1,5 @@
 #include "discs/tocsheet.h"
 
-#include "platform/text/codepage.h"
-
 #include <QRegularExpression>
 
 using namespace Qt::StringLiterals;
@@ -335,7 +333,6 @@ std::optional<DiscSheet> TocReader::read()
 
 std::optional<DiscSheet> readTocSheet(QByteArrayView bytes, const LengthOfFile &lengthOf)
 {
-    const QByteArrayView content = text::withoutByteOrderMark(bytes);
-    const QString decoded = text::decode(content, text::encodingOf(content));
-    return TocReader(decoded, lengthOf).read();
+    const QString text = discsheet::decoded(bytes);
+    return TocReader(text, lengthOf).read();
 }

@@ -186,12 +186,15 @@ private slots:
         writeWave(u"2 Second.WAV"_s, 302);
         writeWave(u"1 - First.wav"_s, 301);
         write(u"cover.jpg"_s, 10, {});
-        write(u"broken.wav"_s, 10, {});
         QCOMPARE(mkfifo(QFile::encodeName(path(u"pipe.wav"_s)), 0600), 0); // opening it would wait
         QCOMPARE(open(control, mFolder->path()), u"150 451 753 | 1063"_s);
         const DiscRecord known = tocOfDevice(control.DeviceID()).known;
         QCOMPARE(known.tracks[0].title, u"First"_s);
         QCOMPARE(known.tracks[2].title, u"Tenth"_s);
+
+        const QString broken = write(u"5.wav"_s, 10, {}); // without it, it would be another disc
+        QCOMPARE(open(control, mFolder->path()), u"none"_s);
+        QVERIFY2(control.problem().endsWith(broken), qPrintable(control.problem()));
     }
 
     void sheetOfFolderTellsMore()

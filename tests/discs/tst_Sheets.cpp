@@ -114,11 +114,24 @@ private slots:
         QVERIFY(!known.isCompilation);
     }
 
-    void oldCueSheetsAreWindows1252()
+    void cueEncodings_data()
     {
-        const auto sheet =
-            readCueSheet(QByteArray("TITLE \"Caf\xE9\"\n" + image + first), lengthOf);
-        QCOMPARE(sheet.value().known.title, u"Café"_s);
+        const DataRows<QByteArray> row("cafe");
+        row("UTF-8", "Caf\xC3\xA9");
+        row("Windows-1252", "Caf\xE9");
+    }
+    void cueEncodings()
+    {
+        QFETCH(QByteArray, cafe);
+        const QByteArray sheet = "TITLE \"" + cafe + "\"\n" + image + first;
+        QCOMPARE(readCueSheet(sheet, lengthOf).value().known.title, u"Café"_s);
+    }
+
+    void cueSheetInUtf16()
+    {
+        const QString sheet = u"\uFEFFTITLE \"Café\"\n"_s + QString::fromLatin1(image + first);
+        const QByteArray bytes = QStringEncoder(QStringEncoder::Utf16LE).encode(sheet);
+        QCOMPARE(readCueSheet(bytes, lengthOf).value().known.title, u"Café"_s);
     }
 
     void severalArtistsMakeACompilation()
