@@ -82,10 +82,10 @@ QString SheetFolder::like(const QString &base, const QString &ending, LengthIn u
 
 QString SheetFolder::find(const QString &name, LengthIn unit) const
 {
-    if (const QString exact = mFolder.filePath(name); isFile(exact))
+    if (QString exact = mFolder.filePath(name); isFile(exact))
         return exact;
     const QFileInfo plain(QString(name).replace(u'\\', u'/'));
-    if (const QString below = mFolder.filePath(plain.filePath()); isFile(below))
+    if (QString below = mFolder.filePath(plain.filePath()); isFile(below))
         return below;
     const QString similar = like(plain.completeBaseName(), plain.suffix(), unit);
     return similar.isEmpty() ? like(mSheet.completeBaseName(), plain.suffix(), unit) : similar;
@@ -125,7 +125,7 @@ bool haveNumbers(const std::vector<RippedFile> &files)
 // "2 Second" stands before "10 Tenth".
 void sortAsTracks(std::vector<RippedFile> &files)
 {
-    QCollator order(QLocale(QLocale::English)); // that of C knows no numbers
+    QCollator order{QLocale(QLocale::English)}; // that of C knows no numbers
     order.setNumericMode(true);
     order.setCaseSensitivity(Qt::CaseInsensitive);
     if (haveNumbers(files))
@@ -193,6 +193,20 @@ std::vector<RippedFile> soundFilesIn(const QDir &folder, const std::stop_token &
     return files;
 }
 
+// Empty if none lies beside the image.
+QString sheetBeside(const QString &image)
+{
+    const QFileInfo file(image);
+    for (const QString &ending : {u"cue"_s, u"toc"_s}) {
+        for (const QString &base : {file.completeBaseName(), file.fileName()}) {
+            const QStringList names = file.dir().entryList({base + u'.' + ending}, QDir::Files);
+            if (!names.isEmpty())
+                return file.dir().filePath(names.first());
+        }
+    }
+    return {};
+}
+
 } // namespace
 
 FoundDisc readSheetFile(const QString &name)
@@ -217,7 +231,7 @@ FoundDisc readSoundFolder(const QString &name, const std::stop_token &stop)
     const QDir folder(name);
     const QStringList sheets = folder.entryList({u"*.cue"_s}, QDir::Files);
     if (sheets.size() == 1) {
-        const FoundDisc disc = readSheetFile(folder.filePath(sheets.first()));
+        FoundDisc disc = readSheetFile(folder.filePath(sheets.first()));
         if (!disc.toc.toc.tracks.empty())
             return disc;
     }
@@ -232,15 +246,12 @@ FoundDisc readSoundFolder(const QString &name, const std::stop_token &stop)
     return sheet ? found(*sheet) : nothing("xDiscTooLong", name);
 }
 
-QString sheetBeside(const QString &image)
+FoundDisc readSheetOfImage(const QString &image)
 {
-    const QFileInfo file(image);
-    for (const QString &ending : {u"cue"_s, u"toc"_s}) {
-        for (const QString &base : {file.completeBaseName(), file.fileName()}) {
-            const QStringList names = file.dir().entryList({base + u'.' + ending}, QDir::Files);
-            if (!names.isEmpty())
-                return file.dir().filePath(names.first());
-        }
-    }
-    return {};
+    if (const QString sheet = sheetBeside(image); !sheet.isEmpty())
+        return readSheetFile(sheet);
+    if (!isFile(image))
+        return nothing("xDiscFileUnreadable", image);
+    const bool isData = QFileInfo(image).suffix().compare(u"iso", Qt::CaseInsensitive) == 0;
+    return nothing(isData ? "xDiscNoTable" : "xDiscNoSheet", image);
 }

@@ -15,5 +15,5 @@ FoundDisc readSheetFile(const QString &name);
 /// read instead. All of them must be readable.
 FoundDisc readSoundFolder(const QString &folder, const std::stop_token &stop);
 
-/// The sheet that describes an image; empty if none lies beside it.
-QString sheetBeside(const QString &image);
+/// An image, by the sheet of its name that lies beside it.
+FoundDisc readSheetOfImage(const QString &image);

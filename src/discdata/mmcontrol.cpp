@@ -39,17 +39,6 @@ bool isNero(const QString &name)
     return QFileInfo(name).suffix().compare(u"nrg", Qt::CaseInsensitive) == 0;
 }
 
-FoundDisc readSheetOf(const QString &image)
-{
-    const QString sheet = isSheet(image) ? image : sheetBeside(image);
-    if (!sheet.isEmpty())
-        return readSheetFile(sheet);
-    FoundDisc none;
-    none.problem = "xDiscNoSheet";
-    none.about = image;
-    return none;
-}
-
 } // namespace
 
 MMControl::MMControl(Form &screen)
@@ -91,13 +80,16 @@ FoundDisc MMControl::read(LongWork &work) const
     if (name.isEmpty() || name == "0"_L1)
         return {};
     if (QFileInfo(name).isDir())
-        return inWorker(work, [name](std::stop_token stop) { return readSoundFolder(name, stop); });
+        return inWorker(
+            work, [name](const std::stop_token &stop) { return readSoundFolder(name, stop); });
     DiscReader disc(work, reader, patience);
     if (!isImage(name))
         return disc.readDrive(name);
     if (isNero(name) && QFileInfo(name).isFile())
         return disc.readImage(name);
-    return inWorker(work, [name](std::stop_token) { return readSheetOf(name); });
+    return inWorker(work, [name](const std::stop_token &) {
+        return isSheet(name) ? readSheetFile(name) : readSheetOfImage(name);
+    });
 }
 
 QString MMControl::problem() const

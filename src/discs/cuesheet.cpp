@@ -9,9 +9,10 @@ namespace
 {
 
 constexpr size_t mostFiles = 200;
-constexpr int soundSector = 2352;                      // bytes
-constexpr int largestSector = 2448;                    // with the bytes of subchannels
-constexpr qint64 betweenSessions = (90 + 60 + 2) * 75; // lead-out, lead-in, gap; in frames
+constexpr int soundSector = 2352;   // bytes
+constexpr int largestSector = 2448; // with the bytes of subchannels
+constexpr qint64 betweenSessions =
+    (90LL + 60 + 2) * framesPerSecond; // lead-out, lead-in, gap; in frames
 
 // From where on a file holds sectors of a track.
 struct Segment {
@@ -87,7 +88,7 @@ private:
 // Quoted or not; a quotation mark inside is part of the text: TITLE "Blue 12" Mix".
 QString argument(const QString &rest)
 {
-    const QString trimmed = rest.trimmed();
+    QString trimmed = rest.trimmed();
     if (!trimmed.startsWith(u'"'))
         return trimmed;
     const qsizetype last = trimmed.lastIndexOf(u'"');

@@ -208,24 +208,31 @@ private slots:
 
     void noDisc_data()
     {
-        const DataRows<QString, bool> row("name", "isTold"); // "*": a file of the folder
-        row("no drive", "0", false);
-        row("nothing chosen", "", false);
-        row("no such drive", "/dev/nodrive", false);
-        row("no drive but a device", "/dev/null", false);
-        row("no such image", "*gone.nrg", true);
-        row("no such sheet", "*gone.cue", true);
-        row("image without a sheet", "*alone.bin", true);
-        row("empty folder", "*", true);
+        // problem: the key of its text; "*": a file of the folder
+        const DataRows<QString, QString> row("name", "problem");
+        row("no drive", "0", "");
+        row("nothing chosen", "", "");
+        row("no such drive", "/dev/nodrive", "");
+        row("no drive but a device", "/dev/null", "");
+        row("no such image", "*gone.nrg", "xDiscFileUnreadable");
+        row("no such sheet", "*gone.cue", "xDiscFileUnreadable");
+        row("image of data", "*data.iso", "xDiscNoTable");
+        row("image without a sheet", "*alone.bin", "xDiscNoSheet");
+        row("empty folder", "*", "xDiscNoSound");
     }
     void noDisc()
     {
         QFETCH(QString, name);
-        QFETCH(bool, isTold);
+        QFETCH(QString, problem);
         Form screen(u"screen"_s);
         MMControl control(screen);
-        QCOMPARE(open(control, name.replace(u"*"_s, path(QString()))), u"none"_s);
-        QCOMPARE(!control.problem().isEmpty(), isTold);
+        for (const QString &image : {u"alone.bin"_s, u"data.iso"_s})
+            write(image, sector, {});
+        name.replace(u"*"_s, mFolder->path() + u'/');
+        QCOMPARE(open(control, name), u"none"_s);
+        if (!problem.isEmpty())
+            problem = GetMessage(problem.toLatin1().constData()) + name;
+        QCOMPARE(control.problem(), problem);
         QVERIFY(!control.wasCancelled());
     }
 
