@@ -53,16 +53,28 @@ public:
     }
     std::optional<qint64> lengthOf(const QString &name, LengthIn unit);
 
+    /// Whether one of several was taken to be the file of the sheet's own name: that can only be so
+    /// where it is the only one.
+    bool isWrongGuess() const { return mGuessed && mLengths.size() > 1; }
+    void guessNoMore();
+
 private:
-    std::optional<qint64> measure(const QString &name, LengthIn unit) const;
-    QString find(const QString &name, LengthIn unit) const;
+    std::optional<qint64> measure(const QString &name, LengthIn unit);
+    QString find(const QString &name, LengthIn unit);
     QString like(const QString &base, const QString &ending, LengthIn unit) const;
 
     QFileInfo mSheet;
     QDir mFolder;
     QStringList mNames;
     QHash<QString, std::optional<qint64>> mLengths; // a file may be named for each track
+    bool mMayGuess = true, mGuessed = false;
 };
+
+void SheetFolder::guessNoMore()
+{
+    mLengths.clear();
+    mMayGuess = mGuessed = false;
+}
 
 // In any case of letters, and with any ending of the kind if there is none with that one.
 QString SheetFolder::like(const QString &base, const QString &ending, LengthIn unit) const
@@ -80,15 +92,18 @@ QString SheetFolder::like(const QString &base, const QString &ending, LengthIn u
     return other;
 }
 
-QString SheetFolder::find(const QString &name, LengthIn unit) const
+QString SheetFolder::find(const QString &name, LengthIn unit)
 {
     if (QString exact = mFolder.filePath(name); isFile(exact))
         return exact;
     const QFileInfo plain(QString(name).replace(u'\\', u'/'));
     if (QString below = mFolder.filePath(plain.filePath()); isFile(below))
         return below;
-    const QString similar = like(plain.completeBaseName(), plain.suffix(), unit);
-    return similar.isEmpty() ? like(mSheet.completeBaseName(), plain.suffix(), unit) : similar;
+    QString similar = like(plain.completeBaseName(), plain.suffix(), unit);
+    if (!similar.isEmpty() || !mMayGuess)
+        return similar;
+    mGuessed = true;
+    return like(mSheet.completeBaseName(), plain.suffix(), unit);
 }
 
 std::optional<qint64> SheetFolder::lengthOf(const QString &name, LengthIn unit)
@@ -98,7 +113,7 @@ std::optional<qint64> SheetFolder::lengthOf(const QString &name, LengthIn unit)
     return mLengths[name];
 }
 
-std::optional<qint64> SheetFolder::measure(const QString &name, LengthIn unit) const
+std::optional<qint64> SheetFolder::measure(const QString &name, LengthIn unit)
 {
     const QString file = find(name, unit);
     if (file.isEmpty())
@@ -222,7 +237,12 @@ FoundDisc readSheetFile(const QString &name)
         return folder.lengthOf(named, unit);
     };
     const bool isCue = QFileInfo(name).suffix().compare(u"cue", Qt::CaseInsensitive) == 0;
-    const auto sheet = isCue ? readCueSheet(bytes, lengthOf) : readTocSheet(bytes, lengthOf);
+    const auto read = isCue ? readCueSheet : readTocSheet;
+    auto sheet = read(bytes, lengthOf);
+    if (folder.isWrongGuess()) {
+        folder.guessNoMore();
+        sheet = read(bytes, lengthOf);
+    }
     return sheet ? found(*sheet) : nothing("xDiscNoTable", name);
 }
 

@@ -136,6 +136,18 @@ private slots:
         QCOMPARE(open(control, path(u"x.bin"_s)), u"150 450 | 750"_s);
     }
 
+    void sheetOfFilesThatWereRenamed()
+    {
+        Form screen(u"screen"_s);
+        MMControl control(screen);
+        const QByteArray one = "FILE a.wav WAVE\nTRACK 01 AUDIO\nINDEX 01 0:0:0\n";
+        writeWave(u"x.wav"_s, 300);
+        QCOMPARE(open(control, write(u"x.cue"_s, 0, one)), u"150 | 450"_s);
+        const QByteArray two = one + "FILE b.wav WAVE\nTRACK 02 AUDIO\nINDEX 01 0:0:0\n";
+        QCOMPARE(open(control, write(u"x.cue"_s, 0, two)), u"none"_s); // not the same one twice
+        QVERIFY2(control.problem().endsWith(u": a.wav"_s), qPrintable(control.problem()));
+    }
+
     void sheetAloneGivesItsWords()
     {
         Form screen(u"screen"_s);
