@@ -131,6 +131,17 @@ const Message furtherTexts[] = {
     {"xDiscTooSlow", "This does not answer, and was given up: ", "Er komt geen antwoord; het lezen is gestopt: "},
     {"xDiscNoHelper", "A part of the program is missing. Please install it again: ", "Een onderdeel van het programma ontbreekt. Installeer het opnieuw: "},
     {"xServiceTakesNone", "This service takes no discs from here.", "Deze dienst neemt hiervandaan geen CD's aan."},
+    {"xServiceCancelled", "The look-up was cancelled.", "Het opzoeken is afgebroken."},
+    {"xServiceNotReached", "The server cannot be reached.", "De server is niet bereikbaar."},
+    {"xServiceSilent", "The server does not answer.", "De server antwoordt niet."},
+    {"xServiceCutOff", "The answer of the server was cut off.", "Het antwoord van de server is afgebroken."},
+    {"xServiceTooLong", "The answer of the server is too long.", "Het antwoord van de server is te lang."},
+    {"xServiceRedirect", "The server sends the request on to where it may not go.", "De server stuurt de aanvraag door naar een plaats waar die niet heen mag."},
+    {"xServiceStrange", "The answer of the server cannot be understood.", "Het antwoord van de server is niet te begrijpen."},
+    {"xServiceBusy", "The server is too busy. Please try again later.", "De server heeft het te druk. Probeer het later opnieuw."},
+    {"xServiceNoMail", "This service wants your e-mail address. Please fill it in first.", "Deze dienst vraagt om uw e-mailadres. Vul dat eerst in."},
+    {"xServiceNoCategory", "Please choose a category for this disc first.", "Kies eerst een categorie voor deze CD."},
+    {"xProxyRefused", "The proxy server does not accept this name and password.", "De proxyserver accepteert deze naam en dit wachtwoord niet."},
 };
 // clang-format on
 

@@ -1,0 +1,131 @@
+#include "discdata/musicbrainzserver.h"
+
+#include "discdata/serviceerrors.h"
+#include "discs/discid.h"
+#include "discs/musicbrainzanswer.h"
+
+using namespace Qt::StringLiterals;
+
+namespace
+{
+
+constexpr int retries = 3;
+constexpr std::size_t pageSize = 25; // of an answer; that there are more it does not tell
+constexpr int mostPages = 4;
+constexpr char included[] = "inc=artist-credits+recordings+release-groups+genres+labels";
+
+QUrl addressOf(const QString &typed)
+{
+    const QString address = typed.trimmed();
+    QUrl url(address.contains("://"_L1) ? address : u"https://"_s + address);
+    QString path = url.path();
+    while (path.endsWith(u'/'))
+        path.chop(1);
+    url.setPath(path + u"/ws/2/"_s);
+    return url;
+}
+
+// First track 1, as many offsets as tracks, rising, the lead-out behind the last.
+bool isTakenThere(const QString &table)
+{
+    const QStringList numbers = table.split(u' ');
+    if (numbers.size() < 4 || numbers[0] != "1"_L1 || numbers[1].toInt() != numbers.size() - 3)
+        return false;
+    for (qsizetype i = 4; i < numbers.size(); ++i) {
+        if (numbers[i].toInt() <= numbers[i - 1].toInt())
+            return false;
+    }
+    return numbers[2].toInt() > numbers.last().toInt();
+}
+
+} // namespace
+
+MusicBrainzServer::MusicBrainzServer(const ServiceOptions &options)
+    : mClient(options, retries), mAddress(addressOf(options.musicBrainzAddress))
+{
+}
+
+QString MusicBrainzServer::name() const
+{
+    return u"musicbrainz"_s;
+}
+
+QByteArray MusicBrainzServer::ask(const QString &resource, const QByteArray &question,
+                                  LongWork &work)
+{
+    QUrl url = mAddress;
+    url.setPath(mAddress.path() + resource, QUrl::DecodedMode);
+    url.setQuery(QString::fromLatin1(question + "&fmt=json"), QUrl::StrictMode);
+    const HttpAnswer answer = mClient.get(url, work);
+    requireAnswer(answer, name());
+    if (answer.status == 404 && !answer.isHtml())
+        return {};
+    if (answer.isTooBusy())
+        throw serviceFailed(name(), "xServiceBusy", statusWords(answer));
+    if (answer.status == 200)
+        return answer.body;
+    const QString said = answer.isHtml() ? QString() : musicBrainzError(answer.body);
+    const bool refused = answer.status == 401 || answer.status == 403;
+    throw Error(refused ? errServiceRefused : errServiceFailed, name(),
+                serversWords(said.toUtf8(), statusWords(answer)));
+}
+
+std::vector<DiscRecord> MusicBrainzServer::ofService(std::vector<DiscRecord> records) const
+{
+    for (DiscRecord &record : records)
+        record.service = name();
+    return records;
+}
+
+std::vector<DiscRecord> MusicBrainzServer::find(const TableOfContents &toc, LongWork &work)
+{
+    if (!toc.isValid() || !isTakenThere(musicBrainzToc(toc)))
+        return {};
+    std::vector<DiscRecord> all = page(toc, 0, work);
+    bool full = all.size() >= pageSize;
+    for (int pages = 1; full && pages < mostPages; ++pages) {
+        const auto more = page(toc, pages * int(pageSize), work);
+        full = more.size() >= pageSize && more.front() != all.front();
+        if (!more.empty() && more.front() != all.front())
+            all.insert(all.end(), more.begin(), more.end());
+    }
+    return all;
+}
+
+std::vector<DiscRecord> MusicBrainzServer::page(const TableOfContents &toc, int from,
+                                                LongWork &work)
+{
+    QByteArray question =
+        "toc=" + musicBrainzToc(toc).replace(u' ', u'+').toLatin1() + "&cdstubs=no&" + included;
+    if (from > 0)
+        question += "&offset=" + QByteArray::number(from);
+    const QByteArray json = ask(u"discid/"_s + musicBrainzId(toc), question, work);
+    if (json.isEmpty())
+        return {};
+    return ofService(understood(name(), [&] { return musicBrainzDiscs(json, toc); }));
+}
+
+std::vector<DiscRecord> MusicBrainzServer::search(const SearchWords &words, LongWork &work)
+{
+    const QString query = musicBrainzQuery(words).trimmed();
+    if (words.isEmpty() || query.isEmpty())
+        return {};
+    const QByteArray question = "query=" + QUrl::toPercentEncoding(query) + "&limit=25";
+    const QByteArray json = ask(u"release"_s, question, work);
+    if (json.isEmpty())
+        return {};
+    return ofService(understood(name(), [&] { return musicBrainzSearch(json); }));
+}
+
+DiscRecord MusicBrainzServer::complete(const DiscRecord &candidate, LongWork &work)
+{
+    if (candidate.isWhole())
+        return candidate;
+    const QByteArray json = ask(u"release/"_s + candidate.keyA, included, work);
+    const int medium = candidate.keyB.toInt();
+    DiscRecord disc = understood(name(), [&] { return musicBrainzRelease(json, medium); });
+    disc.service = name();
+    disc.keyA.clear();
+    disc.keyB.clear();
+    return disc;
+}
