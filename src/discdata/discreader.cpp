@@ -1,5 +1,6 @@
 #include "discdata/discreader.h"
 
+#include "discs/candidates.h"
 #include "discs/discsheet.h"
 #include "platform/work/helperprogram.h"
 
@@ -49,7 +50,7 @@ void Answer::takeText(const QString &line)
     if (number != 0 && at >= disc.tracks.size())
         return;
     const QString field = line.section(u' ', 2, 2);
-    const QString text = discsheet::plain(line.section(u' ', 3));
+    const QString text = cleanText(line.section(u' ', 3));
     if (field == "title"_L1)
         (number == 0 ? disc.title : disc.tracks[at].title) = text;
     else if (field == "performer"_L1)

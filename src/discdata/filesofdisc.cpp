@@ -1,5 +1,6 @@
 #include "discdata/filesofdisc.h"
 
+#include "discs/candidates.h"
 #include "discs/cuesheet.h"
 #include "discs/tocsheet.h"
 #include "tags/playingtime.h"
@@ -33,7 +34,7 @@ FoundDisc found(const DiscSheet &sheet)
     if (sheet.toc.tracks.empty())
         disc.toc.words = {sheet.known.artist.name, sheet.known.title, sheet.known.barcode};
     if (sheet.toc.tracks.empty() && disc.toc.words.isEmpty())
-        return nothing("xDiscImageMissing", discsheet::plain(sheet.missing.left(longestName)));
+        return nothing("xDiscImageMissing", cleanText(sheet.missing.left(longestName)));
     disc.tracks = sheet.known.trackCount;
     return disc;
 }
@@ -155,10 +156,10 @@ TrackRecord trackOf(const RippedFile &file)
 {
     static const QRegularExpression number(u"^[0-9]{1,3}[ ._-]+"_s);
     TrackRecord track;
-    track.title = discsheet::plain(file.sound.title);
+    track.title = cleanText(file.sound.title);
     if (track.title.isEmpty())
-        track.title = discsheet::plain(QFileInfo(file.name).completeBaseName().remove(number));
-    track.artist.name = discsheet::plain(file.sound.artist);
+        track.title = cleanText(QFileInfo(file.name).completeBaseName().remove(number));
+    track.artist.name = cleanText(file.sound.artist);
     return track;
 }
 
@@ -184,9 +185,9 @@ std::optional<DiscSheet> discOf(const std::vector<RippedFile> &files)
     if (!toc)
         return {};
     sheet.toc = *toc;
-    sheet.known.title = discsheet::plain(common(files, &SoundFile::album));
-    sheet.known.genre = discsheet::plain(common(files, &SoundFile::genre));
-    sheet.known.year = discsheet::yearIn(QString::number(common(files, &SoundFile::year)));
+    sheet.known.title = cleanText(common(files, &SoundFile::album));
+    sheet.known.genre = cleanText(common(files, &SoundFile::genre));
+    sheet.known.year = yearOf(QString::number(common(files, &SoundFile::year)));
     return discsheet::complete(sheet) ? std::optional(sheet) : std::nullopt;
 }
 

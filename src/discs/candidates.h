@@ -12,3 +12,9 @@ bool isVariousArtists(const QString &name);
 /// Without control signs, blanks at the ends and marks that a text cannot be shown with; what is
 /// left is as it came.
 QString cleanText(const QString &foreign);
+
+/// With typographic signs as a keyboard has them: ’ as ', ‐ as -, … as three points.
+QString plainSigns(const QString &text);
+
+/// The first four digits of a date or a year; empty where it does not begin with a year.
+QString yearOf(QStringView date);

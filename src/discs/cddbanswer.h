@@ -11,14 +11,19 @@ struct CddbAnswer {
     QByteArray body;
     bool isWhole = false; // false: lines should follow and their end did not come
 
-    bool isRefusal() const; // in the server's own words: `text`
+    /// The server does not want this program or this command; its own words are in `text`. Not
+    /// so: no such entry (401), an entry that is damaged (403), and its own trouble.
+    bool isRefusal() const;
+
+    /// An error of the server or too many users: it may be asked again later.
+    bool isTrouble() const;
 };
 
 /// Throws Error (errSyntax) where the bytes do not begin with three digits, as HTML does.
 CddbAnswer readCddbAnswer(const QByteArray &bytes);
 
 /// The candidates of an answer to a query, in the order of the server, with both keys: category and
-/// id. Empty for "no match".
+/// id. Empty for "no match"; Error (errSyntax) where it is no answer to a query.
 std::vector<DiscRecord> cddbCandidates(const CddbAnswer &answer);
 
 /// Whether a record stands for a refusal: its tracks say that the program is not supported.

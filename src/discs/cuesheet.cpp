@@ -1,5 +1,7 @@
 #include "discs/cuesheet.h"
 
+#include "discs/candidates.h"
+
 #include <QHash>
 #include <QRegularExpression>
 
@@ -181,30 +183,30 @@ void CueReader::title(const QString &rest)
 {
     DiscRecord &disc = mSheet.known;
     QString &title = disc.tracks.empty() ? disc.title : disc.tracks.back().title;
-    title = discsheet::plain(argument(rest));
+    title = cleanText(argument(rest));
 }
 
 void CueReader::performer(const QString &rest)
 {
     DiscRecord &disc = mSheet.known;
     ArtistName &artist = disc.tracks.empty() ? disc.artist : disc.tracks.back().artist;
-    artist.name = discsheet::plain(argument(rest));
+    artist.name = cleanText(argument(rest));
 }
 
 void CueReader::catalog(const QString &rest)
 {
     const QString number = argument(rest);
     if (number.count(u'0') < number.size())
-        mSheet.known.barcode = discsheet::plain(number);
+        mSheet.known.barcode = cleanText(number);
 }
 
 void CueReader::remark(const QString &rest)
 {
     const QString key = rest.trimmed().section(u' ', 0, 0).toUpper();
-    const QString value = discsheet::plain(argument(rest.trimmed().mid(key.size())));
+    const QString value = cleanText(argument(rest.trimmed().mid(key.size())));
     DiscRecord &disc = mSheet.known;
     if (key == "DATE"_L1)
-        disc.year = discsheet::yearIn(value);
+        disc.year = yearOf(value);
     else if (key == "GENRE"_L1)
         disc.genre = value;
     else if (key == "DISCNUMBER"_L1 && value.toInt() > 0)

@@ -13,3 +13,6 @@ QString musicBrainzId(const TableOfContents &toc);
 
 /// The table as MusicBrainz takes it: first, last, lead-out, offsets; blanks between.
 QString musicBrainzToc(const TableOfContents &toc);
+
+/// The table as MusicBrainz counts it: without data tracks at the end, the lead-out before them.
+TableOfContents withoutDataBehind(TableOfContents toc);

@@ -15,7 +15,7 @@ struct ArtistName {
 
 struct TrackRecord {
     QString title;
-    ArtistName artist; // the disc's where the track has none of its own
+    ArtistName artist; // of an album the disc's where the track has none of its own
     QString year;      // four digits or empty
     QString genre;     // name or empty
     QString notes;

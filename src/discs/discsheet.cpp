@@ -1,5 +1,6 @@
 #include "discs/discsheet.h"
 
+#include "discs/candidates.h"
 #include "platform/text/codepage.h"
 
 #include <QRegularExpression>
@@ -46,19 +47,6 @@ std::optional<qint64> framesOf(const QString &minutesSecondsFrames)
     return part(1) * framesPerMinute + part(2) * framesPerSecond + part(3);
 }
 
-QString plain(const QString &text)
-{
-    QString plain = text.simplified();
-    plain.removeIf([](QChar c) { return c.category() == QChar::Other_Control; });
-    return plain;
-}
-
-QString yearIn(const QString &date)
-{
-    static const QRegularExpression year(u"(?<![0-9])(?:19|20)[0-9]{2}(?![0-9])"_s);
-    return year.match(date).captured();
-}
-
 bool complete(DiscSheet &sheet)
 {
     DiscRecord &disc = sheet.known;
@@ -68,7 +56,8 @@ bool complete(DiscSheet &sheet)
     if (!sheet.missing.isEmpty())
         sheet.toc = {};
     const QSet<QString> artists = artistsOf(disc);
-    disc.isCompilation = disc.artist.name.isEmpty() && artists.size() > 1;
+    disc.isCompilation =
+        isVariousArtists(disc.artist.name) || (disc.artist.name.isEmpty() && artists.size() > 1);
     if (disc.artist.name.isEmpty() && artists.size() == 1)
         disc.artist = disc.tracks.front().artist;
     for (TrackRecord &track : disc.tracks) {

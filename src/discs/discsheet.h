@@ -29,12 +29,6 @@ QString decoded(QByteArrayView bytes);
 /// "mm:ss:ff" as frames; nothing if it is none.
 std::optional<qint64> framesOf(const QString &minutesSecondsFrames);
 
-/// A text of a sheet as a record has it.
-QString plain(const QString &text);
-
-/// The year of a date; empty if there is none.
-QString yearIn(const QString &date);
-
 /// Fills in what follows from the rest: whose the tracks are, how long they are, how many, and
 /// whether it is a compilation. False if no disc can have such a table.
 bool complete(DiscSheet &sheet);

@@ -23,3 +23,7 @@ private:
 
 /// The name of an ID3v1 genre number; empty above the table.
 QString id3GenreName(int number);
+
+/// A genre as it is written: as in the usual table where it stands there (case, blanks and hyphens
+/// do not count), else with a capital at its start.
+QString genreAsWritten(const QString &name);

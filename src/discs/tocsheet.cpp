@@ -1,5 +1,7 @@
 #include "discs/tocsheet.h"
 
+#include "discs/candidates.h"
+
 #include <QRegularExpression>
 
 using namespace Qt::StringLiterals;
@@ -273,7 +275,7 @@ void TocReader::cdText()
         if ((!isTitle && !token.is("PERFORMER"_L1)) || !mTokens.peek().quoted)
             continue;
         QString &field = isTitle ? title : artist;
-        const QString value = discsheet::plain(mTokens.next().text);
+        const QString value = cleanText(mTokens.next().text);
         if (field.isEmpty())
             field = value;
     } while (depth > 0 && !mTokens.atEnd());
@@ -302,7 +304,7 @@ void TocReader::statement(const Token &word)
     else if (word.is("CD_TEXT"_L1))
         cdText();
     else if (word.is("CATALOG"_L1))
-        mSheet.known.barcode = discsheet::plain(mTokens.next().text);
+        mSheet.known.barcode = cleanText(mTokens.next().text);
     else if (!mTracks.empty())
         trackStatement(word);
 }

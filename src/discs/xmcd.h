@@ -8,7 +8,7 @@
 /// A record in the xmcd form: comments with offsets, length, revision; lines KEY=text.
 struct XmcdRecord {
     DiscRecord disc; // revision, discIds, tracks with notes; compilation, part of set found out
-    std::vector<int> offsets;
+    std::vector<int> offsets; // empty where they do not rise
     int seconds = 0;
 };
 

@@ -102,8 +102,7 @@ private slots:
         const QByteArray sheet =
             "\xEF\xBB\xBFREM GENRE \"Alternative Rock\"\nREM DATE 1999-05-31\nREM DISCNUMBER 2\n"
             "CATALOG 0724384260958\nPERFORMER \"Björk\"\nTITLE \"12\" Mixes\"\n" +
-            image + "TRACK 01 AUDIO\nTITLE Jóga\nPERFORMER \"Björk \tfeat. X\"\n" +
-            "INDEX 01 0:0:0";
+            image + "TRACK 01 AUDIO\nTITLE Jóga\nPERFORMER \"Björk\tfeat. X\"\n" + "INDEX 01 0:0:0";
         const auto known = readCueSheet(sheet, lengthOf).value().known;
         QCOMPARE(QStringList({known.genre, known.year, known.numberInSet, known.barcode}),
                  texts("Alternative Rock", "1999", "2", "0724384260958"));
@@ -134,14 +133,22 @@ private slots:
         QCOMPARE(readCueSheet(bytes, lengthOf).value().known.title, u"Café"_s);
     }
 
-    void severalArtistsMakeACompilation()
+    void compilations_data()
     {
-        const auto sheet = readCueSheet(
-            QByteArray(image + "TRACK 01 AUDIO\nPERFORMER Abba\nINDEX 01 0:0:0\nTRACK 02 AUDIO\n"
-                               "PERFORMER Blur\nINDEX 01 0:4:0"),
-            lengthOf);
-        QVERIFY(sheet.value().known.isCompilation);
-        QCOMPARE(sheet->known.tracks[1].artist.name, u"Blur"_s);
+        const DataRows<QString, bool> row("artist", "isCompilation"); // of the disc
+        row("nobody", "", true);
+        row("Various Artists", true);
+        row("Abba", false);
+    }
+    void compilations()
+    {
+        QFETCH(QString, artist);
+        const QByteArray sheet = "PERFORMER \"" + artist.toUtf8() + "\"\n" + image +
+                                 "TRACK 01 AUDIO\nPERFORMER Abba\nINDEX 01 0:0:0\n"
+                                 "TRACK 02 AUDIO\nPERFORMER Blur\nINDEX 01 0:4:0";
+        const DiscRecord known = readCueSheet(sheet, lengthOf).value().known;
+        QTEST(known.isCompilation, "isCompilation");
+        QCOMPARE(known.tracks[1].artist.name, u"Blur"_s);
     }
 
     void tocTable_data()
