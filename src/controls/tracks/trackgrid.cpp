@@ -166,7 +166,7 @@ int TrackGrid::lastColumn() const
 
 void TrackGrid::go(int row, int column)
 {
-    const QModelIndex cell = mModel->index(std::clamp(row, 0, mModel->waitingRow()),
+    const QModelIndex cell = mModel->index(std::clamp(row, 0, std::max(mModel->rowCount() - 1, 0)),
                                            std::clamp(column, 0, lastColumn()));
     // Told outright, for the view would go by the Shift of a Shift+Tab.
     selectionModel()->setCurrentIndex(cell, QItemSelectionModel::ClearAndSelect);
@@ -486,6 +486,20 @@ QList<StoredTrack> TrackGrid::Tracks() const
 void TrackGrid::ShowUnsaved(const QList<StoredTrack> &tracks)
 {
     mModel->showUnsaved(tracks);
+}
+
+void TrackGrid::ShowTracks(const QList<StoredTrack> &tracks)
+{
+    cancelEdit();
+    mModel->setFixed();
+    mModel->load(tracks);
+    go(0, 1);
+}
+
+void TrackGrid::goToCell(int row, TrackField field)
+{
+    setFocus();
+    go(row, mModel->columnOf(field));
 }
 
 void TrackGrid::ForgetSaved()

@@ -63,6 +63,11 @@ public:
     /// Behind LoadDisc: these tracks, not saved yet, in the place of those that were loaded.
     void ShowUnsaved(const QList<StoredTrack> &tracks);
 
+    /// Shows tracks that are of no catalogue, and as many as they are, empty ones included: none
+    /// can be added or taken away.
+    void ShowTracks(const QList<StoredTrack> &tracks);
+    void goToCell(int row, TrackField field); // from 0; with the focus
+
     /// The tracks stand in no catalogue any more: all of them are new.
     void ForgetSaved();
 

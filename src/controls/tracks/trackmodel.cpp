@@ -136,7 +136,7 @@ void TrackModel::clear(const QModelIndexList &cells)
 
 void TrackModel::insertTrack(int row)
 {
-    if (row < 0 || row >= waitingRow())
+    if (mFixed || row < 0 || row >= waitingRow())
         return; // an empty row is there already
     QList<Row> rows = mRows;
     rows.insert(row, Row{++mLastKey, {}});
@@ -145,7 +145,7 @@ void TrackModel::insertTrack(int row)
 
 void TrackModel::removeTrack(int row)
 {
-    if (row < 0 || row >= waitingRow())
+    if (mFixed || row < 0 || row >= waitingRow())
         return;
     QList<Row> rows = mRows;
     rows.removeAt(row);
@@ -159,7 +159,8 @@ auto TrackModel::paste(int row, int column, const QList<QStringList> &lines) -> 
     QList<Row> rows = mRows;
     int last = column;
     bool cut = false;
-    for (int i = 0; i < lines.size(); ++i) {
+    const int taken = mFixed ? std::min(int(lines.size()), waitingRow() - row) : int(lines.size());
+    for (int i = 0; i < taken; ++i) {
         fillUpTo(rows, row + i);
         const int end = std::min(columnCount(), column + int(lines[i].size()));
         for (int c = std::max(column, 1); c < end; ++c) {
@@ -171,7 +172,7 @@ auto TrackModel::paste(int row, int column, const QList<QStringList> &lines) -> 
         last = std::max(last, end - 1);
     }
     change(rows, row, column);
-    return {index(row + int(lines.size()) - 1, last), cut};
+    return {index(row + taken - 1, last), cut};
 }
 
 QList<QStringList> TrackModel::parted(const QString &clipboard)
@@ -201,10 +202,10 @@ QString TrackModel::joined(const QList<QStringList> &lines)
     return all.join(u'\n') + (endWouldGo ? u"\n"_s : QString());
 }
 
-bool TrackModel::isEmpty(const Row &row)
+bool TrackModel::isTrack(const Row &row) const
 {
-    return std::all_of(row.texts.begin(), row.texts.end(),
-                       [](const QString &text) { return text.isEmpty(); });
+    return mFixed || std::any_of(row.texts.begin(), row.texts.end(),
+                                 [](const QString &text) { return !text.isEmpty(); });
 }
 
 bool TrackModel::isChanged(const Row &row) const
@@ -218,7 +219,7 @@ bool TrackModel::isChanged() const
 {
     qsizetype stored = 0;
     for (const Row &row : mRows) {
-        if (isEmpty(row) && !mSaved.tracks.contains(row.key))
+        if (!isTrack(row) && !mSaved.tracks.contains(row.key))
             continue;
         if (isChanged(row) || mSaved.order.value(stored) != row.key)
             return true;
@@ -231,7 +232,7 @@ QList<TrackToSave> TrackModel::toSave() const
 {
     QList<TrackToSave> tracks;
     for (const Row &row : mRows) {
-        if (isEmpty(row))
+        if (!isTrack(row))
             continue;
         const StoredTrack saved = mSaved.tracks.value(row.key);
         tracks.append({saved.linkId, isChanged(row), row.texts, saved.texts});
@@ -256,7 +257,7 @@ void TrackModel::markSaved(const QList<qint64> &links)
 {
     mSavedBefore = std::exchange(mSaved, {});
     for (const Row &row : std::as_const(mRows)) {
-        if (isEmpty(row))
+        if (!isTrack(row))
             continue;
         mSaved.tracks.insert(row.key, {links[mSaved.order.size()], row.texts});
         mSaved.order.append(row.key);
@@ -293,7 +294,7 @@ void TrackModel::show(QList<Row> rows)
     mNumbers.clear();
     int number = 0;
     for (const Row &row : std::as_const(mRows))
-        mNumbers.append(isEmpty(row) ? 0 : ++number);
+        mNumbers.append(isTrack(row) ? ++number : 0);
     if (more > 0)
         endInsertRows();
     else if (more < 0)
@@ -314,12 +315,12 @@ QModelIndex TrackModel::step(QList<Step> &from, QList<Step> &to)
     Step taken = from.takeLast();
     to.append({mRows, taken.cell});
     show(std::move(taken.rows));
-    return index(std::min(taken.cell.y(), waitingRow()), taken.cell.x());
+    return index(std::min(taken.cell.y(), rowCount() - 1), taken.cell.x());
 }
 
 int TrackModel::rowCount(const QModelIndex &parent) const
 {
-    return parent.isValid() ? 0 : waitingRow() + 1;
+    return parent.isValid() ? 0 : waitingRow() + (mFixed ? 0 : 1);
 }
 
 int TrackModel::columnCount(const QModelIndex &parent) const

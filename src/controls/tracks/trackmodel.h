@@ -24,13 +24,19 @@ public:
     /// Shows these tracks and forgets all else, undo included.
     void load(const QList<StoredTrack> &tracks);
 
+    /// From now on tracks neither come nor go: as many as the disc has, empty ones among them.
+    void setFixed() { mFixed = true; }
+
     /// Shows these instead, as one step of the user's; those with a link of what was loaded are
     /// those tracks.
     void showUnsaved(const QList<StoredTrack> &tracks);
 
     TrackField fieldOf(int column) const { return TrackField(column - 1 + mFirstField); }
     int columnOf(TrackField field) const { return field + 1 - mFirstField; }
-    int waitingRow() const { return int(mRows.size()); } // its number: rowCount() - 1
+    int waitingRow() const
+    {
+        return int(mRows.size());
+    } // behind the tracks; none where they are fixed
     QString text(int row, TrackField field) const;
     int trackNumber(int row) const; // 0 for an empty row
 
@@ -97,14 +103,15 @@ private:
         QPoint cell; // column, row
     };
 
-    static bool isEmpty(const Row &row);
-    bool isChanged(const Row &row) const;              // a row that is new is
+    bool isTrack(const Row &row) const;   // an empty row is none, unless the tracks are fixed
+    bool isChanged(const Row &row) const; // a row that is new is
     void change(QList<Row> rows, int row, int column); // one step to undo
     void show(QList<Row> rows);
     void fillUpTo(QList<Row> &rows, int row);
     QModelIndex step(QList<Step> &from, QList<Step> &to);
 
     const int mFirstField; // the first that is shown
+    bool mFixed = false;
     QStringList mHeads;
     QList<Row> mRows;
     QList<int> mNumbers; // of mRows
