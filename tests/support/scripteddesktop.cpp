@@ -26,6 +26,8 @@ const char *kindOf(BoxKind kind, BoxButtons buttons)
         return "yes-no";
     if (buttons == BoxButtons::YesNoCancel)
         return "yes-no-cancel";
+    if (kind == BoxKind::Warning)
+        return "warning";
     if (kind == BoxKind::Plain)
         return "plain";
     return kind == BoxKind::Error ? "error" : "information";

@@ -12,7 +12,7 @@
 /// Stands in for the person in front of the screen. Boxes, modal screens and file dialogs must have
 /// been announced, in their order; one that nobody expected fails the running test with its text
 /// and is answered at once, so that nothing hangs. Boxes are recorded as readable lines:
-/// "error|information|plain|yes-no|yes-no-cancel [title] text".
+/// "error|warning|information|plain|yes-no|yes-no-cancel [title] text".
 class ScriptedDesktop : public Desktop
 {
     QTemporaryDir mTemporary; // first: folder and settings lie in it

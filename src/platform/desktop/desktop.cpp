@@ -38,6 +38,11 @@ void errorBox(const QString &text, const QString &title)
     box(BoxKind::Error, BoxButtons::Ok, text, title);
 }
 
+void warningBox(const QString &text)
+{
+    box(BoxKind::Warning, BoxButtons::Ok, text, {});
+}
+
 void plainBox(const QString &text)
 {
     box(BoxKind::Plain, BoxButtons::Ok, text, {});

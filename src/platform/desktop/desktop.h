@@ -9,7 +9,7 @@
 class Form;
 class QPrinter;
 
-enum class BoxKind { Error, Information, Question, Plain }; // Plain: without a picture
+enum class BoxKind { Error, Warning, Information, Question, Plain }; // Plain: without a picture
 enum class BoxButtons { Ok, YesNo, YesNoCancel };
 
 /// The answers of a box, with the numbers that the screens keep.
@@ -68,6 +68,7 @@ void setBoxTitle(const QString &title);
 
 /// The shorthands that the screens use.
 void errorBox(const QString &text, const QString &title = {});
+void warningBox(const QString &text);
 void plainBox(const QString &text);
 void informationBox(const QString &text, const QString &title = {});
 BoxAnswer askYesNo(const QString &text, const QString &title = {});

@@ -65,6 +65,8 @@ QMessageBox::Icon iconOf(BoxKind kind)
 {
     if (kind == BoxKind::Error)
         return QMessageBox::Critical;
+    if (kind == BoxKind::Warning)
+        return QMessageBox::Warning;
     if (kind == BoxKind::Plain)
         return QMessageBox::NoIcon;
     return kind == BoxKind::Question ? QMessageBox::Question : QMessageBox::Information;
