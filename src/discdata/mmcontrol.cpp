@@ -39,6 +39,15 @@ bool isNero(const QString &name)
     return QFileInfo(name).suffix().compare(u"nrg", Qt::CaseInsensitive) == 0;
 }
 
+// Not a disc, and yet something to look up.
+FoundDisc wordsAlone(const SearchWords &words)
+{
+    FoundDisc found;
+    found.toc.words = words;
+    found.tracks = 1;
+    return found;
+}
+
 } // namespace
 
 MMControl::MMControl(Form &screen)
@@ -76,6 +85,8 @@ void MMControl::close()
 
 FoundDisc MMControl::read(LongWork &work) const
 {
+    if (!Words.isEmpty())
+        return wordsAlone(Words);
     const QString name = FileName;
     if (name.isEmpty() || name == "0"_L1)
         return {};

@@ -17,7 +17,8 @@ public:
     MMControl &operator=(const MMControl &) = delete;
 
     QString DeviceType;
-    QString FileName;                                     // "0": no drive at all
+    QString FileName;  // "0": no drive at all
+    SearchWords Words; // where no disc is at hand, in the place of FileName
     bool Notify = false, Wait = false, Shareable = false; // taken, and nothing hangs on them
 
     /// "Open" reads the disc that FileName tells, "Close" forgets it.

@@ -13,6 +13,7 @@
 #include "services/globals.h"
 #include "services/messages.h"
 #include "shell/accesskeys.h"
+#include "shell/discentries.h"
 #include "shell/frmHelp.h"
 #include "shell/frmSplash.h"
 #include "shell/ui_MainScreen.h"
@@ -161,15 +162,13 @@ void MainScreen::connectActions()
     const auto on = [this](QAction *action, auto command) {
         connect(action, &QAction::triggered, this, command);
     };
-    const auto importText = [] { defaultInstance<frmImportWizard>().Show(); };
-    on(mUi->Import, importText);
-    on(mUi->tbImport, importText);
+    on(mUi->Import, [] { defaultInstance<frmImportWizard>().Show(); });
+    on(mUi->tbImport, [this] { mUi->Import->trigger(); });
     on(mUi->Quit, &QWidget::close);
     on(mUi->mnuSave, &editors::saveAll);
     on(mUi->tbSave, &editors::saveAll);
-    const auto searchTracks = [] { defaultInstance<frmSearchArtistsTitles>().Show(); };
-    on(mUi->mnuSearchArtistsTitles, searchTracks);
-    on(mUi->tbQuicksearch, searchTracks);
+    on(mUi->mnuSearchArtistsTitles, [] { defaultInstance<frmSearchArtistsTitles>().Show(); });
+    on(mUi->tbQuicksearch, [this] { mUi->mnuSearchArtistsTitles->trigger(); });
     on(mUi->mnuCDInsert, &editors::newCompilation);
     on(mUi->mnuInsertEnkelCD, &editors::newAlbum);
     on(mUi->mnuUpdate, &MainScreen::openBrowser);
@@ -178,6 +177,7 @@ void MainScreen::connectActions()
     on(mUi->tbHelp, &ShowHelpLinks);
     on(mUi->Over, &MainScreen::Over_Click);
     on(mUi->tbCredits, &MainScreen::Over_Click);
+    connectDiscEntries(*this); // the credits of the services come behind the program's own
     on(mUi->mnuEngels, [this] { ChangeLanguage(languageEnglish); });
     on(mUi->mnuNederlands, [this] { ChangeLanguage(languageDutch); });
 }

@@ -36,8 +36,10 @@ private slots:
         start(language);
         auto *steps = mProgram->control<FirstSteps>("frmCDList", "noCompilations");
         QVERIFY(steps->isVisible() && steps->isEnabled());
-        const std::pair<const char *, const char *> links[] = {
-            {"mnuCDInsert", "frmCDRoot"}, {"Import", "frmImportWizard"}, {"mnuHelp", "frmHelp"}};
+        const std::pair<const char *, const char *> links[] = {{"mnuCDInsert", "frmCDRoot"},
+                                                               {"mnuCDDB", "frmDiscInfoCDDB"},
+                                                               {"Import", "frmImportWizard"},
+                                                               {"mnuHelp", "frmHelp"}};
         for (const auto &[command, screen] : links) {
             const QAction *entry = mProgram->entry(command);
             QVERIFY(steps->text().contains(u"href=\""_s + entry->objectName()));
@@ -45,7 +47,8 @@ private slots:
             emit steps->linkActivated(entry->objectName());
             QVERIFY2(mProgram->screen(screen), screen);
         }
-        QVERIFY2(!steps->text().contains("mnuCDDB"_L1), "what is disabled is not offered");
+        const auto *others = mProgram->control<FirstSteps>("frmCDList", "noMP3");
+        QVERIFY2(!others->text().contains("mnuMP3"_L1), "what is disabled is not offered");
     }
 
     void itGoesWithTheFirstDisc()

@@ -4,6 +4,15 @@
 #include "collection/frmCDRoot.h"
 #include "collection/frmCDRootE.h"
 #include "collection/frmSearchArtistsTitles.h"
+#include "discdata/Candidates.h"
+#include "discdata/Credits.h"
+#include "discdata/DiscEditor.h"
+#include "discdata/ProxyInfo.h"
+#include "discdata/SearchByWords.h"
+#include "discdata/SignUp.h"
+#include "discdata/frmDiscInfoCDDB.h"
+#include "discdata/frmWhatCD.h"
+#include "discdata/frmWhatNow.h"
 #include "platform/ado/connection.h"
 #include "reports/frmPageSetup.h"
 #include "reports/reportpaper.h"
@@ -101,6 +110,39 @@ template <typename PrintedReport> Make makeReport()
         report->setCaption(PrintedReport::caption());
         return report;
     };
+}
+
+DiscRecord aDisc()
+{
+    DiscRecord disc;
+    disc.title = u"Best"_s;
+    disc.artist.name = u"Zed"_s;
+    disc.tracks.resize(2);
+    return disc;
+}
+
+Form *makeDiscEditor()
+{
+    return new DiscEditor(aDisc(), true, {u"Rock"_s});
+}
+
+Form *makeCandidates()
+{
+    return new Candidates({aDisc(), aDisc()});
+}
+
+Form *makeSignUp()
+{
+    CddbUserProfile profile;
+    profile.services = knownServices();
+    return new SignUp(profile);
+}
+
+Form *makeWhatCD()
+{
+    auto *question = new frmWhatCD;
+    question->CDType = u"E"_s;
+    return question;
 }
 
 Form *makePageSetupOf(const QPageLayout &paper)
@@ -226,7 +268,16 @@ class tst_Screens : public QObject
                 {"CompilationReport", makeReport<CompilationReport>()},
                 {"AlbumReport", makeReport<AlbumReport>()},
                 {"PlatenbakReport", makeReport<PlatenbakReport>()},
-                {"frmPageSetup", makePageSetup}};
+                {"frmPageSetup", makePageSetup},
+                {"frmDiscInfoCDDB", make<frmDiscInfoCDDB>()},
+                {"DiscEditor", makeDiscEditor},
+                {"Candidates", makeCandidates},
+                {"SearchByWords", make<SearchByWords>()},
+                {"SignUp", makeSignUp},
+                {"Credits", make<Credits>()},
+                {"ProxyInfo", make<ProxyInfo>()},
+                {"frmWhatNow", make<frmWhatNow>()},
+                {"frmWhatCD", makeWhatCD}};
     }
 
     static void check(const QWidget *screen)
@@ -301,6 +352,8 @@ private slots:
         gLanguage = language;
         ScriptedDesktop desktop;
         TestCatalogue catalogue;
+        if (qstrncmp(QTest::currentDataTag(), "frmWhatCD", 9) == 0)
+            desktop.expectBox(GetMessage("MsgStillNoCDOfThisType").section(u'\r', 0, 0));
         Form *screen = make();
         QCOMPARE(screen->Name(), QString::fromLatin1(QTest::currentDataTag()).section(u',', 0, 0));
         for (QTimer *timer : screen->findChildren<QTimer *>())
@@ -329,6 +382,15 @@ private slots:
         row("AlbumReport", makeReport<AlbumReport>(), "");
         row("frmPageSetup", makePageSetup, "");
         row("frmPageSetup, landscape", makeLandscapeSetup, "");
+        row("frmDiscInfoCDDB", make<frmDiscInfoCDDB>(), "");
+        row("DiscEditor", makeDiscEditor, "");
+        row("Candidates", makeCandidates, "");
+        row("SearchByWords", make<SearchByWords>(), "");
+        row("SignUp", makeSignUp, "");
+        row("Credits", make<Credits>(), "");
+        row("ProxyInfo", make<ProxyInfo>(), "");
+        row("frmWhatNow", make<frmWhatNow>(), "");
+        row("frmWhatCD", makeWhatCD, "");
     }
 
     void tabWalksAround()

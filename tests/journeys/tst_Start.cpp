@@ -241,6 +241,7 @@ private slots:
                     shown.append(splash.findChild<QLabel *>(QLatin1String(label))->text());
                 QTest::keyClick(&splash, Qt::Key_Space);
             });
+            mDesktop->expectModal(u"Credits"_s, [](Form &credits) { credits.Unload(); });
             program.choose("tbCredits");
             QCOMPARE(shown, (QStringList{u"Version " SONGCASE_VERSION ""_s, QString()}));
             QCOMPARE(program.control<QLabel>("frmSplash", "lblAuthor")->text(), author);
