@@ -134,8 +134,20 @@ const State states[] = {
      }},
 };
 
+constexpr int logout = 0; // no signal: the session manager's word
 int gSignal = SIGTERM;
 const State *gState = nullptr; // none: the splash
+
+void askForTheEnd()
+{
+    if (gSignal != logout) {
+        ::kill(::getpid(), gSignal);
+        return;
+    }
+    char manager = 0; // nobody has a session manager, nor asks this one anything
+    QMetaObject::invokeMethod(qApp, "commitDataRequest", Qt::DirectConnection,
+                              QGenericArgument("QSessionManager&", &manager));
+}
 
 void act()
 {
@@ -150,7 +162,7 @@ void act()
             QTimer::singleShot(0, qApp, gState->enter);
         else if (entered && (!gState || gState->isThere())) {
             hand->stop();
-            ::kill(::getpid(), gSignal);
+            askForTheEnd();
         }
     });
     if (QCoreApplication::arguments().value(1) == "--state"_L1)
@@ -206,6 +218,9 @@ private slots:
         row("load", SIGHUP);
         row("export", SIGTERM);
         row("pdf", SIGTERM);
+        row("logout, box open", "box", logout);
+        row("logout, typed", "unsaved", logout);
+        row("logout in a load", "load", logout);
     }
 
     void endsInEachState()
