@@ -114,7 +114,7 @@ const Message furtherTexts[] = {
     {"xErrReadOnly", "The catalogue or its folder is read-only.", "De database of de map ervan is alleen-lezen."},
     {"xErrMoved", "The catalogue has been moved, replaced or deleted while it was open; nothing was written. Please start the program again.", "De database is verplaatst, vervangen of verwijderd terwijl deze open was; er is niets weggeschreven. Start het programma opnieuw."},
     {"xErrCannotUse", "The catalogue cannot be used.", "De database kan niet worden gebruikt."},
-    {"xErrInUse", "The catalogue is in use by another program.", "De database is in gebruik bij een ander programma."},
+    {"xErrInUse", "The catalogue is in use by another program; nothing was written. Please try again later.", "De database is in gebruik bij een ander programma; er is niets weggeschreven. Probeer het later opnieuw."},
     {"xErrDiskFull", "The disk is full; nothing was written.", "De schijf is vol; er is niets weggeschreven."},
     {"xErrCannotOpen", "The catalogue or its folder cannot be opened.", "De database of de map ervan kan niet worden geopend."},
     {"xErrDamaged", "The catalogue is damaged.", "De database is beschadigd."},

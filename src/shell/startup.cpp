@@ -4,17 +4,22 @@
 #include "catalogue/connect.h"
 #include "platform/ado/connection.h"
 #include "platform/ado/value.h"
+#include "platform/desktop/paintwait.h"
 #include "platform/text/textrules.h"
 #include "services/clsRegistry.h"
 #include "services/fileutilities.h"
+#include "services/frame.h"
 #include "services/globals.h"
 #include "services/messages.h"
 
+#include <QCoreApplication>
 #include <QDir>
+#include <QTimer>
 #include <algorithm>
 #include <cmath>
 #include <limits>
 #include <optional>
+#include <utility>
 
 using namespace Qt::StringLiterals;
 
@@ -102,6 +107,21 @@ void readGeneration(clsRegistry &settings, const QString &programFolder, Found &
     }
 }
 
+// The hourglass stays until the routine that waits has returned, or handles events.
+void showWait()
+{
+    constexpr int soon = 1; // milliseconds; with none it would come round in the wait
+    static bool shown = false;
+    if (!std::exchange(shown, true)) {
+        setFramePointer(vbHourglass);
+        QTimer::singleShot(soon, qApp, [] {
+            shown = false;
+            setFramePointer(vbDefault);
+        });
+    }
+    paintAlone();
+}
+
 } // namespace
 
 Found readSettings(const QString &programFolder)
@@ -138,6 +158,7 @@ void openCatalogue(const QString &file, bool lastRunBroken)
 {
     gConnection = std::make_unique<ADODB::Connection>();
     configureConnection(*gConnection, file);
+    gConnection->WhileLocked = showWait;
     try {
         cataloguefile::inspect(file);
         gConnection->Open();

@@ -191,6 +191,29 @@ private slots:
         QVERIFY(program.end());
     }
 
+    // The person sees that the program waits, and nothing else comes in.
+    void aLockThatIsLetGoIsWaitedFor()
+    {
+        makeCatalogue();
+        Program program(*mDesktop);
+        QVERIFY(program.start());
+        const OtherProgram other(gDatabasePath);
+        QCOMPARE(other.run("begin exclusive"), SQLITE_OK);
+        const auto pointer = [&] { return program.frame().cursor().shape(); };
+        bool cameIn = false;
+        QTimer::singleShot(1, &program.frame(), [&] { cameIn = true; });
+        gConnection->WhileLocked = [&, wait = gConnection->WhileLocked] {
+            wait();
+            QCOMPARE(pointer(), Qt::WaitCursor);
+            QVERIFY(!cameIn);
+            QCOMPARE(other.run("commit"), SQLITE_OK);
+        };
+        gConnection->Execute(u"insert into artiesten values (1,'x')"_s);
+        QTRY_COMPARE(pointer(), Qt::ArrowCursor);
+        QVERIFY(cameIn);
+        QVERIFY(program.end());
+    }
+
     void changeOfLanguage_data() { languages(); }
     void changeOfLanguage()
     {

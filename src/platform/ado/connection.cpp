@@ -7,7 +7,10 @@
 #include "platform/ado/roworder.h"
 #include "platform/ado/sqlfunctions.h"
 
+#include <QElapsedTimer>
+#include <QScopedValueRollback>
 #include <QStringList>
+#include <QThread>
 #include <algorithm>
 #include <sqlite3.h>
 
@@ -27,6 +30,11 @@ std::string_view textOf(sqlite3_value *cell)
         asItIs ? sqlite3_value_blob(cell) : static_cast<const void *>(sqlite3_value_text(cell)));
     return {bytes ? bytes : "", std::size_t(sqlite3_value_bytes(cell))};
 }
+
+// Other programs hold the catalogue for a moment while they save; a copy of it over a network takes
+// longer. Beyond this a person wants to know.
+constexpr int waitAtMost = 5;          // seconds
+constexpr unsigned long patience = 20; // milliseconds between two tries
 
 // A cell is asked for once, not for each thing about it: a connection without locks permits it.
 void readRow(sqlite3_stmt *s, Rows &rows)
@@ -67,8 +75,13 @@ struct Connection::Engine {
     bool transactionOpen = false;
     std::shared_ptr<TransactionFate> fate; // of the outermost share
 
+    QElapsedTimer waited; // for another program
+    bool waiting = false; // the engine is in the middle of a call
+
     ~Engine()
     {
+        if (waiting)
+            return; // the program ends: what is open is rolled back by who opens the file next
         prepared.clear();
         sqlite3_close(db);
     }
@@ -121,6 +134,8 @@ void Connection::requireOpen() const
 {
     if (!mEngine)
         throw makeError(errObjectClosed);
+    if (mEngine->waiting)
+        throw makeError(errNotPermitted);
 }
 
 ObjectStateEnum Connection::State() const
@@ -145,8 +160,10 @@ void Connection::Open(const QString &, const QString &, const QString &connectio
         // The program has one thread: the engine need not lock at each call.
         const int flags = access | SQLITE_OPEN_EXRESCODE | SQLITE_OPEN_NOMUTEX;
         check(sqlite3_open_v2(file.constData(), &mEngine->db, flags, nullptr));
-        // Another program's short lock is waited for; a longer wait would freeze the screen.
-        sqlite3_busy_timeout(mEngine->db, std::min(ConnectionTimeout, 1) * 1000);
+        const auto locked = [](void *self, int before) {
+            return int(static_cast<Connection *>(self)->waitForOthers(before));
+        };
+        sqlite3_busy_handler(mEngine->db, locked, this);
         sqlite3_db_config(mEngine->db, SQLITE_DBCONFIG_DEFENSIVE, 1, nullptr);
         sqlite3_db_config(mEngine->db, SQLITE_DBCONFIG_TRUSTED_SCHEMA, 0, nullptr);
         sqlite3_db_config(mEngine->db, SQLITE_DBCONFIG_DQS_DML, 0, nullptr);
@@ -162,6 +179,20 @@ void Connection::Open(const QString &, const QString &, const QString &connectio
         mEngine.reset();
         throw;
     }
+}
+
+// False: it takes too long. An engine that waits must not be called, nor left by an exception.
+bool Connection::waitForOthers(int before)
+{
+    if (before == 0)
+        mEngine->waited.start();
+    if (mEngine->waited.elapsed() >= std::min(ConnectionTimeout, waitAtMost) * 1000)
+        return false;
+    const QScopedValueRollback<bool> waiting(mEngine->waiting, true);
+    if (WhileLocked)
+        WhileLocked();
+    QThread::msleep(patience);
+    return true;
 }
 
 void Connection::Close()

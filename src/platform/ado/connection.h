@@ -3,6 +3,7 @@
 #include "platform/error/error.h"
 
 #include <QStringList>
+#include <functional>
 #include <memory>
 #include <vector>
 
@@ -50,9 +51,13 @@ public:
     Connection &operator=(const Connection &) = delete;
 
     // Attributes, to be set before Open().
-    QString ConnectionString; // "...;Data Source=<file>; "
-    int CommandTimeout = 30;  // seconds
-    int ConnectionTimeout = 15;
+    QString ConnectionString;   // "...;Data Source=<file>; "
+    int CommandTimeout = 30;    // seconds
+    int ConnectionTimeout = 15; // seconds; another program's lock is waited for as long, at most 5
+
+    /// Called some fifty times a second while another program's lock is waited for, in the middle
+    /// of a call of the engine: it must not come back to this connection.
+    std::function<void()> WhileLocked;
     CursorLocationEnum CursorLocation = adUseServer;
     IsolationLevelEnum IsolationLevel = adXactReadCommitted;
     ConnectModeEnum Mode = adModeRead;
@@ -109,6 +114,7 @@ private:
     void check(int code);
     sqlite3 *handle() const; // null while closed
     void requireOpen() const;
+    bool waitForOthers(int before);
     void disconnect() noexcept;
     void settleBefore(bool readOnly);
     void requireKept() const; // that the engine has not taken an open transaction back

@@ -13,3 +13,11 @@ void paintUntil(const std::function<bool()> &come, int longest)
     while (!come() && waited.elapsed() < longest)
         QCoreApplication::processEvents(QEventLoop::ExcludeUserInputEvents, 5);
 }
+
+void paintAlone()
+{
+    const NestedLoop painting;
+    QCoreApplication::processEvents(QEventLoop::ExcludeUserInputEvents |
+                                    QEventLoop::ExcludeSocketNotifiers |
+                                    QEventLoop::X11ExcludeTimers);
+}
