@@ -112,7 +112,7 @@ const Message furtherTexts[] = {
     {"xErrSyntax", "Syntax error in the statement.", "Syntaxisfout in de opdracht."},
     {"xErrConstraint", "The catalogue refused the values.", "De database weigert de waarden."},
     {"xErrReadOnly", "The catalogue or its folder is read-only.", "De database of de map ervan is alleen-lezen."},
-    {"xErrMoved", "The catalogue has been moved, replaced or deleted while it was open; nothing was written. Please start the program again.", "De database is verplaatst, vervangen of verwijderd terwijl deze open was; er is niets weggeschreven. Start het programma opnieuw."},
+    {"xErrMoved", "The catalogue has been moved, replaced or deleted while it was open; nothing was written. Please put it back, or start the program again.", "De database is verplaatst, vervangen of verwijderd terwijl deze open was; er is niets weggeschreven. Zet deze terug of start het programma opnieuw."},
     {"xErrCannotUse", "The catalogue cannot be used.", "De database kan niet worden gebruikt."},
     {"xErrInUse", "The catalogue is in use by another program; nothing was written. Please try again later.", "De database is in gebruik bij een ander programma; er is niets weggeschreven. Probeer het later opnieuw."},
     {"xErrDiskFull", "The disk is full; nothing was written.", "De schijf is vol; er is niets weggeschreven."},

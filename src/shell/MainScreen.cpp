@@ -13,6 +13,7 @@
 #include "services/globals.h"
 #include "services/messages.h"
 #include "shell/accesskeys.h"
+#include "shell/cataloguewatch.h"
 #include "shell/discentries.h"
 #include "shell/frmHelp.h"
 #include "shell/frmSplash.h"
@@ -83,6 +84,7 @@ void MainScreen::setUpControls()
     setCentralWidget(mUi->Children);
     connectActions();
     new AccessKeys(mUi->MenuBar, this);
+    new CatalogueWatch(this);
     Frame::setCurrent(this);
     Form::setHost(this);
 }

@@ -179,6 +179,15 @@ private slots:
         QVERIFY(QFile::rename(file, moved));
         if (replaced)
             writeFile(file, before);
+        const auto comeBack = [] {
+            emit qApp->applicationStateChanged(Qt::ApplicationActive);
+            QCoreApplication::sendPostedEvents();
+        };
+        mDesktop->expectBox(u"moved, replaced or deleted"_s);
+        comeBack();
+        mDesktop->verifyAllCame();
+        comeBack(); // and not again
+
         QString told;
         try {
             gConnection->Execute(u"insert into artiesten values (1,'x')"_s);
@@ -188,6 +197,9 @@ private slots:
         QVERIFY2(told.contains("moved, replaced or deleted"_L1), qPrintable(told));
         QCOMPARE(readFile(moved), before);
         QCOMPARE(readFile(file), replaced ? before : QByteArray("none"));
+        QFile::remove(file);
+        QVERIFY(QFile::rename(moved, file));
+        gConnection->Execute(u"insert into artiesten values (1,'x')"_s); // put back
         QVERIFY(program.end());
     }
 

@@ -238,6 +238,14 @@ qint64 Connection::changes() const
     return sqlite3_total_changes64(mEngine->db);
 }
 
+bool Connection::hasMoved() const
+{
+    requireOpen();
+    int moved = 0;
+    sqlite3_file_control(mEngine->db, "main", SQLITE_FCNTL_HAS_MOVED, &moved);
+    return moved != 0;
+}
+
 void Connection::refuse(const Error &error)
 {
     Errors.assign(1, error);

@@ -80,6 +80,10 @@ public:
     /// routine sees whether another one has written meanwhile.
     qint64 changes() const;
 
+    /// Whether the file has been moved, replaced or deleted since it was opened. What is written
+    /// then is refused by the engine.
+    bool hasMoved() const;
+
     /// Fails as the engine would: the error stands in Errors and is thrown.
     [[noreturn]] void refuse(const Error &error);
 
