@@ -10,7 +10,6 @@
 #include <QElapsedTimer>
 #include <QScopedValueRollback>
 #include <QStringList>
-#include <QThread>
 #include <algorithm>
 #include <sqlite3.h>
 
@@ -33,8 +32,8 @@ std::string_view textOf(sqlite3_value *cell)
 
 // Other programs hold the catalogue for a moment while they save; a copy of it over a network takes
 // longer. Beyond this a person wants to know.
-constexpr int waitAtMost = 5;          // seconds
-constexpr unsigned long patience = 20; // milliseconds between two tries
+constexpr int waitAtMost = 5; // seconds
+constexpr int patience = 20;  // milliseconds between two tries
 
 // A cell is asked for once, not for each thing about it: a connection without locks permits it.
 void readRow(sqlite3_stmt *s, Rows &rows)
@@ -191,7 +190,7 @@ bool Connection::waitForOthers(int before)
     const QScopedValueRollback<bool> waiting(mEngine->waiting, true);
     if (WhileLocked)
         WhileLocked();
-    QThread::msleep(patience);
+    sqlite3_sleep(patience);
     return true;
 }
 
