@@ -26,7 +26,7 @@ QJsonArray jsonOf(const QList<StoredTrack> &tracks)
 QList<StoredTrack> tracksIn(const QJsonArray &all)
 {
     QList<StoredTrack> tracks;
-    for (const QJsonValue &value : all) {
+    for (const auto &value : all) {
         const QJsonArray one = value.toArray();
         StoredTrack track{one.at(0).toString().toLongLong(), {}};
         for (int field = 0; field < trackFields; ++field)
@@ -60,7 +60,8 @@ std::optional<UnsavedRecord> UnsavedRecord::fromJson(const QJsonObject &object)
     UnsavedRecord record;
     record.isAlbum = object.value("album"_L1).toBool();
     record.id = object.value("id"_L1).toString().toLongLong();
-    for (const QJsonValue &value : object.value("content"_L1).toArray())
+    const QJsonArray content = object.value("content"_L1).toArray();
+    for (const auto &value : content)
         record.content.append(value.toString());
     const QJsonArray header = object.value("header"_L1).toArray();
     record.header = {header.at(0).toString(), header.at(1).toString(), header.at(2).toString(),

@@ -3,6 +3,7 @@
 #include "services/clsRegistry.h"
 
 #include <QLocale>
+#include <QRectF>
 
 using namespace Qt::StringLiterals;
 

@@ -145,7 +145,7 @@ int storedLanguage()
 QString ReadProxySettings()
 {
     clsRegistry settings;
-    const QString useProxy = read(settings, "UseProxy");
+    QString useProxy = read(settings, "UseProxy");
     gUseProxy = useProxy == "1"_L1;
     gProxyServer = gUseProxy ? read(settings, "ProxyServer") : QString();
     gProxyPassword = gUseProxy ? read(settings, "ProxyPassword") : QString();

@@ -47,7 +47,7 @@ void TrackRows::setCdRunningId(qint64 id)
 void TrackRows::add(QStringView title, QStringView genre, QStringView year, int disc, int track)
 {
     mRecords.AddNew();
-    const auto set = [this](importfield::Column column, ADODB::Value value) {
+    const auto set = [this](importfield::Column column, const ADODB::Value &value) {
         mRecords.Fields(column).setValue(value);
     };
     set(importfield::ListIndex, mNextDiscRowId++);

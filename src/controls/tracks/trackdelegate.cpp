@@ -39,7 +39,8 @@ bool TrackDelegate::eventFilter(QObject *editor, QEvent *event)
 
 void TrackDelegate::initStyleOption(QStyleOptionViewItem *option, const QModelIndex &index) const
 {
-    QStyledItemDelegate::initStyleOption(option, index); // the focus is shown on its cell
+    // Not the rule of whole rows: the focus is shown on its cell.
+    QStyledItemDelegate::initStyleOption(option, index); // NOLINT(bugprone-parent-virtual-call)
     if (index.column() == 0)
         option->palette.setBrush(QPalette::Text, option->palette.placeholderText());
 }

@@ -295,10 +295,11 @@ void TrackModel::show(QList<Row> rows)
     int number = 0;
     for (const Row &row : std::as_const(mRows))
         mNumbers.append(isTrack(row) ? ++number : 0);
-    if (more > 0)
+    if (more > 0) {
         endInsertRows();
-    else if (more < 0)
+    } else if (more < 0) {
         endRemoveRows();
+    }
     emit dataChanged(index(0, 0), index(rowCount() - 1, columnCount() - 1));
 }
 

@@ -222,7 +222,7 @@ void QtDesktop::sendKeys(const QString &keys)
 
 void QtDesktop::openAddress(const QString &url, std::function<void()> notOpened)
 {
-    openInBrowser(url, std::move(notOpened));
+    openInBrowser(url, notOpened);
 }
 
 QString QtDesktop::settingsFile()
