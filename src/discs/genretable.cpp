@@ -42,8 +42,9 @@ const QStringList &usualTable()
 // Letters and digits alone: "hip hop" is "Hip-Hop", "drum and bass" is "Drum & Bass".
 QString bare(const QString &name)
 {
+    const QString folded = name.toCaseFolded().replace(u" and "_s, u" "_s);
     QString letters;
-    for (const QChar c : name.toCaseFolded().replace(u" and "_s, u" "_s)) {
+    for (const QChar c : folded) {
         if (c.isLetterOrNumber())
             letters += c;
     }
