@@ -13,14 +13,14 @@ namespace
 {
 
 const std::vector<ListColumn> columns = {{ListColumn::Hidden},
-                                         {ListColumn::Text, "Artiest", 4},
-                                         {ListColumn::Text, "Titel", 5},
+                                         {ListColumn::Text, "Artiest", 5},
+                                         {ListColumn::Text, "Titel", 6},
                                          {ListColumn::Number, "xYear"},
-                                         {ListColumn::Text, "xDiscOf", 2},
+                                         {ListColumn::Text, "xDiscOf"},
                                          {ListColumn::Number, "xTracksHead"},
-                                         {ListColumn::Text, "xLabelName", 3},
-                                         {ListColumn::Text, "xCountry", 1},
-                                         {ListColumn::Text, "xSource", 2}};
+                                         {ListColumn::Text, "xLabelName", 4},
+                                         {ListColumn::Text, "xCountry"},
+                                         {ListColumn::Text, "xSource", 4}};
 
 QString numberOrNothing(int number)
 {

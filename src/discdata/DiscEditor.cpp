@@ -5,6 +5,7 @@
 #include "catalogue/typedtext.h"
 #include "discdata/ui_DiscEditor.h"
 #include "discs/cddbanswer.h"
+#include "discs/xmcd.h"
 #include "platform/desktop/desktop.h"
 #include "platform/desktop/modalloop.h"
 #include "platform/desktop/options.h"
@@ -44,8 +45,13 @@ ArtistName renamed(const ArtistName &was, const QString &name)
 
 } // namespace
 
-DiscEditor::DiscEditor(const DiscRecord &disc, bool isNew, const QStringList &genres)
-    : Form(u"DiscEditor"_s), mUi(std::make_unique<Ui::DiscEditor>()), mDisc(disc), mIsNew(isNew)
+DiscEditor::DiscEditor(const DiscRecord &disc, const std::optional<TableOfContents> &toc,
+                       const QStringList &genres)
+    : Form(u"DiscEditor"_s),
+      mUi(std::make_unique<Ui::DiscEditor>()),
+      mDisc(disc),
+      mNewToc(toc),
+      mIsNew(toc.has_value())
 {
     mUi->setupUi(this);
     setDefaultButton(mUi->OKButton);
@@ -143,6 +149,7 @@ void DiscEditor::show()
         mTracks.append({0, {track.artist.name, track.title, track.genre, track.year}});
     showCategories();
     mUi->chkSend->setVisible(mIsNew);
+    mUi->chkSend->setChecked(mIsNew);
     showTracks();
 }
 
@@ -248,12 +255,22 @@ bool DiscEditor::refusesYears()
     return false;
 }
 
+// Tells why a disc cannot be sent as it is.
+bool DiscEditor::refusesSending(const DiscRecord &disc)
+{
+    const char *key = isToBeSent() ? notToBeSent(disc, *mNewToc) : nullptr;
+    if (key)
+        errorBox(GetMessage(QLatin1String(key)) + u'\r' + GetMessage("xNotSentHint"));
+    return key;
+}
+
 void DiscEditor::OKButton_Click()
 {
     grid()->CommitEdit();
-    if (refusesYears())
+    const DiscRecord typed = shown();
+    if (refusesYears() || refusesSending(typed))
         return;
-    mDisc = shown();
+    mDisc = typed;
     mChanged = mDisc != mBefore;
     // No change of the disc: it only says where a new one goes.
     mDisc.category = mUi->cboCategory->currentText();

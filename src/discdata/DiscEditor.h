@@ -2,6 +2,7 @@
 
 #include "controls/tracks/trackrow.h"
 #include "discs/discrecord.h"
+#include "discs/toc.h"
 #include "platform/desktop/form.h"
 
 #include <memory>
@@ -20,7 +21,9 @@ class DiscEditor : public Form
     Q_OBJECT
 
 public:
-    DiscEditor(const DiscRecord &disc, bool isNew, const QStringList &genres);
+    /// `toc` is the disc that a new record describes; nothing for one that is not new.
+    DiscEditor(const DiscRecord &disc, const std::optional<TableOfContents> &toc,
+               const QStringList &genres);
     ~DiscEditor() override;
 
     bool isAccepted() const { return mAccepted; }
@@ -45,12 +48,14 @@ private:
     ArtistName shownArtist() const;
     void takeTracks(DiscRecord &disc) const;
     bool refusesYears();
+    bool refusesSending(const DiscRecord &disc);
     void OKButton_Click();
 
     std::unique_ptr<Ui::DiscEditor> mUi;
     DiscRecord mDisc, mBefore;  // before: as the fields showed it first
     QList<StoredTrack> mTracks; // as last shown: what one of the grids leaves out stays
-    bool mIsNew;
+    const std::optional<TableOfContents> mNewToc;
+    const bool mIsNew;
     bool mChanged = false;
     bool mAccepted = false;
 };

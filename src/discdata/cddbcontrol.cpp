@@ -228,7 +228,8 @@ CddbDiscPtr CDDBControl::GetFullDisc(const CddbDiscPtr &candidate, int)
 
 int CDDBControl::ShowEditDialog(const CddbDiscPtr &disc, int)
 {
-    auto *dialog = new DiscEditor(disc->record, disc->isNew, mGenres->usualNames());
+    const auto newToc = disc->isNew ? std::optional(tableOf(disc->toc)) : std::nullopt;
+    auto *dialog = new DiscEditor(disc->record, newToc, mGenres->usualNames());
     dialog->ShowModal();
     if (!dialog->isAccepted())
         return 0;

@@ -75,9 +75,23 @@ frmDiscInfoCDDB::frmDiscInfoCDDB()
     setDefaultButton(mUi->cmdDownload);
     setCancelButton(mUi->cmdCancel);
     connectControls();
+    keepReadable();
 }
 
 frmDiscInfoCDDB::~frmDiscInfoCDDB() = default;
+
+// The fields are disabled and yet there to be read.
+void frmDiscInfoCDDB::keepReadable()
+{
+    for (QWidget *shown : std::initializer_list<QWidget *>{
+             mUi->txtArtist, mUi->txtTitle, mUi->txtGenre, mUi->txtYear, mUi->txtDiscNo,
+             mUi->txtTotalDiscs, mUi->OptCmpYes, mUi->OptCmpNo}) {
+        QPalette palette = shown->palette();
+        for (const auto role : {QPalette::Text, QPalette::WindowText})
+            palette.setBrush(QPalette::Disabled, role, palette.brush(QPalette::Active, role));
+        shown->setPalette(palette);
+    }
+}
 
 void frmDiscInfoCDDB::connectControls()
 {

@@ -29,6 +29,7 @@ protected:
 
 private:
     void connectControls();
+    void keepReadable();
     void setCaptions();
     void setButtonsEnabled(bool enabled);
     void InitializeCDDBControl();

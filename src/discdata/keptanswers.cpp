@@ -39,7 +39,8 @@ QByteArray takeLine(QByteArray &bytes)
 // Nothing but a whole file of ours that answers this very question.
 std::optional<KeptAnswers::Answer> readContent(QByteArray bytes, const QString &question)
 {
-    if (takeLine(bytes) != format || takeLine(bytes) != checksum(bytes))
+    const QByteArray begins = takeLine(bytes), sum = takeLine(bytes);
+    if (begins != format || sum != checksum(bytes))
         return {};
     const QDate date = QDate::fromString(QString::fromLatin1(takeLine(bytes)), Qt::ISODate);
     if (!date.isValid() || takeLine(bytes) != question.toUtf8().replace('\n', ' '))

@@ -191,6 +191,7 @@ const Message furtherTexts[] = {
     {"xNotADiscRecord", "This is not a record of a disc.", "Dit is geen beschrijving van een CD."},
     {"xNotACddbAnswer", "The answer is not one of a CDDB server.", "Het antwoord is niet van een CDDB-server."},
     {"xNotAMusicBrainzAnswer", "The answer is not one of MusicBrainz.", "Het antwoord is niet van MusicBrainz."},
+    {"xNotSentHint", "Please fill this in, or take the mark off the box below the tracks.", "Vul dit in of haal het kruisje onder de tracks weg."},
     {"xNotSentTracks", "The record has another number of tracks than the disc.", "De beschrijving heeft een ander aantal tracks dan de CD."},
     {"xNotSentTitle", "The disc has no title yet.", "De CD heeft nog geen titel."},
     {"xNotSentArtist", "The disc has no artist yet.", "De CD heeft nog geen artiest."},

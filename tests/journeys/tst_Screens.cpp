@@ -123,7 +123,7 @@ DiscRecord aDisc()
 
 Form *makeDiscEditor()
 {
-    return new DiscEditor(aDisc(), true, {u"Rock"_s});
+    return new DiscEditor(aDisc(), TableOfContents(), {u"Rock"_s});
 }
 
 Form *makeCandidates()

@@ -30,6 +30,12 @@ ListColumns::ListColumns(DBListViewCTL *list, std::vector<ListColumn> columns, i
     mList->viewport()->installEventFilter(this);
 }
 
+// Where the list goes first, it has deleted them.
+ListColumns::~ListColumns()
+{
+    delete mShares;
+}
+
 void ListColumns::show(const ADODB::RecordsetPtr &recordset)
 {
     mShares->keepOver([&] {

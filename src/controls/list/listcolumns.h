@@ -3,6 +3,7 @@
 #include "controls/list/columnshares.h"
 #include "platform/ado/recordset.h"
 
+#include <QPointer>
 #include <vector>
 
 class DBListViewCTL;
@@ -27,6 +28,7 @@ public:
     /// `whole` is what the shares are parts of, if it is not their sum.
     ListColumns(DBListViewCTL *list, std::vector<ListColumn> columns, int whole = 0,
                 Dragged dragged = Dragged::Kept);
+    ~ListColumns() override; // the list is free for other columns
 
     /// Shows the rows of a recordset, as Populate() does, under these columns. Throws Error if the
     /// recordset is closed.
@@ -43,5 +45,5 @@ private:
 
     DBListViewCTL *mList;
     std::vector<ListColumn> mColumns;
-    ColumnShares *mShares;
+    QPointer<ColumnShares> mShares;
 };
