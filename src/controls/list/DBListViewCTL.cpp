@@ -100,6 +100,9 @@ void DBListViewCTL::Populate()
     auto rows = mRecordset ? mRecordset->rows() : nullptr;
     mSorted = false;
     mTyped.clear();
+    // A head that is hidden while its model is reset can get no width afterwards.
+    for (int column = 0; column < mModel->columnCount(); ++column)
+        setColumnHidden(column, false);
     mModel->fill(std::move(rows));
     for (int column = 0; column < mModel->columnCount(); ++column) {
         setColumnHidden(column, false);

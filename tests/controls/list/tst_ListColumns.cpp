@@ -83,6 +83,26 @@ private slots:
         QTRY_COMPARE(parts.widths(), u"0 40 80 40"_s);
     }
 
+    // What one set of columns hid does not stay hidden under the next.
+    void otherColumnsInTheSameList()
+    {
+        ShownColumns shown;
+        QTRY_COMPARE(shown.widths(), u"0 100 200 101"_s);
+        delete shown.columns;
+        const auto rows = std::make_shared<ADODB::Recordset>();
+        rows->appendField(u"Dummy"_s, ADODB::adVarWChar);
+        rows->Open();
+        rows->AddNew();
+        shown.columns = new ListColumns(&shown.list, {{ListColumn::Hidden}});
+        shown.columns->show(rows);
+        QVERIFY(shown.list.isColumnHidden(0));
+        delete shown.columns;
+        shown.columns = new ListColumns(
+            &shown.list, {{ListColumn::Text, "Titel", 1}, {ListColumn::Text, "Genre", 3}});
+        shown.columns->showNone();
+        QCOMPARE(shown.widths(), u"100 301 0 0"_s);
+    }
+
     void whatWasDraggedIsKept_data()
     {
         const DataRows<int, bool, QString, QString> row("whole", "kept", "shown again", "wider");
