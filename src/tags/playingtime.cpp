@@ -1,23 +1,17 @@
 #include "tags/playingtime.h"
 
+#include "tags/ordinaryfile.h"
+
 #include <QFile>
 #include <QFileInfo>
 #include <QSet>
 #include <fileref.h>
-#include <sys/stat.h>
 #include <tag.h>
 
 using namespace Qt::StringLiterals;
 
 namespace
 {
-
-// Opening a pipe or a device could wait for ever.
-bool isOrdinaryFile(const QByteArray &path)
-{
-    struct stat about = {};
-    return stat(path.constData(), &about) == 0 && S_ISREG(about.st_mode);
-}
 
 QString text(const TagLib::String &text)
 {
@@ -36,9 +30,9 @@ bool isSoundFile(const QString &name)
 
 std::optional<SoundFile> readSoundFile(const QString &name)
 {
-    const QByteArray path = QFile::encodeName(name);
-    if (!isOrdinaryFile(path))
+    if (!isOrdinaryFile(name))
         return {};
+    const QByteArray path = QFile::encodeName(name);
     const TagLib::FileRef file(path.constData(), true, TagLib::AudioProperties::Average);
     if (file.isNull() || !file.audioProperties() ||
         file.audioProperties()->lengthInMilliseconds() <= 0)
