@@ -15,6 +15,8 @@
 #include "services/frame.h"
 #include "services/messages.h"
 
+#include <QFileInfo>
+
 using namespace Qt::StringLiterals;
 
 namespace
@@ -214,9 +216,9 @@ std::optional<QString> frmDiscInfoCDDB::deviceName()
     QString name = mUi->TheDrive->Drive().trimmed();
     if (mUi->TheDrive->entry() == DriveBox::Image) {
         name = Desktop::current().openFileName(
-            {GetMessage("xImageTitle"), {}, GetMessage("xImageFiles"), {}});
+            {GetMessage("xImageTitle"), mFolder, GetMessage("xImageFiles"), {}});
     } else if (mUi->TheDrive->entry() == DriveBox::Folder) {
-        name = Desktop::current().folderName({GetMessage("xFolderTitle"), {}, {}, {}});
+        name = Desktop::current().folderName({GetMessage("xFolderTitle"), mFolder, {}, {}});
     } else if (mUi->TheDrive->entry() == DriveBox::Words) {
         auto *question = new SearchByWords;
         question->ShowModal();
@@ -225,6 +227,8 @@ std::optional<QString> frmDiscInfoCDDB::deviceName()
     } else if (name.isEmpty()) {
         return u"0"_s;
     }
+    if (mUi->TheDrive->entry() == DriveBox::Image || mUi->TheDrive->entry() == DriveBox::Folder)
+        mFolder = name.isEmpty() ? mFolder : QFileInfo(name).path(); // the next one is beside it
     return name.isEmpty() ? std::nullopt : std::optional(name);
 }
 

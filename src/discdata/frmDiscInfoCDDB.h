@@ -65,6 +65,7 @@ private:
     std::unique_ptr<CDDBControl> TheCDDB;
     std::unique_ptr<MMControl> MCICtl;
     CddbDiscPtr mDisc;              // on show
+    QString mFolder;                // where the last image or folder was chosen
     QString mToc;                   // read last
     CddbGenreListPtr mGenres;       // fetched anew at each look-up
     ADODB::RecordsetPtr mTrackRows; // source of the list and of the import
