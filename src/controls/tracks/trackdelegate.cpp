@@ -41,6 +41,10 @@ void TrackDelegate::initStyleOption(QStyleOptionViewItem *option, const QModelIn
 {
     // Not the rule of whole rows: the focus is shown on its cell.
     QStyledItemDelegate::initStyleOption(option, index); // NOLINT(bugprone-parent-virtual-call)
-    if (index.column() == 0)
-        option->palette.setBrush(QPalette::Text, option->palette.placeholderText());
+    if (index.column() != 0)
+        return;
+    // Half of the ink: what themes call a placeholder's colour need not go with the text's.
+    QColor lighter = option->palette.color(QPalette::Text);
+    lighter.setAlphaF(0.55F);
+    option->palette.setColor(QPalette::Text, lighter);
 }
