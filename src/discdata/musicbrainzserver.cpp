@@ -10,7 +10,7 @@ namespace
 {
 
 constexpr int retries = 3;
-constexpr std::size_t pageSize = 25; // of an answer; that there are more it does not tell
+constexpr int pageSize = 25; // releases; a look-up by id does not tell that there are more
 constexpr int mostPages = 4;
 constexpr char included[] = "inc=artist-credits+recordings+release-groups+genres+labels";
 
@@ -81,28 +81,39 @@ std::vector<DiscRecord> MusicBrainzServer::find(const TableOfContents &toc, Long
 {
     if (!toc.isValid() || !isTakenThere(musicBrainzToc(toc)))
         return {};
-    std::vector<DiscRecord> all = page(toc, 0, work);
-    bool full = all.size() >= pageSize;
-    for (int pages = 1; full && pages < mostPages; ++pages) {
-        const auto more = page(toc, pages * int(pageSize), work);
-        full = more.size() >= pageSize && more.front() != all.front();
-        if (!more.empty() && more.front() != all.front())
-            all.insert(all.end(), more.begin(), more.end());
+    const QByteArrayList found = pages(toc, work);
+    if (found.isEmpty())
+        return {};
+    return ofService(understood(name(), [&] { return musicBrainzDiscs(found, toc); }));
+}
+
+// A server that does not go on behind `from` gives its first page again.
+QByteArrayList MusicBrainzServer::pages(const TableOfContents &toc, LongWork &work)
+{
+    QByteArrayList all;
+    QString first;
+    int from = 0;
+    for (bool goesOn = true; goesOn && all.size() < mostPages;) {
+        const QByteArray json = page(toc, from, work);
+        const MusicBrainzPage page = musicBrainzPage(json);
+        const bool isNew = all.isEmpty() || (page.listed > 0 && page.first != first);
+        if (json.isEmpty() || !isNew)
+            break;
+        all.append(json);
+        first = all.size() == 1 ? page.first : first;
+        from += page.listed;
+        goesOn = page.listed > 0 && (page.all < 0 ? page.listed >= pageSize : from < page.all);
     }
     return all;
 }
 
-std::vector<DiscRecord> MusicBrainzServer::page(const TableOfContents &toc, int from,
-                                                LongWork &work)
+QByteArray MusicBrainzServer::page(const TableOfContents &toc, int from, LongWork &work)
 {
     QByteArray question =
         "toc=" + musicBrainzToc(toc).replace(u' ', u'+').toLatin1() + "&cdstubs=no&" + included;
     if (from > 0)
         question += "&offset=" + QByteArray::number(from);
-    const QByteArray json = ask(u"discid/"_s + musicBrainzId(toc), question, work);
-    if (json.isEmpty())
-        return {};
-    return ofService(understood(name(), [&] { return musicBrainzDiscs(json, toc); }));
+    return ask(u"discid/"_s + musicBrainzId(toc), question, work);
 }
 
 std::vector<DiscRecord> MusicBrainzServer::search(const SearchWords &words, LongWork &work)

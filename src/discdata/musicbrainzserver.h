@@ -21,7 +21,8 @@ public:
 private:
     /// Empty: not known there.
     QByteArray ask(const QString &resource, const QByteArray &question, LongWork &work);
-    std::vector<DiscRecord> page(const TableOfContents &toc, int from, LongWork &work);
+    QByteArrayList pages(const TableOfContents &toc, LongWork &work);
+    QByteArray page(const TableOfContents &toc, int from, LongWork &work);
     std::vector<DiscRecord> ofService(std::vector<DiscRecord> records) const;
 
     HttpClient mClient;

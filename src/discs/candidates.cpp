@@ -19,6 +19,12 @@ bool isControl(char16_t c)
     return c < 0x20 || (c >= 0x7F && c < 0xA0);
 }
 
+// Embeddings and overrides: one without its end turns round what is shown behind the text.
+bool isDirection(char16_t c)
+{
+    return (c >= 0x202A && c <= 0x202E) || (c >= 0x2066 && c <= 0x2069);
+}
+
 bool isNoCharacter(char16_t c)
 {
     return c == 0xFEFF || c >= 0xFFFE || (c >= 0xFDD0 && c <= 0xFDEF);
@@ -35,7 +41,7 @@ bool isLoneSurrogate(const QString &text, qsizetype at)
 bool isToClean(const QString &text, qsizetype at)
 {
     const char16_t c = text[at].unicode();
-    return isControl(c) || (c > 0x2027 && (isLineEnd(c) || isNoCharacter(c))) ||
+    return isControl(c) || (c > 0x2027 && (isLineEnd(c) || isDirection(c) || isNoCharacter(c))) ||
            (text[at].isSurrogate() && isLoneSurrogate(text, at));
 }
 

@@ -111,6 +111,16 @@ bool fits(const Medium &medium, size_t tracks)
     return medium.medium.value("track-count"_L1).toInt() == int(tracks);
 }
 
+QJsonArray releasesOf(const QByteArrayList &pages)
+{
+    QJsonArray all;
+    for (const QByteArray &page : pages) {
+        for (const QJsonValue &release : listIn(objectIn(page), u"releases"_s))
+            all.append(release);
+    }
+    return all;
+}
+
 // The medium in the drive; the one with as many tracks where none has the id.
 void addMediumOfId(std::vector<DiscRecord> &records, const QJsonObject &release, const QString &id,
                    size_t tracks)
@@ -164,13 +174,13 @@ DiscRecord recordOfStub(const QJsonObject &stub)
 
 } // namespace
 
-std::vector<DiscRecord> musicBrainzDiscs(const QByteArray &json, const TableOfContents &toc)
+std::vector<DiscRecord> musicBrainzDiscs(const QByteArrayList &pages, const TableOfContents &toc)
 {
-    const QJsonObject answer = objectIn(json);
+    const QJsonObject answer = objectIn(pages.value(0));
     const bool isStub = !answer.contains("releases"_L1) && answer.value("tracks"_L1).isArray();
     if (isStub)
         return {recordOfStub(answer)};
-    const QJsonArray releases = listIn(answer, u"releases"_s);
+    const QJsonArray releases = releasesOf(pages);
     const TableOfContents counted = withoutDataBehind(toc);
     if (!answer.contains("id"_L1))
         return nearest(releases, counted.lengths());
@@ -179,6 +189,14 @@ std::vector<DiscRecord> musicBrainzDiscs(const QByteArray &json, const TableOfCo
         addMediumOfId(records, release.toObject(), answer.value("id"_L1).toString(),
                       counted.tracks.size());
     return records;
+}
+
+MusicBrainzPage musicBrainzPage(const QByteArray &json)
+{
+    const QJsonObject answer = QJsonDocument::fromJson(json).object();
+    const QJsonArray releases = answer.value("releases"_L1).toArray();
+    return {int(releases.size()), answer.value("release-count"_L1).toInt(-1),
+            releases.first()["id"_L1].toString()};
 }
 
 DiscRecord musicBrainzRelease(const QByteArray &json, int medium)

@@ -3,14 +3,23 @@
 #include "discs/discrecord.h"
 #include "discs/toc.h"
 
-#include <QByteArray>
+#include <QByteArrayList>
 
 /// What an answer of the web service in JSON says. All throw Error (errSyntax) where it is none of
 /// theirs: cut off, HTML, another shape.
 
-/// An answer to a look-up by disc id or, for a disc that is not known there, by the lengths of its
-/// tracks (the nearest first, those too far off left out). Whole where tracks are listed.
-std::vector<DiscRecord> musicBrainzDiscs(const QByteArray &json, const TableOfContents &toc);
+/// The answers to one look-up, page by page: by disc id or, for a disc that is not known there, by
+/// the lengths of its tracks (the nearest of all pages first, those too far off left out). Whole
+/// where tracks are listed.
+std::vector<DiscRecord> musicBrainzDiscs(const QByteArrayList &pages, const TableOfContents &toc);
+
+/// What a page of a look-up lists, whether it is of use or not: the next one goes on behind it.
+struct MusicBrainzPage {
+    int listed = 0; // releases; 0 in what is no such page
+    int all = -1;   // of all pages; -1 where the answer does not tell
+    QString first;  // id of the first release
+};
+MusicBrainzPage musicBrainzPage(const QByteArray &json);
 
 /// One medium of a release; the numbers are those of the set, from 1.
 DiscRecord musicBrainzRelease(const QByteArray &json, int medium);

@@ -80,7 +80,7 @@ struct Writer {
     }
 };
 
-// `whole` becomes false where a field is missing or of another type.
+// `whole` becomes false where a field is missing or of another type, a part of a number as well.
 struct Reader {
     const QJsonObject object;
     bool &whole;
@@ -97,7 +97,9 @@ struct Reader {
     }
     void operator()(const QString &name, int &number) const
     {
-        number = take(name, QJsonValue::Double).toInt();
+        const double value = take(name, QJsonValue::Double).toDouble();
+        number = QJsonValue(value).toInt();
+        whole = whole && number == value;
     }
     void operator()(const QString &name, bool &flag) const
     {
@@ -106,8 +108,10 @@ struct Reader {
     void operator()(const QString &name, QStringList &texts) const
     {
         texts.clear();
-        for (const QJsonValue &text : take(name, QJsonValue::Array).toArray())
+        for (const QJsonValue &text : take(name, QJsonValue::Array).toArray()) {
+            whole = whole && text.isString();
             texts.append(text.toString());
+        }
     }
     void operator()(const QString &name, ArtistName &artist) const
     {
