@@ -173,7 +173,7 @@ Lookup &CDDBControl::lookup()
 
 CddbDiscPtr CDDBControl::discOf(const DiscRecord &record, const QString &toc) const
 {
-    const auto disc = std::make_shared<CddbDisc>(record, mGenres);
+    auto disc = std::make_shared<CddbDisc>(record, mGenres);
     disc->toc = toc;
     return disc;
 }
@@ -240,7 +240,7 @@ int CDDBControl::ShowEditDialog(const CddbDiscPtr &disc, int)
 CddbDiscPtr CDDBControl::CreateDisc(const QString &toc, const QString &, const QString &)
 {
     const auto opaque = OpaqueToc::fromText(toc);
-    const CddbDiscPtr disc = discOf(newRecord(opaque.value_or(OpaqueToc())), toc);
+    CddbDiscPtr disc = discOf(newRecord(opaque.value_or(OpaqueToc())), toc);
     disc->isNew = true;
     return disc;
 }

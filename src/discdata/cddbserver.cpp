@@ -126,7 +126,7 @@ CddbAnswer CddbServer::command(const QString &words, LongWork &work)
     });
     if (got.status >= 400 && (got.isHtml() || got.body.isEmpty()))
         throw Error(errServiceFailed, name(), statusWords(got));
-    const CddbAnswer answer = understood(name(), [&] { return readCddbAnswer(got.body); });
+    CddbAnswer answer = understood(name(), [&] { return readCddbAnswer(got.body); });
     if (answer.isRefusal())
         throw Error(errServiceRefused, name(), answer.text);
     if (answer.code / 100 != 2)
@@ -138,7 +138,7 @@ CddbAnswer CddbServer::command(const QString &words, LongWork &work)
 
 CddbAnswer CddbServer::query(const QString &arguments, LongWork &work)
 {
-    const CddbAnswer answer = command(u"cddb query "_s + arguments, work);
+    CddbAnswer answer = command(u"cddb query "_s + arguments, work);
     mQuery = arguments;
     mHasQueried = true;
     return answer;

@@ -102,7 +102,7 @@ HttpAnswer HttpClient::post(const QUrl &url, const Headers &headers, const QByte
 HttpAnswer HttpClient::ask(Request request, LongWork &work)
 {
     for (int redirects = 0;; ++redirects) {
-        const HttpAnswer answer = askPatiently(request, work);
+        HttpAnswer answer = askPatiently(request, work);
         if (!isRedirect(answer))
             return answer;
         QUrl to = request.url.resolved(QUrl::fromEncoded(answer.location));
@@ -118,7 +118,7 @@ HttpAnswer HttpClient::ask(Request request, LongWork &work)
 HttpAnswer HttpClient::askPatiently(const Request &request, LongWork &work)
 {
     for (int attempt = 0;; ++attempt) {
-        const HttpAnswer answer = askOnce(request, work);
+        HttpAnswer answer = askOnce(request, work);
         const int pause = pauseBefore(attempt, answer);
         if (!answer.isTooBusy() || attempt == mRetries || pause > longestPause)
             return answer;

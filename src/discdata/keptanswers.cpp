@@ -31,7 +31,7 @@ QByteArray fileContent(const QString &question, const QDate &date, const QByteAr
 QByteArray takeLine(QByteArray &bytes)
 {
     const qsizetype end = bytes.indexOf('\n');
-    const QByteArray line = bytes.left(end);
+    QByteArray line = bytes.left(end);
     bytes = end < 0 ? QByteArray() : bytes.mid(end + 1);
     return line;
 }

@@ -15,8 +15,8 @@ using namespace Qt::StringLiterals;
 namespace
 {
 
-constexpr int lockWithin = 100; // milliseconds; it is held for the time of a read and a write
-constexpr qint64 farthest = 60 * 1000; // no queue is longer: a clock has been set back
+constexpr int lockWithin = 100;    // milliseconds; it is held for the time of a read and a write
+constexpr qint64 farthest = 60000; // no queue is longer: a clock has been set back
 
 QString ownFolder()
 {

@@ -108,7 +108,7 @@ QString id3GenreName(int number)
 QString genreAsWritten(const QString &name)
 {
     const QString trimmed = name.trimmed();
-    const QString known = usualByBareName().value(bare(trimmed));
+    QString known = usualByBareName().value(bare(trimmed));
     if (!known.isEmpty() || trimmed.isEmpty())
         return known;
     return trimmed.front().toUpper() + trimmed.sliced(1);

@@ -42,7 +42,7 @@ struct Medium {
 std::vector<Medium> mediaOf(const QJsonObject &release)
 {
     std::vector<Medium> media;
-    for (const QJsonValue &value : release.value("media"_L1).toArray()) {
+    for (const auto &value : release.value("media"_L1).toArray()) {
         const QJsonObject medium = value.toObject();
         const int place = int(media.size()) + 1;
         media.push_back({release, medium, std::max(medium.value("position"_L1).toInt(place), 1)});
@@ -83,9 +83,9 @@ int worstLength(const QJsonArray &tracks, const std::vector<int> &lengths)
 int worstOfTables(const QJsonArray &discs, const std::vector<int> &lengths)
 {
     int best = unknown;
-    for (const QJsonValue &disc : discs) {
+    for (const auto &disc : discs) {
         TableOfContents toc;
-        for (const QJsonValue &offset : disc["offsets"_L1].toArray())
+        for (const auto &offset : disc["offsets"_L1].toArray())
             toc.tracks.push_back({offset.toInt()});
         toc.leadOut = disc["sectors"_L1].toInt();
         if (!toc.isValid() || toc.tracks.size() != lengths.size())
@@ -115,7 +115,7 @@ QJsonArray releasesOf(const QByteArrayList &pages)
 {
     QJsonArray all;
     for (const QByteArray &page : pages) {
-        for (const QJsonValue &release : listIn(objectIn(page), u"releases"_s))
+        for (const auto &release : listIn(objectIn(page), u"releases"_s))
             all.append(release);
     }
     return all;
@@ -136,7 +136,7 @@ void addMediumOfId(std::vector<DiscRecord> &records, const QJsonObject &release,
 std::vector<DiscRecord> nearest(const QJsonArray &releases, const std::vector<int> &lengths)
 {
     std::vector<std::pair<int, DiscRecord>> found;
-    for (const QJsonValue &release : releases) {
+    for (const auto &release : releases) {
         for (const Medium &medium : mediaOf(release.toObject())) {
             const int off = distance(medium, lengths);
             if (off <= farOff)
@@ -145,6 +145,7 @@ std::vector<DiscRecord> nearest(const QJsonArray &releases, const std::vector<in
     }
     std::ranges::stable_sort(found, {}, [](const auto &pair) { return pair.first; });
     std::vector<DiscRecord> records;
+    records.reserve(found.size());
     for (auto &pair : found)
         records.push_back(std::move(pair.second));
     return records;
@@ -158,7 +159,7 @@ DiscRecord recordOfStub(const QJsonObject &stub)
     disc.artist.name = textIn(stub, u"artist"_s);
     disc.barcode = textIn(stub, u"barcode"_s);
     disc.isCompilation = isVariousArtists(disc.artist.name);
-    for (const QJsonValue &value : stub.value("tracks"_L1).toArray()) {
+    for (const auto &value : stub.value("tracks"_L1).toArray()) {
         const QJsonObject track = value.toObject();
         TrackRecord record;
         record.title = textIn(track, u"title"_s);
@@ -185,7 +186,7 @@ std::vector<DiscRecord> musicBrainzDiscs(const QByteArrayList &pages, const Tabl
     if (!answer.contains("id"_L1))
         return nearest(releases, counted.lengths());
     std::vector<DiscRecord> records;
-    for (const QJsonValue &release : releases)
+    for (const auto &release : releases)
         addMediumOfId(records, release.toObject(), answer.value("id"_L1).toString(),
                       counted.tracks.size());
     return records;
@@ -212,7 +213,7 @@ DiscRecord musicBrainzRelease(const QByteArray &json, int medium)
 std::vector<DiscRecord> musicBrainzSearch(const QByteArray &json)
 {
     std::vector<DiscRecord> records;
-    for (const QJsonValue &value : listIn(objectIn(json), u"releases"_s)) {
+    for (const auto &value : listIn(objectIn(json), u"releases"_s)) {
         for (const Medium &medium : mediaOf(value.toObject()))
             records.push_back(recordOf(medium));
     }

@@ -50,7 +50,7 @@ QString genreIn(const QJsonObject &of)
 {
     QString best;
     int votes = -1;
-    for (const QJsonValue &genre : of.value("genres"_L1).toArray()) {
+    for (const auto &genre : of.value("genres"_L1).toArray()) {
         const QString name = cleanText(genre["name"_L1].toString());
         const int count = genre["count"_L1].toInt();
         if (!name.isEmpty() && count > votes) {
@@ -77,8 +77,8 @@ QString yearOfRelease(const QJsonObject &release)
 
 QString labelOf(const QJsonObject &release)
 {
-    for (const QJsonValue &info : release.value("label-info"_L1).toArray()) {
-        const QString name = textIn(info["label"_L1].toObject(), u"name"_s);
+    for (const auto &info : release.value("label-info"_L1).toArray()) {
+        QString name = textIn(info["label"_L1].toObject(), u"name"_s);
         if (!name.isEmpty())
             return name;
     }
@@ -122,7 +122,7 @@ void takeTracks(DiscRecord &disc, const QJsonArray &tracks)
 {
     constexpr int mostTracks = 99;
     const bool withFilms = !hasSound(tracks);
-    for (const QJsonValue &track : tracks) {
+    for (const auto &track : tracks) {
         if (isHeard(track.toObject(), withFilms) && int(disc.tracks.size()) < mostTracks)
             disc.tracks.push_back(trackOf(track.toObject(), disc));
     }
@@ -138,7 +138,7 @@ QString textIn(const QJsonObject &object, const QString &name)
 ArtistName artistOfCredit(const QJsonArray &credit)
 {
     QString printed;
-    for (const QJsonValue &part : credit)
+    for (const auto &part : credit)
         printed += part["name"_L1].toString() + part["joinphrase"_L1].toString();
     printed = cleanText(printed);
     return credit.size() == 1 ? personOf(credit.first().toObject(), printed)

@@ -87,7 +87,7 @@ struct Reader {
 
     QJsonValue take(const QString &name, QJsonValue::Type type) const
     {
-        const QJsonValue value = object.value(name);
+        QJsonValue value = object.value(name);
         whole = whole && value.type() == type;
         return value;
     }
@@ -108,7 +108,7 @@ struct Reader {
     void operator()(const QString &name, QStringList &texts) const
     {
         texts.clear();
-        for (const QJsonValue &text : take(name, QJsonValue::Array).toArray()) {
+        for (const auto &text : take(name, QJsonValue::Array).toArray()) {
             whole = whole && text.isString();
             texts.append(text.toString());
         }
@@ -120,7 +120,7 @@ struct Reader {
     }
     void operator()(const QString &name, std::vector<TrackRecord> &tracks) const
     {
-        for (const QJsonValue &value : take(name, QJsonValue::Array).toArray()) {
+        for (const auto &value : take(name, QJsonValue::Array).toArray()) {
             const Reader reader{value.toObject(), whole};
             trackFields(tracks.emplace_back(), [&](const QString &n, auto &v) { reader(n, v); });
         }
@@ -146,7 +146,7 @@ std::optional<std::vector<DiscRecord>> recordsFromJson(const QByteArray &json)
     const QJsonObject file = QJsonDocument::fromJson(json).object();
     bool whole = file.value("version"_L1).toInt() == version && file.value("discs"_L1).isArray();
     std::vector<DiscRecord> records;
-    for (const QJsonValue &value : file.value("discs"_L1).toArray()) {
+    for (const auto &value : file.value("discs"_L1).toArray()) {
         const Reader reader{value.toObject(), whole};
         discFields(records.emplace_back(), [&](const QString &n, auto &v) { reader(n, v); });
     }

@@ -70,7 +70,7 @@ QString yearOf(const TagLib::ID3v2::Tag &tag)
 {
     constexpr qsizetype digits = 4;
     for (const char *frame : {"TDRC", "TYER"}) {
-        const QString year = joined(tag, frame).left(digits);
+        QString year = joined(tag, frame).left(digits);
         if (!year.isEmpty())
             return year;
     }
@@ -133,8 +133,8 @@ QString fileIdOf(const TagLib::ID3v2::Tag &tag)
         if (!id)
             continue;
         const TagLib::ByteVector data = id->identifier();
-        const QString text = textOf(id->owner()) + u'=' +
-                             QString::fromLatin1(QByteArray(data.data(), data.size()).toHex());
+        QString text = textOf(id->owner()) + u'=' +
+                       QString::fromLatin1(QByteArray(data.data(), data.size()).toHex());
         if (id->owner() == ownFileIdOwner)
             return text;
         if (other.isEmpty())

@@ -185,7 +185,7 @@ bool Connection::waitForOthers(int before)
 {
     if (before == 0)
         mEngine->waited.start();
-    if (mEngine->waited.elapsed() >= std::min(ConnectionTimeout, waitAtMost) * 1000)
+    if (mEngine->waited.elapsed() >= std::min(ConnectionTimeout, waitAtMost) * qint64(1000))
         return false;
     const QScopedValueRollback<bool> waiting(mEngine->waiting, true);
     if (WhileLocked)
