@@ -24,9 +24,12 @@ const auto selectMP3Collections =
 
 const auto countTracks = u"SELECT COUNT(*) AS AANTAL FROM TRACKS"_s;
 
+// By the rows themselves, for which the plus stands: an index of a large file is not compared with
+// its table at the start, and one that is damaged would leave links of a record that goes. The
+// engine tells of it here.
 QString deleteDiscsOf(qint64 title)
 {
-    return u" delete from compactdiscs where cdtitels_id = "_s + QString::number(title);
+    return u" delete from compactdiscs where +cdtitels_id = "_s + QString::number(title);
 }
 
 QString deleteTitleRow(qint64 title)

@@ -135,6 +135,29 @@ private slots:
         QVERIFY(mScreen->updatesEnabled());
     }
 
+    // Above a size nobody compares indexes with their tables beforehand.
+    void aDamagedIndexLeavesNoLinksBehind()
+    {
+        fill();
+        OtherProgram(mCatalogue->file())
+            .run("create table Kept as select * from sqlite_schema where name='CompactDiscsTitel';"
+                 "pragma writable_schema=on;"
+                 "delete from sqlite_schema where name='CompactDiscsTitel'");
+        OtherProgram(mCatalogue->file())
+            .run("insert into CompactDiscs select 99, CDTitels_ID, 1, 50, Track_ID, null from "
+                 "CompactDiscs where CDTitels_ID=2; pragma writable_schema=on;"
+                 "insert into sqlite_schema select * from Kept; drop table Kept");
+        show();
+        mDesktop->expectBox(u"yes-no"_s, vbYes);
+        mDesktop->expectBox(u"malformed"_s);
+        mDesktop->expectBox(u"malformed"_s); // the clean-up's own
+        control<QPushButton>("cmdDelete")->click();
+        QCOMPARE(mCatalogue->count(u"select count(*) from CDTitels"_s), 5);
+        QCOMPARE(mCatalogue->count(
+                     u"select count(*) from CompactDiscs not indexed where CDTitels_ID=2"_s),
+                 2);
+    }
+
     void theRememberedRowIsSelectedAgain()
     {
         for (int i = 1; i <= 7; ++i)
