@@ -27,6 +27,7 @@ int main(int argc, char **argv)
     registerStatementCases();
     registerEditCases();
     registerTextRuleCases();
+    registerDiscCases();
     benchmark::Initialize(&argc, argv);
     if (benchmark::ReportUnrecognizedArguments(argc, argv))
         return 2;

@@ -14,6 +14,7 @@ void registerSearchCases();    // our LIKE and SQLite's
 void registerStatementCases(); // what one statement costs more than a prepared one
 void registerEditCases();      // editors, their saves and completion, the record tree
 void registerTextRuleCases();  // the sort order
+void registerDiscCases();      // answers about discs
 
 /// The name of a case at a size: "browse/owner".
 inline std::string caseName(const char *name, const benchdata::Scale &scale)
