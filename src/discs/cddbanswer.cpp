@@ -167,6 +167,8 @@ std::vector<DiscRecord> cddbCandidates(const CddbAnswer &answer)
     std::vector<DiscRecord> candidates;
     if (answer.code == exactMatch) {
         addCandidate(answer.text, candidates);
+        if (candidates.empty()) // a line cut short must not count as "no match"
+            throw notUnderstood("xNotACddbAnswer", answer.text);
     } else if (answer.code == exactMatches || answer.code == closeMatches) {
         const QString lines = decoded(answer.body);
         for (const QStringView line : QStringView(lines).split(u'\n'))

@@ -23,7 +23,7 @@ struct CddbAnswer {
 CddbAnswer readCddbAnswer(const QByteArray &bytes);
 
 /// The candidates of an answer to a query, in the order of the server, with both keys: category and
-/// id. Empty for "no match"; Error (errSyntax) where it is no answer to a query.
+/// id. Empty for "no match"; Error (errSyntax) where it is no answer to a query, or a cut one.
 std::vector<DiscRecord> cddbCandidates(const CddbAnswer &answer);
 
 /// Whether a record stands for a refusal: its tracks say that the program is not supported.
