@@ -195,7 +195,7 @@ int CDDBControl::LookupDisc(const QString &toc, int)
         tellKept(*found.keptOn);
     if (found.candidates.empty())
         return cddbNoMatch;
-    if (found.candidates.size() == 1) {
+    if (found.candidates.size() == 1 && !found.isDoubtful) {
         mMatch = discOf(found.candidates.front(), toc);
         return cddbExact;
     }

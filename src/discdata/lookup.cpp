@@ -44,6 +44,13 @@ QString keptAs(const QString &service, const QString &question)
     return service + u'\t' + question;
 }
 
+// What a CDDB server finds close may be another disc.
+bool isDoubtful(const std::vector<DiscRecord> &candidates, const TableOfContents &toc)
+{
+    return candidates.size() == 1 && candidates.front().service == sender &&
+           candidates.front().tracks.size() != toc.tracks.size();
+}
+
 // Of two failures the one that tells the user more of what to do.
 int weight(const Error &error)
 {
@@ -217,7 +224,9 @@ Lookup::Found Lookup::finished(Found found, LongWork &work)
 Lookup::Found Lookup::find(const TableOfContents &toc, LongWork &work)
 {
     const auto ask = [&](DiscService &service) { return service.find(toc, work); };
-    return finished(askAll(questionOf(toc), ask, true), work);
+    Found found = finished(askAll(questionOf(toc), ask, true), work);
+    found.isDoubtful = isDoubtful(found.candidates, toc);
+    return found;
 }
 
 Lookup::Found Lookup::find(const SearchWords &words, LongWork &work)
@@ -259,5 +268,11 @@ void Lookup::send(const DiscRecord &disc, const TableOfContents &toc, LongWork &
 {
     DiscService &service = serviceNamed(sender);
     requireNotRefused(service);
-    service.send(disc, toc, work);
+    try {
+        service.send(disc, toc, work);
+    } catch (const Error &error) {
+        if (error.Number == errServiceRefused)
+            mRefusals->insert(identityOf(service), error.Description); // told by the caller
+        throw;
+    }
 }

@@ -25,6 +25,7 @@ public:
         std::vector<DiscRecord> candidates; // without repeats; one alone is whole
         QString service;                    // empty: nothing found
         std::optional<QDate> keptOn;        // an answer of that day, since nobody can be asked
+        bool isDoubtful = false; // the only one has another number of tracks: the user decides
     };
     struct Whole {
         DiscRecord disc;
@@ -48,7 +49,7 @@ public:
     /// The whole record of a candidate, from the service it comes from.
     Whole complete(const DiscRecord &candidate, LongWork &work);
 
-    /// To the CDDB server, whatever the order; errNotAccepted as well.
+    /// To the CDDB server, whatever the order; errNotAccepted as well. A refusal is not told here.
     void send(const DiscRecord &disc, const TableOfContents &toc, LongWork &work);
 
 private:
