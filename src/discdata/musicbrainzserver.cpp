@@ -62,6 +62,8 @@ QByteArray MusicBrainzServer::ask(const QString &resource, const QByteArray &que
         return {};
     if (answer.isTooBusy())
         throw serviceFailed(name(), "xServiceBusy", statusWords(answer));
+    if (answer.status == 200 && answer.body.isEmpty())
+        throw serviceFailed(name(), "xServiceStrange"); // not the same as "not known"
     if (answer.status == 200)
         return answer.body;
     const QString said = answer.isHtml() ? QString() : musicBrainzError(answer.body);
@@ -94,7 +96,14 @@ QByteArrayList MusicBrainzServer::pages(const TableOfContents &toc, LongWork &wo
     QString first;
     int from = 0;
     for (bool goesOn = true; goesOn && all.size() < mostPages;) {
-        const QByteArray json = page(toc, from, work);
+        QByteArray json;
+        try {
+            json = page(toc, from, work);
+        } catch (const Error &error) {
+            if (all.isEmpty() || error.Number == errLookupCancelled)
+                throw;
+            break; // what is there already counts
+        }
         const MusicBrainzPage page = musicBrainzPage(json);
         const bool isNew = all.isEmpty() || (page.listed > 0 && page.first != first);
         if (json.isEmpty() || !isNew)
