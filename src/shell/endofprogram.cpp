@@ -31,12 +31,10 @@ void EndOfProgram::request()
 void EndOfProgram::step()
 {
     LongWork::cancelAll();
-    if (!NestedLoop::none()) {
-        refuseWhatStandsOpen();
-        return;
-    }
-    // Not from here: a timer does not come round while it is answered.
-    QMetaObject::invokeMethod(this, &EndOfProgram::close, Qt::QueuedConnection);
+    // Not from here: a timer does not come round while it is answered, and both may ask something.
+    QMetaObject::invokeMethod(
+        this, NestedLoop::none() ? &EndOfProgram::close : &EndOfProgram::refuseWhatStandsOpen,
+        Qt::QueuedConnection);
 }
 
 void EndOfProgram::close()

@@ -1,5 +1,6 @@
 // Label: journey
 #include "catalogue/cataloguefile.h"
+#include "discdata/DiscEditor.h"
 #include "platform/ado/connection.h"
 #include "shell/program.h"
 #include "support/importfixture.h"
@@ -79,6 +80,16 @@ void import()
     defaultInstance<frmImportBusy>().ShowModal();
 }
 
+// A modal screen that asks before it goes.
+void editDisc()
+{
+    DiscRecord disc;
+    disc.tracks.resize(1);
+    auto *editor = new DiscEditor(disc, {}, {});
+    editor->findChild<QLineEdit *>(u"txtTitle"_s)->setText(u"Typed"_s);
+    editor->ShowModal();
+}
+
 void never() {}
 bool always()
 {
@@ -103,6 +114,7 @@ const State states[] = {
          find<QLineEdit>("frmCDRoot", "txtTitel")->setText(u"Typed"_s);
      },
      always},
+    {"disc edited", editDisc, [] { return find("DiscEditor", "txtTitle") != nullptr; }},
     {"reading", import, [] { return progressed("frmImportBusy", "ImportProgressBar"); }},
     {"load",
      [] {
@@ -214,6 +226,7 @@ private slots:
         row("about", SIGTERM);
         row("file dialog", SIGTERM);
         row("unsaved", SIGTERM);
+        row("disc edited", SIGTERM);
         row("reading", SIGTERM);
         row("load", SIGHUP);
         row("export", SIGTERM);
