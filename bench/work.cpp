@@ -5,8 +5,9 @@
 #include "services/globals.h"
 #include "workcommands.h"
 
-#include <QCoreApplication>
+#include <QApplication>
 #include <cstdio>
+#include <memory>
 
 namespace
 {
@@ -25,6 +26,8 @@ constexpr Command commands[] = {
     {"orphans", "CATALOGUE", removeOrphans},
     {"search", "CATALOGUE part|full|begin|end artist|title|genre|year|three WORD", search},
     {"export", "CATALOGUE FILE", exportAll},
+    {"lookup", "TOC cddb+ADDRESS|musicbrainz+ADDRESS", lookUpDisc},
+    {"importdisc", "CATALOGUE FILE", importDisc},
 };
 
 int usage()
@@ -44,13 +47,22 @@ const Command *find(const QStringList &words)
     return nullptr;
 }
 
+// A look-up is the long work of a screen, which must be there, if out of sight.
+std::unique_ptr<QCoreApplication> makeApplication(int &argc, char **argv)
+{
+    if (argc < 2 || qstrcmp(argv[1], "lookup") != 0)
+        return std::make_unique<QCoreApplication>(argc, argv);
+    qputenv("QT_QPA_PLATFORM", "offscreen");
+    return std::make_unique<QApplication>(argc, argv);
+}
+
 } // namespace
 
 // songcase-work COMMAND ...: what the screens do, without a screen, for timing from outside. Ends
 // with 1 if anything would have shown an error box.
 int main(int argc, char **argv)
 {
-    const QCoreApplication application(argc, argv);
+    const auto application = makeApplication(argc, argv);
     const QStringList words = QCoreApplication::arguments();
     const Command *command = find(words);
     if (!command)

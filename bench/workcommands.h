@@ -12,3 +12,5 @@ void loadText(const QStringList &arguments);      // CATALOGUE FORMAT FILE
 void removeOrphans(const QStringList &arguments); // CATALOGUE
 void search(const QStringList &arguments);        // CATALOGUE MODE FIELD WORD
 void exportAll(const QStringList &arguments);     // CATALOGUE FILE
+void lookUpDisc(const QStringList &arguments);    // TOC SERVICE+ADDRESS
+void importDisc(const QStringList &arguments);    // CATALOGUE FILE
