@@ -70,6 +70,14 @@ void tellKept(const QDate &day)
                    GetMessage("xKeptPart2"));
 }
 
+// There is no disc at hand that could be entered as a new one.
+[[noreturn]] void tellNothingFound()
+{
+    const QString text = GetMessage("xNothingFound");
+    informationBox(text);
+    throw Error(errNothingFound, u"CDDBControl"_s, text);
+}
+
 TableOfContents tableOf(const QString &toc)
 {
     const auto opaque = OpaqueToc::fromText(toc);
@@ -193,6 +201,8 @@ int CDDBControl::LookupDisc(const QString &toc, int)
     }
     if (found.keptOn)
         tellKept(*found.keptOn);
+    if (found.candidates.empty() && !opaque->words.isEmpty())
+        tellNothingFound();
     if (found.candidates.empty())
         return cddbNoMatch;
     if (found.candidates.size() == 1 && !found.isDoubtful) {

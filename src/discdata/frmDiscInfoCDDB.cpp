@@ -180,6 +180,7 @@ void frmDiscInfoCDDB::ClearDiscInfo()
     mColumns = new ListColumns(mUi->DlvTracks, {{ListColumn::Hidden}});
     mColumns->show(mTrackRows);
     setButtonsEnabled(false);
+    mEditFlags = 0; // those of the disc before say nothing about the next
 }
 
 void frmDiscInfoCDDB::cmdDownload_Click()
@@ -308,6 +309,7 @@ void frmDiscInfoCDDB::newDisc()
     try {
         if (mEditFlags & cddbToSend) {
             TheCDDB->SubmitDisc(disc, 0);
+            mEditFlags = 1; // once is enough
             informationBox(GetMessage("MsgDiscSubmitted"));
         }
     } catch (const Error &error) {

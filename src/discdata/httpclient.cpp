@@ -5,6 +5,7 @@
 #include "platform/work/longwork.h"
 
 #include <QAuthenticator>
+#include <QHostAddress>
 #include <QNetworkProxy>
 #include <QRandomGenerator>
 #include <QSslConfiguration>
@@ -139,7 +140,10 @@ int HttpClient::pauseBefore(int attempt, const HttpAnswer &answer) const
 
 HttpAnswer HttpClient::askOnce(const Request &request, LongWork &work)
 {
-    if (!mPace.await(request.url.host(), work))
+    // A server of this machine's own need not be spared.
+    const QString host = request.url.host();
+    const bool isOwn = host == "localhost"_L1 || QHostAddress(host).isLoopback();
+    if (!isOwn && !mPace.await(host, work))
         return cancelled();
     mProxyAsked = false;
     HttpTransfer transfer(start(request), mOptions.silence);

@@ -153,6 +153,7 @@ const Message furtherTexts[] = {
     {"xRefusal", "A service refuses to answer. In its own words:\r\r", "Een dienst weigert te antwoorden. In de eigen woorden van die dienst:\r\r"},
     {"xKeptPart1", "No service can be reached now. What is shown was answered on ", "Er is nu geen dienst bereikbaar. Getoond wordt het antwoord van "},
     {"xKeptPart2", ".", "."},
+    {"xNothingFound", "No disc was found for these words.", "Met deze woorden is geen disc gevonden."},
     {"xDataTrack", "Data", "Data"},
     {"xCandidatesCaption", "Discs found", "Gevonden discs"},
     {"xCandidatesWhich", "Several discs fit. Which one is yours?", "Er passen verschillende discs. Welke is de uwe?"},
