@@ -107,8 +107,6 @@ void DiscEditor::connectControls()
         field->setMaxLength(longestText);
     mUi->cboGenre->lineEdit()->setMaxLength(longestText);
     mUi->txtYear->setMaxLength(4);
-    mUi->NumberInSet->setMaximum(highestDisc);
-    mUi->TotalInSet->setMaximum(highestDisc);
     connect(mUi->OptCmpYes, &QRadioButton::toggled, this, &DiscEditor::OptCmp_Change);
     connect(mUi->NumberInSet, &QSpinBox::valueChanged, this, [this](int number) {
         mUi->TotalInSet->setMinimum(number); // a set has at least as many discs

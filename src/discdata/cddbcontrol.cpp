@@ -131,7 +131,6 @@ CddbUserProfile CDDBControl::GetUserProfile() const
 void CDDBControl::SetOptions(const CddbOptions &options)
 {
     mOptions = options;
-    mLookup.reset();
 }
 
 void CDDBControl::SetParentWindow(QWidget *window, int)
@@ -143,7 +142,6 @@ void CDDBControl::ShutDown()
 {
     mParent.clear();
     mMatch = {};
-    mLookup.reset();
 }
 
 QString CDDBControl::GetTocFromDevice(int deviceId) const
@@ -168,15 +166,15 @@ void CDDBControl::requireRegistered() const
 }
 
 // What the services are asked with is looked up each time: the user may have changed it meanwhile.
-Lookup &CDDBControl::lookup()
+std::unique_ptr<Lookup> CDDBControl::lookup() const
 {
     requireRegistered();
-    mLookup = std::make_unique<Lookup>(serviceOptions(GetUserProfile(), mOptions), keptAnswers(),
-                                       refusalsOfRun());
-    mLookup->tellRefusal = [](const QString &words) {
+    auto services = std::make_unique<Lookup>(serviceOptions(GetUserProfile(), mOptions),
+                                             keptAnswers(), refusalsOfRun());
+    services->tellRefusal = [](const QString &words) {
         informationBox(GetMessage("xRefusal") + words);
     };
-    return *mLookup;
+    return services;
 }
 
 CddbDiscPtr CDDBControl::discOf(const DiscRecord &record, const QString &toc) const
@@ -192,12 +190,12 @@ int CDDBControl::LookupDisc(const QString &toc, int)
     const auto opaque = OpaqueToc::fromText(toc);
     if (!opaque)
         throw Error(errServiceFailed, u"CDDBControl"_s, GetMessage("MsgInvalidTOC"));
-    Lookup &services = lookup();
+    const auto services = lookup();
     Lookup::Found found;
     {
         LongWork work(screen(), GetMessage("xLookingUp"));
-        found = opaque->words.isEmpty() ? services.find(opaque->toc, work)
-                                        : services.find(opaque->words, work);
+        found = opaque->words.isEmpty() ? services->find(opaque->toc, work)
+                                        : services->find(opaque->words, work);
     }
     if (found.keptOn)
         tellKept(*found.keptOn);
@@ -225,11 +223,11 @@ CddbDiscPtr CDDBControl::ShowFuzzyDialog(const CddbMatchListPtr &list)
 
 CddbDiscPtr CDDBControl::GetFullDisc(const CddbDiscPtr &candidate, int)
 {
-    Lookup &services = lookup();
+    const auto services = lookup();
     Lookup::Whole whole;
     {
         LongWork work(screen(), GetMessage("xLookingUp"));
-        whole = services.complete(candidate->record, work);
+        whole = services->complete(candidate->record, work);
     }
     if (whole.keptOn)
         tellKept(*whole.keptOn);
@@ -257,10 +255,10 @@ CddbDiscPtr CDDBControl::CreateDisc(const QString &toc, const QString &, const Q
 
 int CDDBControl::SubmitDisc(const CddbDiscPtr &disc, int)
 {
-    Lookup &services = lookup();
+    const auto services = lookup();
     LongWork work(screen(), GetMessage("xSending"));
     const TableOfContents toc = tableOf(disc->toc);
-    services.send(disc->record, toc, work);
+    services->send(disc->record, toc, work);
     markSent(*disc, toc);
     return 0;
 }

@@ -70,7 +70,7 @@ public:
 
 private:
     Form &screen() const;
-    Lookup &lookup();
+    std::unique_ptr<Lookup> lookup() const;
     void requireRegistered() const;
     CddbDiscPtr discOf(const DiscRecord &record, const QString &toc) const;
 
@@ -78,7 +78,6 @@ private:
     CddbOptions mOptions;
     CddbMatch mMatch;
     std::shared_ptr<GenreTable> mGenres;
-    std::unique_ptr<Lookup> mLookup; // made anew when options or profile have changed
 };
 
 /// The set-up that every session begins with: identity, owner, options out of the globals.
