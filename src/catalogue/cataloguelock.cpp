@@ -1,6 +1,6 @@
 #include "catalogue/cataloguelock.h"
 
-#include "services/wholefile.h"
+#include "platform/files/wholefile.h"
 
 #include <QFile>
 #include <QFileInfo>

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "services/filelock.h"
+#include "platform/files/filelock.h"
 
 /// One running program per catalogue: the lock belongs to the file itself, so that neither another
 /// name of it nor another user leads past it, and dies with its holder. A mark beside the file

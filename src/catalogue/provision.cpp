@@ -3,8 +3,8 @@
 #include "platform/desktop/desktop.h"
 #include "platform/desktop/programfolder.h"
 #include "platform/error/error.h"
+#include "platform/files/wholefile.h"
 #include "services/messages.h"
-#include "services/wholefile.h"
 
 #include <QDir>
 #include <QFileInfo>

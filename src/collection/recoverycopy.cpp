@@ -1,7 +1,7 @@
 #include "collection/recoverycopy.h"
 
+#include "platform/files/wholefile.h"
 #include "services/globals.h"
-#include "services/wholefile.h"
 
 #include <QDir>
 #include <QJsonDocument>

@@ -2,7 +2,7 @@
 
 #include "discs/recordjson.h"
 #include "platform/desktop/desktop.h"
-#include "services/wholefile.h"
+#include "platform/files/wholefile.h"
 
 #include <QCryptographicHash>
 #include <QDir>

@@ -1,8 +1,8 @@
 #include "discdata/requestpace.h"
 
 #include "platform/desktop/desktop.h"
+#include "platform/files/filelock.h"
 #include "platform/work/longwork.h"
-#include "services/filelock.h"
 
 #include <QCryptographicHash>
 #include <QDir>

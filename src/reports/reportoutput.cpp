@@ -1,7 +1,7 @@
 #include "reports/reportoutput.h"
 
+#include "platform/files/wholefile.h"
 #include "services/messages.h"
-#include "services/wholefile.h"
 
 #include <QPainter>
 #include <QPdfWriter>

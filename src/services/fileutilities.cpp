@@ -1,8 +1,8 @@
 #include "services/fileutilities.h"
 
 #include "platform/desktop/desktop.h"
+#include "platform/files/wholefile.h"
 #include "services/messages.h"
-#include "services/wholefile.h"
 
 #include <QDir>
 #include <QDirIterator>

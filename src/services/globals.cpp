@@ -15,3 +15,5 @@ QString gImportFile;
 bool gImportCompilationNested = false, gImportCompilationFlat = false;
 bool gImportAlbumNested = false, gImportAlbumFlat = false;
 std::shared_ptr<ADODB::Recordset> gImportRecords;
+
+bool gTagsChanged = false;

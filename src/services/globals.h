@@ -25,3 +25,5 @@ extern QString gImportFile; // full name of the text file chosen for import
 extern bool gImportCompilationNested, gImportCompilationFlat; // exactly one of the four is true
 extern bool gImportAlbumNested, gImportAlbumFlat;             // during an import
 extern std::shared_ptr<ADODB::Recordset> gImportRecords; // parsed tracks on their way to the load
+
+extern bool gTagsChanged; // a tag was written since the list of the collection was read

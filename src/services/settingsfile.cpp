@@ -1,8 +1,8 @@
 #include "services/settingsfile.h"
 
 #include "platform/desktop/desktop.h"
-#include "services/filelock.h"
-#include "services/wholefile.h"
+#include "platform/files/filelock.h"
+#include "platform/files/wholefile.h"
 
 #include <QDir>
 #include <QFileInfo>

@@ -1,7 +1,7 @@
 #include "services/textfiles.h"
 
+#include "platform/files/wholefile.h"
 #include "services/fileutilities.h"
-#include "services/wholefile.h"
 
 #include <QFile>
 #include <QFileInfo>

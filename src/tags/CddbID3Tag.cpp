@@ -1,9 +1,9 @@
 #include "tags/CddbID3Tag.h"
 
 #include "platform/error/error.h"
-#include "tags/ordinaryfile.h"
+#include "platform/files/nativename.h"
+#include "platform/files/ordinaryfile.h"
 
-#include <QFile>
 #include <QStringList>
 #include <commentsframe.h>
 #include <id3v1genres.h>
@@ -150,8 +150,8 @@ void CddbID3Tag::LoadFromFile(const QString &path, int)
     mFields = {};
     if (!isOrdinaryFile(path))
         throw makeError(errCannotUse, path);
-    TagLib::MPEG::File file(QFile::encodeName(path).constData(),
-                            TagLib::ID3v2::FrameFactory::instance(), false);
+    TagLib::MPEG::File file(nativeName(path).constData(), TagLib::ID3v2::FrameFactory::instance(),
+                            false);
     if (!file.isOpen())
         throw makeError(errCannotUse, path);
     if (!file.hasID3v2Tag())

@@ -1,6 +1,6 @@
 #include "tags/playingtime.h"
 
-#include "tags/ordinaryfile.h"
+#include "platform/files/ordinaryfile.h"
 
 #include <QFile>
 #include <QFileInfo>

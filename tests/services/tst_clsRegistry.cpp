@@ -1,6 +1,6 @@
 // Label: unit
+#include "platform/files/filelock.h"
 #include "services/clsRegistry.h"
-#include "services/filelock.h"
 #include "support/datarows.h"
 #include "support/ordinaryuser.h"
 #include "support/scripteddesktop.h"

@@ -1,4 +1,4 @@
-#include "services/filelock.h"
+#include "platform/files/filelock.h"
 
 #include <QFile>
 #include <cerrno>

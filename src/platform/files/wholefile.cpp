@@ -1,4 +1,4 @@
-#include "services/wholefile.h"
+#include "platform/files/wholefile.h"
 
 #include <QFileInfo>
 #include <cerrno>
