@@ -209,6 +209,22 @@ const Message furtherTexts[] = {
     {"xServiceNoMail", "This service wants your e-mail address. Please fill it in first.", "Deze dienst vraagt om uw e-mailadres. Vul dat eerst in."},
     {"xServiceNoCategory", "Please choose a category for this disc first.", "Kies eerst een categorie voor deze CD."},
     {"xProxyRefused", "The proxy server does not accept this name and password.", "De proxyserver accepteert deze naam en dit wachtwoord niet."},
+    {"xRenameFiles", "Rename files", "Bestanden hernoemen"},
+    {"xRenaming", "Renaming the files...", "De bestanden worden hernoemd..."},
+    {"xNameLetterRefused", "This name holds a character that a file name cannot have. The file keeps its name.", "Deze naam bevat een teken dat in een bestandsnaam niet kan. Het bestand houdt zijn naam."},
+    {"xNameTooLong", "This name is too long for a file. The file keeps its name.", "Deze naam is te lang voor een bestand. Het bestand houdt zijn naam."},
+    {"xNameOfRowPart1", "This is the name of the file in row ", "Dit is de naam van het bestand op regel "},
+    {"xNameOfRowPart2", " of the list. Both files keep their names.", " van de lijst. Beide bestanden houden hun naam."},
+    {"xRenamePreviewCaption", "Preview of the new names", "Voorbeeld van de nieuwe namen"},
+    {"xOldName", "Name now", "Naam nu"},
+    {"xNewName", "New name", "Nieuwe naam"},
+    {"xRemark", "Remark", "Opmerking"},
+    {"xNoArtistOrTitle", "The tag names no artist or no title. The file keeps its name.", "De tag noemt geen artiest of geen titel. Het bestand houdt zijn naam."},
+    {"xHasNameAlready", "The file has this name already.", "Het bestand heeft deze naam al."},
+    {"xFileWouldBeReplaced", "Another file has this name. You will be asked whether to replace it.", "Een ander bestand heeft deze naam. U wordt gevraagd of u het wilt vervangen."},
+    {"xNoRowsSelected", "No rows are selected in the list.", "Er zijn in de lijst geen regels geselecteerd."},
+    {"xNoConflicts", "Nothing stands in the way of these names. Nothing has been changed yet.", "Niets staat deze namen in de weg. Er is nog niets gewijzigd."},
+    {"xConflicts", "Nothing has been changed yet. Names that something stands in the way of are bold: ", "Er is nog niets gewijzigd. Namen die iets in de weg staat, zijn vet: "},
 };
 // clang-format on
 

@@ -13,6 +13,7 @@
 #include "discdata/frmDiscInfoCDDB.h"
 #include "discdata/frmWhatCD.h"
 #include "discdata/frmWhatNow.h"
+#include "mp3/RenamePreview.h"
 #include "platform/ado/connection.h"
 #include "reports/frmPageSetup.h"
 #include "reports/reportpaper.h"
@@ -143,6 +144,13 @@ Form *makeWhatCD()
     auto *question = new frmWhatCD;
     question->CDType = u"E"_s;
     return question;
+}
+
+Form *makeRenamePreview()
+{
+    NewName name;
+    name.name = u"01-Zed-One.mp3"_s;
+    return new RenamePreview({{1, u"one.mp3"_s, name}});
 }
 
 Form *makePageSetupOf(const QPageLayout &paper)
@@ -277,7 +285,8 @@ class tst_Screens : public QObject
                 {"Credits", make<Credits>()},
                 {"ProxyInfo", make<ProxyInfo>()},
                 {"frmWhatNow", make<frmWhatNow>()},
-                {"frmWhatCD", makeWhatCD}};
+                {"frmWhatCD", makeWhatCD},
+                {"RenamePreview", makeRenamePreview}};
     }
 
     static void check(const QWidget *screen)
@@ -391,6 +400,7 @@ private slots:
         row("ProxyInfo", make<ProxyInfo>(), "");
         row("frmWhatNow", make<frmWhatNow>(), "");
         row("frmWhatCD", makeWhatCD, "");
+        row("RenamePreview", makeRenamePreview, "");
     }
 
     void tabWalksAround()

@@ -1,0 +1,147 @@
+#include "mp3/renamingplan.h"
+
+#include "mp3/collectionfolder.h"
+#include "platform/files/nativename.h"
+#include "platform/text/textrules.h"
+#include "services/fileutilities.h"
+
+#include <QDir>
+#include <cerrno>
+#include <sys/stat.h>
+
+using namespace Qt::StringLiterals;
+
+namespace
+{
+
+constexpr double firstOfTwoDigits = 10;
+
+// By design: the value decides and the zero goes before the text, so "07" becomes "007", and "3/12"
+// stays.
+QString numberFor(const QString &trackPosition)
+{
+    const bool oneDigit =
+        text::isNumeric(trackPosition) && trackPosition.trimmed().toDouble() < firstOfTwoDigits;
+    return oneDigit ? u'0' + trackPosition : trackPosition;
+}
+
+QString nameOf(const CollectionRow &row)
+{
+    return numberFor(row[CollectionField::TrackPosition]) + u'-' +
+           row[CollectionField::LeadArtist] + u'-' + row[CollectionField::Title] + u".mp3"_s;
+}
+
+// By design: the track position is not looked at, nor any sign but these.
+bool hasForbiddenSymbols(const CollectionRow &row)
+{
+    const QString names = row[CollectionField::LeadArtist] + row[CollectionField::Title];
+    return std::any_of(names.cbegin(), names.cend(),
+                       [](QChar c) { return u"><|:/*\\?"_s.contains(c); });
+}
+
+// The track position may bring a separator; and half a character of UTF-16 would be written as
+// another one.
+bool isNameOfFile(const QString &name)
+{
+    return !name.contains(u'/') && !name.contains(QDir::separator()) && !name.contains(QChar(0)) &&
+           nameOfNative(nativeName(name)) == name;
+}
+
+bool isTooLong(const QString &path)
+{
+    struct stat about = {};
+    return lstat(nativeName(path).constData(), &about) != 0 && errno == ENAMETOOLONG;
+}
+
+// A name counts as the same if a disk could take it for the same.
+QString keyOf(const QString &path)
+{
+    return path.normalized(QString::NormalizationForm_C).toCaseFolded();
+}
+
+} // namespace
+
+bool isSameFile(const QString &path, const QString &other)
+{
+    struct stat one = {}, two = {};
+    return stat(nativeName(path).constData(), &one) == 0 &&
+           stat(nativeName(other).constData(), &two) == 0 && one.st_dev == two.st_dev &&
+           one.st_ino == two.st_ino;
+}
+
+RenamingPlan::RenamingPlan(QString folder, const std::vector<CollectionRow> &collection)
+    : mFolder(std::move(folder))
+{
+    mUsers.reserve(qsizetype(collection.size()));
+    for (const CollectionRow &row : collection) {
+        const QString path = QDir::cleanPath(pathInFolder(mFolder, row[CollectionField::FileName]));
+        mUsers.insert(keyOf(path), {row.index, path});
+    }
+}
+
+NewName RenamingPlan::nameFor(const CollectionRow &row) const
+{
+    NewName name;
+    name.oldPath = pathInFolder(mFolder, row[CollectionField::FileName]);
+    // The stored name as this system writes it has the same length.
+    const QString oldName = name.oldPath.last(row[CollectionField::FileName].size());
+    const QString subFolder = oldName.first(oldName.lastIndexOf(QDir::separator()) + 1);
+    name.name = subFolder + nameOf(row);
+    name.newPath = name.oldPath.chopped(oldName.size()) + name.name;
+    name.otherRow = otherRowWith(row, name);
+    name.obstacle = obstacleTo(row, name);
+    return name;
+}
+
+NameObstacle RenamingPlan::obstacleTo(const CollectionRow &row, const NewName &name) const
+{
+    if (row[CollectionField::LeadArtist].isEmpty() || row[CollectionField::Title].isEmpty())
+        return NameObstacle::TagMissing;
+    if (hasForbiddenSymbols(row))
+        return NameObstacle::ForbiddenSymbols;
+    if (!isNameOfFile(nameOf(row)))
+        return NameObstacle::LetterRefused;
+    if (isTooLong(name.newPath))
+        return NameObstacle::TooLong;
+    if (mMoved.value(name.oldPath) == name.newPath)
+        return NameObstacle::MovedAlready;
+    if (name.otherRow != 0)
+        return NameObstacle::OfAnotherRow;
+    return isThere(name.newPath) ? NameObstacle::IsThere : NameObstacle::None;
+}
+
+// 0: none has it. Names that differ in case alone are one where the disk makes no difference.
+int RenamingPlan::otherRowWith(const CollectionRow &row, const NewName &name) const
+{
+    const QString path = QDir::cleanPath(name.newPath), own = QDir::cleanPath(name.oldPath);
+    const auto [from, to] = mUsers.equal_range(keyOf(path));
+    const auto found = std::find_if(from, to, [&](const User &user) {
+        return user.row != row.index && user.path != own &&
+               (user.path == path || isSameFile(user.path, path));
+    });
+    return found == to ? 0 : found->row;
+}
+
+bool RenamingPlan::isThere(const QString &path) const
+{
+    return !mPretendedFree.contains(path) && FileExists(path);
+}
+
+void RenamingPlan::take(const CollectionRow &row, const NewName &name)
+{
+    const QString before = QDir::cleanPath(name.oldPath), now = QDir::cleanPath(name.newPath);
+    const auto [from, to] = mUsers.equal_range(keyOf(before));
+    const auto own = std::find_if(from, to, [&](const User &u) { return u.row == row.index; });
+    if (own != to)
+        mUsers.erase(own);
+    mUsers.insert(keyOf(now), {row.index, now});
+    if (before != now)
+        mMoved.insert(name.oldPath, name.newPath);
+}
+
+void RenamingPlan::pretend(const CollectionRow &row, const NewName &name)
+{
+    take(row, name);
+    mPretendedFree.remove(name.newPath);
+    mPretendedFree.insert(name.oldPath);
+}

@@ -1,0 +1,178 @@
+// Label: screen
+#include "controls/list/DBListViewCTL.h"
+#include "mp3/renaming.h"
+#include "support/screentest.h"
+
+#include <QDir>
+#include <QPushButton>
+#include <unistd.h>
+
+namespace
+{
+
+// "file|artist|title|track position" of each row.
+std::vector<CollectionRow> rowsOf(const QString &lines)
+{
+    using enum CollectionField;
+    std::vector<CollectionRow> rows;
+    for (const QString &line : lines.split(u'\n')) {
+        CollectionRow &row = rows.emplace_back();
+        row.index = int(rows.size());
+        const QStringList cells = line.split(u'|');
+        for (int cell = 0; const auto field : {FileName, LeadArtist, Title, TrackPosition})
+            row[field] = cells.value(cell++);
+    }
+    return rows;
+}
+
+} // namespace
+
+/// Files get the names that their tags make; each file holds the name that it began with.
+class tst_Renaming : public ScreenTest
+{
+    Q_OBJECT
+
+private:
+    QString folder() const { return mCatalogue->path("music"); }
+    QByteArray contentOf(const QString &name) const { return readFile(folder() + u'/' + name); }
+
+    void makeFiles(const std::vector<CollectionRow> &rows)
+    {
+        for (const CollectionRow &row : rows) {
+            const QString name = QString(row[CollectionField::FileName]).replace(u'\\', u'/');
+            QDir().mkpath(QFileInfo(folder() + u'/' + name).path());
+            writeFile(folder() + u'/' + name, name.toUtf8());
+        }
+    }
+
+    // The rows' names behind it. Boxes as lines, "=Yes" or "=No" behind a question.
+    QStringList rename(const std::vector<CollectionRow> &rows, const QStringList &boxes)
+    {
+        for (const QString &box : boxes)
+            mDesktop->expectBox(box.section(u'=', 0, 0), box.endsWith(u"=Yes"_s)  ? vbYes
+                                                         : box.endsWith(u"=No"_s) ? vbNo
+                                                                                  : vbOK);
+        QStringList names;
+        for (const CollectionRow &row : rows)
+            names.append(row[CollectionField::FileName]);
+        renameFiles(*mScreen, folder(), rows, [&](const CollectionRow &row, const QString &name) {
+            names[row.index - 1] = name;
+        });
+        return names;
+    }
+
+    QPointer<Form> mScreen;
+
+private slots:
+    void init()
+    {
+        ScreenTest::init();
+        mScreen = new Form(u"frmCDRootMP3"_s);
+        mScreen->Load();
+    }
+
+    void names_data()
+    {
+        const QString longTitle(260, u'x');
+        const DataRows<QString, QStringList, QStringList> row("rows", "boxes", "names");
+        const QStringList none;
+        row("one digit", "x.MP3|A|B|7", none, texts("07-A-B.mp3"));
+        row("a zero before it", "x.mp3|A|B|07", none, texts("007-A-B.mp3"));
+        row("two digits", "x.mp3|A|\"B\"|12", none, texts("12-A-\"B\".mp3"));
+        row("no number", "x.mp3|A|B|", none, texts("-A-B.mp3"));
+        row("sub-folder", "S/T/x.mp3|A|B|4", none, texts("S/T/04-A-B.mp3"));
+        row("sub-folder of an older catalogue", "S\\x.mp3|A|B|4", none, texts("S/04-A-B.mp3"));
+        row("no artist", "x.mp3||B|4\ny.mp3|A|B|1",
+            texts("error [Songcase] Unable to rename file x.mp3 because artist"),
+            texts("x.mp3", "01-A-B.mp3"));
+        row("no title", "x.mp3|A||4", texts("error [Songcase] Unable to rename file x.mp3 because"),
+            texts("x.mp3"));
+        row("forbidden symbol", "x.mp3|A|B:C|4\ny.mp3|A|B|1",
+            texts("error [Songcase] 04-A-B:C.mp3: Unable to rename file because"),
+            texts("x.mp3", "01-A-B.mp3"));
+        row("number with a total", "x.mp3|A|B|3/12",
+            texts("error [Songcase] 3/12-A-B.mp3: This name holds"), texts("x.mp3"));
+        row("too long", u"x.mp3|A|"_s + longTitle + u"|1"_s, texts("x.mp3: This name is too long"),
+            texts("x.mp3"));
+        row("its own name", "01-A-B.mp3|A|B|1",
+            texts(
+                "yes-no [Songcase] 01-A-B.mp3: A file with the same name already exists! Would=Yes"),
+            texts("01-A-B.mp3"));
+        row("of another row", "x.mp3|A|B|1\n01-A-B.mp3|C|D|2",
+            texts("error [Songcase] 01-A-B.mp3: This is the name of the file in row 2 of the list"),
+            texts("x.mp3", "02-C-D.mp3"));
+        row("of a row before", "y.mp3|A|B|1\nx.mp3|A|B|1",
+            texts("error [Songcase] 01-A-B.mp3: This is the name of the file in row 1 of the list"),
+            texts("01-A-B.mp3", "x.mp3"));
+        row("that a row before leaves", "01-A-B.mp3|C|D|2\nx.mp3|A|B|1", none,
+            texts("02-C-D.mp3", "01-A-B.mp3"));
+        row("one file twice in the list", "x.mp3|A|B|1\nx.mp3|A|B|1", none,
+            texts("01-A-B.mp3", "01-A-B.mp3"));
+    }
+    void names()
+    {
+        QFETCH(QString, rows);
+        QFETCH(QStringList, boxes);
+        QFETCH(QStringList, names);
+        makeFiles(rowsOf(rows));
+        QCOMPARE(rename(rowsOf(rows), boxes), names);
+        for (int place = 0; const CollectionRow &row : rowsOf(rows))
+            QCOMPARE(contentOf(names[place++]),
+                     QString(row[CollectionField::FileName]).replace(u'\\', u'/').toUtf8());
+    }
+
+    void aFileThatNoRowHas()
+    {
+        const auto rows = rowsOf(u"x.mp3|A|B|1"_s);
+        makeFiles(rows);
+        writeFile(folder() + u"/01-A-B.mp3"_s, "other");
+        QCOMPARE(rename(rows, {u"already exists=No"_s}), texts("x.mp3"));
+        QCOMPARE(contentOf(u"01-A-B.mp3"_s), "other");
+        QCOMPARE(rename(rows, {u"already exists=Yes"_s}), texts("01-A-B.mp3"));
+        QCOMPARE(contentOf(u"01-A-B.mp3"_s), "x.mp3");
+        QCOMPARE(contentOf(u"x.mp3"_s), "none");
+    }
+
+    // Another name for the very file, as on a disk that makes no difference between cases.
+    void aLinkToTheFileItself()
+    {
+        const auto rows = rowsOf(u"x.mp3|A|B|1"_s);
+        makeFiles(rows);
+        QCOMPARE(link((folder() + u"/x.mp3"_s).toUtf8(), (folder() + u"/01-A-B.mp3"_s).toUtf8()),
+                 0);
+        QCOMPARE(rename(rows, {u"already exists=Yes"_s}), texts("01-A-B.mp3"));
+        QCOMPARE(contentOf(u"01-A-B.mp3"_s), "x.mp3");
+    }
+
+    // By design a move that fails says nothing, and the row has the new name.
+    void aFileThatIsGone() { QCOMPARE(rename(rowsOf(u"x.mp3|A|B|1"_s), {}), texts("01-A-B.mp3")); }
+
+    void preview()
+    {
+        const auto rows = rowsOf(u"a.mp3|A|B|1\nb.mp3|A|B|1\nc.mp3|A||\n02-C-D.mp3|C|D|2\n"
+                                 "e.mp3|E|F|3\n03-E-F.mp3|G|H|4"_s);
+        makeFiles(rows);
+        const QStringList before = QDir(folder()).entryList(QDir::Files);
+        QStringList lines;
+        mDesktop->expectModal(u"RenamePreview"_s, [&](Form &screen) {
+            auto items = screen.findChild<DBListViewCTL *>()->ListItems();
+            for (int i = 1; i <= items.Count(); ++i)
+                lines.append((items.Item(i).Bold() ? u"! "_s : QString()) +
+                             items.Item(i).SubItems(2) + u": "_s +
+                             items.Item(i).SubItems(3).section(u'.', 0, 0));
+            screen.findChild<QPushButton *>(u"cmdClose"_s)->click();
+        });
+        previewRenaming(*mScreen, folder(), rows);
+        QCOMPARE(lines, texts("01-A-B.mp3: ",
+                              "! 01-A-B.mp3: This is the name of the file in row 1 "
+                              "of the list",
+                              "! : The tag names no artist or no title",
+                              "02-C-D.mp3: The file has this name already",
+                              "! 03-E-F.mp3: This is the name of the file in row 6 of the list",
+                              "04-G-H.mp3: "));
+        QCOMPARE(QDir(folder()).entryList(QDir::Files), before);
+    }
+};
+
+QTEST_MAIN(tst_Renaming)
+#include "tst_Renaming.moc"
