@@ -15,6 +15,7 @@
 #include "shell/accesskeys.h"
 #include "shell/cataloguewatch.h"
 #include "shell/discentries.h"
+#include "shell/freeplace.h"
 #include "shell/frmHelp.h"
 #include "shell/frmSplash.h"
 #include "shell/ui_MainScreen.h"
@@ -283,43 +284,10 @@ void MainScreen::adopt(Form *form)
     child->show();
     const QSize room = mUi->Children->viewport()->size();
     child->resize((wanted + child->size() - form->size()).boundedTo(room));
-    const QPoint place = form->place() ? *form->place() : freePlaceFor(*child);
+    const QPoint place = form->place() ? *form->place() : freePlaceFor(*child, *mUi->Children);
     child->move(std::clamp(place.x(), 0, std::max(0, room.width() - child->width())),
                 std::clamp(place.y(), 0, std::max(0, room.height() - child->height())));
     mUi->Children->setActiveSubWindow(child);
-}
-
-// Where a screen that asks for no place covers the fewest controls of the others; lists are none.
-QPoint MainScreen::freePlaceFor(const QMdiSubWindow &child) const
-{
-    const QSize free = mUi->Children->viewport()->size() - child.size();
-    const int right = free.width(), down = free.height();
-    QPoint best = child.pos();
-    int least = controlsBehind(child, best);
-    for (const QPoint corner : {QPoint(right, down / 2), QPoint(right, 0), QPoint(right, down),
-                                QPoint(0, down), QPoint(0, down / 2)}) {
-        const int covered = controlsBehind(child, corner);
-        if (covered < least) {
-            best = corner;
-            least = covered;
-        }
-    }
-    return best;
-}
-
-int MainScreen::controlsBehind(const QMdiSubWindow &child, QPoint corner) const
-{
-    constexpr int worstFirst = 100; // a button is worth more than any number of links
-    int covered = 0;
-    for (const QWidget *w : mUi->Children->viewport()->findChildren<QWidget *>()) {
-        const bool isControl = w->focusPolicy() & Qt::TabFocus && w->isVisible() &&
-                               !qobject_cast<const QAbstractScrollArea *>(w) &&
-                               !child.isAncestorOf(w);
-        const QRect place(w->mapTo(mUi->Children->viewport(), QPoint()), w->size());
-        if (isControl && place.intersects({corner, child.size()}))
-            covered += qobject_cast<const QAbstractButton *>(w) ? worstFirst : 1;
-    }
-    return covered;
 }
 
 void MainScreen::bringUp(Form *form)

@@ -68,8 +68,6 @@ private:
     bool unloadChildren(bool forced);
     void closeCatalogue();
     QMdiSubWindow *subWindowOf(Form *form) const;
-    QPoint freePlaceFor(const QMdiSubWindow &child) const;
-    int controlsBehind(const QMdiSubWindow &child, QPoint corner) const;
 
     std::unique_ptr<Ui::MainScreen> mUi;
     QTimer *mTimer1;
