@@ -225,6 +225,14 @@ const Message furtherTexts[] = {
     {"xNoRowsSelected", "No rows are selected in the list.", "Er zijn in de lijst geen regels geselecteerd."},
     {"xNoConflicts", "Nothing stands in the way of these names. Nothing has been changed yet.", "Niets staat deze namen in de weg. Er is nog niets gewijzigd."},
     {"xConflicts", "Nothing has been changed yet. Names that something stands in the way of are bold: ", "Er is nog niets gewijzigd. Namen die iets in de weg staat, zijn vet: "},
+    {"xTagNotAccessible", "The file cannot be written.", "Het bestand kan niet worden beschreven."},
+    {"xTagDamaged", "The tag of this file is damaged, so it was not changed.", "De tag van dit bestand is beschadigd en is daarom niet gewijzigd."},
+    {"xTagTooLong", "That is more than a tag can hold.", "Dat is meer dan er in een tag past."},
+    {"xTagNotWritten", "The tag was not written; the file is as it was.", "De tag is niet opgeslagen; het bestand is ongewijzigd."},
+    {"xUndoChanged", "it has been changed since", "het is sindsdien gewijzigd"},
+    {"xUndoGone", "it is no longer there", "het is er niet meer"},
+    {"xUndoNameTaken", "another file has its old name", "een ander bestand heeft de oude naam"},
+    {"xUndoForgotten", "what stood in it before is no longer known", "de vorige inhoud is niet meer bekend"},
 };
 // clang-format on
 

@@ -1,0 +1,56 @@
+#pragma once
+
+#include "tags/CddbID3Tag.h"
+#include "tags/filejournal.h"
+#include "tags/headchange.h"
+
+/// The changes of one command of the user in files: one batch of the journal, one undo takes it
+/// back. Each is whole or has not happened.
+class FileChanges
+{
+public:
+    struct About {
+        QDateTime when;
+        QString what, where; // in the user's words; a folder or the name of a collection
+        qint64 undoes = 0;   // the batch that is taken back
+    };
+
+    FileChanges(FileJournal &journal, About about);
+    ~FileChanges(); // what was announced and not saved is forgotten
+    FileChanges(const FileChanges &) = delete;
+    FileChanges &operator=(const FileChanges &) = delete;
+
+    /// Before many saves: what stands in the files now goes into the journal with one sync, not one
+    /// each. A save that this does not cover (another tag, the file written since) does it itself.
+    using Tags = std::vector<std::pair<QString, CddbID3Tag>>; // path, tag
+    void announce(const Tags &tags);
+
+    /// Writes the fields that differ from what the file's tag says now; all else in the file stays
+    /// as it is. Throws Error: errTagNotAccessible, errTagDamaged, errTagTooLong, errTagNotWritten.
+    void saveTag(const CddbID3Tag &tag, const QString &path);
+
+    /// Gives a file another name, and what has that name to the desktop's wastebasket where there
+    /// is one. Throws Error (errFileNotMoved).
+    void move(const QString &from, const QString &to);
+
+    /// Gives a file another beginning, `before` being what it begins with now.
+    void replaceHead(const QString &path, const QByteArray &before, const QByteArray &head);
+
+private:
+    struct Prepared {
+        HeadChange head;
+        CddbID3Tag tag;
+    };
+
+    void begin();
+    std::optional<HeadChange> planned(const CddbID3Tag &tag, const QString &path) const;
+    void tell(HeadChange &head);
+    void perform(const HeadChange &head);
+    void performOrMend(const HeadChange &head);
+    std::optional<HeadChange> takeAnnounced(const CddbID3Tag &tag, const QString &path);
+
+    FileJournal &mJournal;
+    const About mAbout;
+    bool mBegun = false;
+    std::map<QString, Prepared> mAnnounced; // by path without links
+};

@@ -1,0 +1,244 @@
+#include "tags/filejournal.h"
+
+#include "platform/error/error.h"
+#include "platform/files/nativename.h"
+#include "tags/changeundo.h"
+#include "tags/headchange.h"
+#include "tags/movedfile.h"
+
+#include <QFileInfo>
+#include <algorithm>
+#include <unistd.h>
+
+using namespace Qt::StringLiterals;
+
+namespace
+{
+
+enum class Word : quint8 {
+    Numbers = 1, // at the beginning of a part: the last id and batch that were given
+    Batch,
+    Change, // before it happens
+    Done,
+    Dropped // it did not happen, or is nothing of ours any more
+};
+
+template <typename... Values> QByteArray words(Word word, const Values &...values)
+{
+    QByteArray bytes;
+    QDataStream out(&bytes, QIODevice::WriteOnly);
+    out.setVersion(QDataStream::Qt_6_0);
+    out << quint8(word);
+    (out << ... << values);
+    return bytes;
+}
+
+} // namespace
+
+FileJournal::FileJournal(const QString &folder, JournalSizes sizes) : mStore(folder, sizes) {}
+
+void FileJournal::take(Read &into, const QByteArray &entry, const JournalStore::Place &place)
+{
+    QDataStream in(entry);
+    in.setVersion(QDataStream::Qt_6_0);
+    quint8 word = 0;
+    qint64 id = 0;
+    in >> word;
+    switch (Word(word)) {
+    case Word::Batch: {
+        ChangeBatch batch;
+        in >> batch;
+        // It is told again where a part begins.
+        if (into.batches.empty() || into.batches.back().number != batch.number)
+            into.batches.push_back(batch);
+        break;
+    }
+    case Word::Change: {
+        FileChange change;
+        in >> change;
+        into.entries[change.id] = {change, place, false, {}};
+        break;
+    }
+    case Word::Done: {
+        FileStamp after;
+        in >> id >> after;
+        if (const auto entry = into.entries.find(id); entry != into.entries.end()) {
+            entry->second.isDone = true;
+            entry->second.after = after;
+        }
+        break;
+    }
+    case Word::Dropped:
+        in >> id;
+        into.entries.erase(id);
+        break;
+    case Word::Numbers:
+        break;
+    }
+}
+
+// The last part alone is read: what is not done is told again where a part begins.
+void FileJournal::open()
+{
+    if (mIsOpen)
+        return;
+    Read read;
+    mStore.readLast([&](const QByteArray &entry, const JournalStore::Place &place) {
+        QDataStream in(entry);
+        in.setVersion(QDataStream::Qt_6_0);
+        quint8 word = 0;
+        in >> word;
+        if (Word(word) == Word::Numbers)
+            in >> mLastId >> mLastBatch;
+        take(read, entry, place);
+        for (const auto &[id, each] : read.entries)
+            mLastId = std::max(mLastId, id);
+    });
+    for (const ChangeBatch &batch : read.batches)
+        mLastBatch = std::max(mLastBatch, batch.number);
+    std::erase_if(read.entries, [](const auto &entry) { return entry.second.isDone; });
+    mPending = std::move(read.entries);
+    mIsOpen = true;
+}
+
+FileJournal::Read FileJournal::readAll() const
+{
+    Read read;
+    mStore.readAll([&](const QByteArray &entry, const JournalStore::Place &place) {
+        take(read, entry, place);
+    });
+    return read;
+}
+
+std::vector<FileJournal::Batch> FileJournal::batches() const
+{
+    const Read read = readAll();
+    std::vector<Batch> all;
+    for (const ChangeBatch &each : read.batches) {
+        Batch batch;
+        static_cast<ChangeBatch &>(batch) = each;
+        batch.files = int(std::count_if(read.entries.begin(), read.entries.end(), [&](auto &entry) {
+            return entry.second.isDone && entry.second.change.batch == each.number;
+        }));
+        if (batch.files > 0)
+            all.insert(all.begin(), batch);
+    }
+    // The newest first: one that was taken back itself takes nothing back.
+    for (auto batch = all.begin(); batch != all.end(); ++batch) {
+        for (auto other = batch; !batch->isTakenBack && other != all.end(); ++other)
+            other->isTakenBack |= batch->undoes != 0 && other->number == batch->undoes;
+    }
+    return all;
+}
+
+// Where a part is full: the next one begins with what is not done, so that it is found there.
+void FileJournal::makeRoom()
+{
+    if (!mStore.isPartFull())
+        return;
+    Entries carried;
+    std::vector<std::pair<qint64, QByteArray>> kept;
+    for (const auto &[id, entry] : mPending)
+        kept.emplace_back(id, mStore.bytes(entry.place).value_or(QByteArray()));
+    mStore.beginPart();
+    mStore.append(words(Word::Numbers, mLastId, mLastBatch));
+    if (mBatch.number > 0)
+        mStore.append(words(Word::Batch, mBatch));
+    for (const auto &[id, bytes] : kept)
+        mPending[id].place = mStore.append(words(Word::Change, mPending[id].change), bytes);
+    mStore.sync();
+}
+
+qint64 FileJournal::beginBatch(ChangeBatch batch)
+{
+    open();
+    mend();
+    makeRoom();
+    batch.number = ++mLastBatch;
+    mBatch = batch;
+    mStore.append(words(Word::Batch, mBatch));
+    return mBatch.number;
+}
+
+void FileJournal::announce(FileChange &change, const QByteArray &kept)
+{
+    makeRoom();
+    change.id = ++mLastId;
+    change.batch = mBatch.number;
+    mPending[change.id] = {change, mStore.append(words(Word::Change, change), kept), false, {}};
+}
+
+// Nothing is lost where the journal cannot be told: the file itself tells at the next look.
+void FileJournal::done(qint64 id, const FileStamp &after)
+{
+    try {
+        mStore.append(words(Word::Done, id, after));
+        mPending.erase(id);
+    } catch (const Error &) {
+    }
+}
+
+void FileJournal::drop(qint64 id)
+{
+    try {
+        mStore.append(words(Word::Dropped, id));
+        mPending.erase(id);
+    } catch (const Error &) {
+    }
+}
+
+QString FileJournal::copyName()
+{
+    return mStore.folder() + "/copy-"_L1 + QString::number(mLastId + 1) + u'-' +
+           QString::number(::getpid());
+}
+
+void FileJournal::mendOne(qint64 id, bool back)
+{
+    const FileChange change = mPending[id].change;
+    const auto kept = mStore.bytes(mPending[id].place);
+    if (change.way == FileChange::Way::InPlace && !kept) {
+        drop(id); // was not synced, so nothing was begun
+        return;
+    }
+    const Mended end = change.way == FileChange::Way::Move
+                           ? mendMove(change)
+                           : mendHead(change, kept.value_or(QByteArray()), back);
+    switch (end) {
+    case Mended::New:
+        done(id, stampOf(change.way == FileChange::Way::Move ? change.other : change.path));
+        break;
+    case Mended::Old:
+    case Mended::Foreign:
+        drop(id);
+        break;
+    case Mended::NotNow:
+        break;
+    }
+}
+
+void FileJournal::mend()
+{
+    open();
+    std::vector<qint64> ids;
+    for (const auto &[id, entry] : mPending)
+        ids.push_back(id);
+    std::reverse(ids.begin(), ids.end());
+    for (const qint64 id : ids) {
+        try {
+            mendOne(id, false);
+        } catch (const Error &) { // at the next look
+        }
+    }
+}
+
+FileJournal::Undone FileJournal::undo(qint64 batch, const QDateTime &when, const QString &what,
+                                      const std::function<bool(int done, int all)> &step)
+{
+    const Read read = readAll();
+    ChangeUndo undo(*this, read.entries, batch);
+    const auto found = std::find_if(read.batches.begin(), read.batches.end(),
+                                    [batch](const ChangeBatch &b) { return b.number == batch; });
+    const QString where = found == read.batches.end() ? QString() : found->where;
+    return undo.run({0, when, what, where, batch}, step);
+}

@@ -1,0 +1,5 @@
+#pragma once
+
+/// Gives one open file what the other has besides its content: owner, rights, access list, extended
+/// attributes, time of the last access. False where the system does not let it.
+bool takeOverRights(int target, int source);

@@ -1,0 +1,285 @@
+#include "tags/headchange.h"
+
+#include "platform/error/error.h"
+#include "platform/files/nativename.h"
+#include "platform/files/ordinaryfile.h"
+#include "platform/files/wholefile.h"
+#include "tags/filerights.h"
+
+#include <QFileInfo>
+#include <algorithm>
+#include <cerrno>
+#include <cstdio>
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+using namespace Qt::StringLiterals;
+
+namespace
+{
+
+constexpr qint64 piece = 256 * 1024; // bytes that are compared or copied at once
+constexpr qint64 sector = 512;       // bytes that a disk writes whole
+
+// The bytes between the first and the last that differ.
+HeadChange inPlace(FileChange change, const QByteArray &oldHead, const QByteArray &newHead)
+{
+    const auto [first, unused] = std::mismatch(oldHead.begin(), oldHead.end(), newHead.begin());
+    const qsizetype from = first - oldHead.begin();
+    qsizetype to = oldHead.size();
+    while (to > from && oldHead[to - 1] == newHead[to - 1])
+        --to;
+    change.from = from;
+    return {change, oldHead.sliced(from, to - from), newHead.sliced(from, to - from)};
+}
+
+bool mayMakeFilesIn(const QString &folder)
+{
+    return ::faccessat(AT_FDCWD, nativeName(folder).constData(), W_OK | X_OK, AT_EACCESS) == 0;
+}
+
+bool isThere(const QString &path)
+{
+    return ::access(nativeName(path).constData(), F_OK) == 0;
+}
+
+int namesOf(const SystemFile &file)
+{
+    struct stat about = {};
+    return ::fstat(file.handle(), &about) == 0 ? int(about.st_nlink) : 0;
+}
+
+QString folderOf(const QString &path)
+{
+    return QFileInfo(path).path();
+}
+
+// The new file, all of it; `oldHead` bytes of the old one have made room.
+void writeNew(SystemFile &target, const HeadChange &head, const SystemFile &file)
+{
+    target.write(0, head.newBytes);
+    target.append(file, head.change.oldHead, head.change.before.size - head.change.oldHead);
+}
+
+[[noreturn]] void failWith(int error, const SystemFile &file)
+{
+    errno = error;
+    file.fail();
+}
+
+// What was written is what was meant: the new head and the sound behind it.
+void readBack(const SystemFile &target, const HeadChange &head, const SystemFile &file)
+{
+    const FileChange &change = head.change;
+    if (target.size() != change.newSize() || target.read(0, change.newHead) != head.newBytes)
+        failWith(EIO, target);
+    for (qint64 at = change.oldHead; at < change.before.size; at += piece) {
+        if (target.read(at - change.oldHead + change.newHead, piece) != file.read(at, piece))
+            failWith(EIO, target);
+    }
+}
+
+void requireUntouched(const SystemFile &file, const FileStamp &before)
+{
+    if (file.stamp() != before || stampOf(file.path()) != before)
+        failWith(EBUSY, file);
+}
+
+void beside(const HeadChange &head, const SystemFile &file)
+{
+    const QByteArray name = nativeName(head.change.other);
+    try {
+        SystemFile target(head.change.other, SystemFile::Mode::Create);
+        writeNew(target, head, file);
+        // The disk is busy with it while it is read back.
+        ::sync_file_range(target.handle(), 0, 0, SYNC_FILE_RANGE_WRITE);
+        if (!takeOverRights(target.handle(), file.handle()))
+            throw NoWayBeside();
+        readBack(target, head, file);
+        target.sync();
+        requireUntouched(file, head.change.before);
+        if (::rename(name.constData(), nativeName(file.path()).constData()) != 0)
+            file.fail();
+    } catch (...) {
+        ::unlink(name.constData());
+        throw;
+    }
+    if (!syncFolder(folderOf(file.path())))
+        failWith(EIO, file);
+}
+
+// From the copy that stands in the folder of the journal.
+void through(const FileChange &change, SystemFile &file)
+{
+    const SystemFile copy(change.other, SystemFile::Mode::Read);
+    if (copy.size() != change.newSize())
+        failWith(EIO, copy);
+    if (file.size() < copy.size())
+        file.resize(copy.size());
+    for (qint64 at = 0; at < copy.size(); at += piece)
+        file.write(at, copy.read(at, piece));
+    file.resize(copy.size());
+    file.sync();
+}
+
+// Whether each sector is that of the old or of the new bytes.
+bool isMixture(const QByteArray &bytes, qint64 from, const QByteArray &one, const QByteArray &other)
+{
+    for (qsizetype at = 0; at < bytes.size();) {
+        const qsizetype size =
+            std::min<qsizetype>(bytes.size() - at, sector - (from + at) % sector);
+        const QByteArrayView part = QByteArrayView(bytes).sliced(at, size);
+        if (part != QByteArrayView(one).sliced(at, size) &&
+            part != QByteArrayView(other).sliced(at, size))
+            return false;
+        at += size;
+    }
+    return true;
+}
+
+Mended mendInPlace(const FileChange &change, const QByteArray &kept, bool back)
+{
+    SystemFile file(change.path, SystemFile::Mode::Write);
+    const QByteArray oldBytes = kept.first(kept.size() / 2),
+                     newBytes = kept.sliced(kept.size() / 2);
+    const QByteArray bytes = file.read(change.from, oldBytes.size());
+    if (file.size() != change.before.size || !isMixture(bytes, change.from, oldBytes, newBytes))
+        return Mended::Foreign;
+    const bool isNew = bytes == newBytes && !back;
+    if (!isNew)
+        file.write(change.from, oldBytes);
+    file.sync();
+    return isNew ? Mended::New : Mended::Old;
+}
+
+bool hasNewHead(const SystemFile &file, const FileChange &change)
+{
+    return file.size() == change.newSize() &&
+           headChecksum(file.read(0, change.newHead)) == change.newHeadIs;
+}
+
+Mended mendBeside(const FileChange &change)
+{
+    ::unlink(nativeName(change.other).constData());
+    const SystemFile file(change.path, SystemFile::Mode::Read);
+    if (hasNewHead(file, change))
+        return Mended::New;
+    return file.stamp().isSameFile(change.before) && file.size() == change.before.size
+               ? Mended::Old
+               : Mended::Foreign;
+}
+
+// Within a run the file is written from its beginning on; the two heads differ in their first
+// bytes, which tell their size. After the power has failed nobody knows which part of it has come
+// first.
+bool hasBegun(const SystemFile &file, const FileChange &change)
+{
+    const SystemFile copy(change.other, SystemFile::Mode::Read);
+    return file.read(0, sector) == copy.read(0, sector);
+}
+
+Mended mendThrough(const FileChange &change, bool back)
+{
+    SystemFile file(change.path, SystemFile::Mode::Write);
+    const FileStamp now = file.stamp();
+    const bool isOurs = now.isSameFile(change.before) &&
+                        (now.size == change.before.size || now.size == change.newSize());
+    Mended end = hasNewHead(file, change) ? Mended::New : Mended::Foreign;
+    if (isOurs && isThere(change.other)) {
+        const bool isOld = back && !hasBegun(file, change);
+        if (isOld)
+            file.resize(change.before.size);
+        else
+            through(change, file);
+        file.sync();
+        end = isOld ? Mended::Old : Mended::New;
+    } else if (isOurs && end == Mended::Foreign && now.size == change.before.size) {
+        end = Mended::Old;
+    }
+    ::unlink(nativeName(change.other).constData());
+    return end;
+}
+
+} // namespace
+
+bool isWritable(const QString &path)
+{
+    const QByteArray name = nativeName(path);
+    struct stat about = {};
+    constexpr mode_t anybody = S_IWUSR | S_IWGRP | S_IWOTH;
+    return ::stat(name.constData(), &about) == 0 && S_ISREG(about.st_mode) &&
+           (about.st_mode & anybody) != 0 &&
+           ::faccessat(AT_FDCWD, name.constData(), R_OK | W_OK, AT_EACCESS) == 0;
+}
+
+QByteArray HeadChange::kept() const
+{
+    return change.way == FileChange::Way::InPlace ? oldBytes + newBytes : oldBytes;
+}
+
+HeadChange plannedHead(const SystemFile &file, const QByteArray &oldHead, const QByteArray &newHead)
+{
+    FileChange change;
+    change.path = file.path();
+    change.before = file.stamp();
+    change.oldHead = oldHead.size();
+    change.newHead = newHead.size();
+    change.newHeadIs = headChecksum(newHead);
+    if (oldHead.size() == newHead.size())
+        return inPlace(change, oldHead, newHead);
+    const bool hasRoomBeside = namesOf(file) == 1 && mayMakeFilesIn(folderOf(file.path()));
+    change.way = hasRoomBeside ? FileChange::Way::Beside : FileChange::Way::Through;
+    return {change, oldHead, newHead};
+}
+
+void prepareHead(const HeadChange &head, const SystemFile &file)
+{
+    if (head.change.way != FileChange::Way::Through)
+        return;
+    try {
+        SystemFile copy(head.change.other, SystemFile::Mode::Create);
+        writeNew(copy, head, file);
+        readBack(copy, head, file);
+        copy.sync();
+        requireUntouched(file, head.change.before);
+    } catch (...) {
+        ::unlink(nativeName(head.change.other).constData());
+        throw;
+    }
+    if (!syncFolder(folderOf(head.change.other)))
+        failWith(EIO, file);
+}
+
+void performHead(const HeadChange &head, SystemFile &file)
+{
+    switch (head.change.way) {
+    case FileChange::Way::InPlace:
+        file.write(head.change.from, head.newBytes);
+        file.sync();
+        break;
+    case FileChange::Way::Beside:
+        beside(head, file);
+        break;
+    default:
+        through(head.change, file);
+    }
+}
+
+Mended mendHead(const FileChange &change, const QByteArray &kept, bool back)
+{
+    try {
+        switch (change.way) {
+        case FileChange::Way::InPlace:
+            return mendInPlace(change, kept, back);
+        case FileChange::Way::Beside:
+            return mendBeside(change);
+        default:
+            return mendThrough(change, back);
+        }
+    } catch (const Error &) {
+        // A file that was deleted needs nothing; a medium that is not there comes back.
+        const bool isGone = isThere(folderOf(change.path)) && !isThere(change.path);
+        return isGone ? Mended::Foreign : Mended::NotNow;
+    }
+}

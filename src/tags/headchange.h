@@ -1,0 +1,47 @@
+#pragma once
+
+#include "tags/filechange.h"
+
+/// Whether the program may write a file: it is there, ordinary, and somebody may write it. To root
+/// too a file is read-only that nobody may write.
+bool isWritable(const QString &path);
+
+/// A change of the bytes at the beginning of a file for others, in four steps: it is planned, told
+/// to the journal, prepared and performed. At any moment the file is the old one or the new one, or
+/// mendHead() makes it so.
+struct HeadChange {
+    FileChange change;
+    QByteArray oldBytes; // InPlace: those that are written over; else the whole old head
+    QByteArray newBytes; // the same of the new one
+
+    /// What the journal keeps.
+    QByteArray kept() const;
+};
+
+/// `file` has no links in its name. The way follows from the lengths of the heads, and from what
+/// the file is: one with several names, in a folder that cannot be written, or of another owner,
+/// keeps its place.
+HeadChange plannedHead(const SystemFile &file, const QByteArray &oldHead,
+                       const QByteArray &newHead);
+
+/// For a change that goes Through: writes the copy of the new file, synced, before the journal is
+/// told.
+void prepareHead(const HeadChange &head, const SystemFile &file);
+
+/// Throws Error; mendHead() tells then what has become of the file. A Beside that finds it cannot
+/// give the new file what the old one has (owner, rights) throws NoWayBeside with the file
+/// untouched.
+struct NoWayBeside {
+};
+void performHead(const HeadChange &head, SystemFile &file);
+
+/// What a change that was begun has left: puts the file right where it is neither. `back`: the
+/// change has failed, so bytes that a disk may not have taken are not trusted, and the old ones
+/// written again.
+enum class Mended {
+    Old,
+    New,
+    Foreign, // something else has written the file since: it is left alone
+    NotNow   // the file, or what is needed to mend it, cannot be reached
+};
+Mended mendHead(const FileChange &change, const QByteArray &kept, bool back = false);

@@ -1,0 +1,57 @@
+#pragma once
+
+#include "platform/files/systemfile.h"
+
+#include <functional>
+#include <map>
+#include <optional>
+
+struct JournalSizes {
+    qint64 part = 4 << 20;  // bytes of a file before the next one begins
+    qint64 all = 200 << 20; // bytes of all before the oldest goes
+};
+
+/// Entries one behind the other in files of a folder, "changes-1" and on: some words about each,
+/// and bytes. What was synced is read again after any end of the program; an entry that was cut
+/// off, and what stands behind it, is not there. Only what an entry says is read to find it, not
+/// its bytes. Throws Error (errCannotUse) where the disk fails.
+class JournalStore
+{
+public:
+    struct Place {
+        int part = 0; // the number of the file
+        qint64 at = 0;
+        qint64 size = 0; // of the bytes
+    };
+    explicit JournalStore(QString folder, JournalSizes sizes = {});
+
+    QString folder() const { return mFolder; }
+
+    /// Reads what all entries say, or those of the last file alone, oldest first.
+    using Reader = std::function<void(const QByteArray &words, const Place &place)>;
+    void readAll(const Reader &reader) const;
+    void readLast(const Reader &reader) const;
+
+    Place append(const QByteArray &words, const QByteArray &bytes = {});
+    void sync();
+
+    /// Nothing where they are gone, or are not those that were written.
+    std::optional<QByteArray> bytes(const Place &place) const;
+
+    /// Whether so much was written that the next entry had better begin a file, and that.
+    bool isPartFull() const;
+    void beginPart();
+
+private:
+    QString nameOf(int part) const;
+    std::map<int, qint64> parts() const; // sizes by number
+    qint64 readPart(int part, const Reader &reader) const;
+    void openLast();
+
+    const QString mFolder;
+    const JournalSizes mSizes;
+    std::optional<SystemFile> mFile;
+    int mPart = 0;
+    qint64 mEnd = 0;
+    bool mIsDoubtful = false; // a sync has failed
+};
