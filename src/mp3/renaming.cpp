@@ -1,13 +1,13 @@
 #include "mp3/renaming.h"
 
+#include "discdata/changedfiles.h"
 #include "mp3/RenamePreview.h"
 #include "mp3/renamingplan.h"
 #include "platform/desktop/desktop.h"
 #include "platform/work/longwork.h"
-#include "services/fileutilities.h"
 #include "services/messages.h"
-
-#include <cerrno>
+#include "tags/filechanges.h"
+#include "tags/tagerrors.h"
 
 using namespace Qt::StringLiterals;
 
@@ -21,7 +21,11 @@ class Renaming
 {
 public:
     Renaming(Form &screen, RenamingPlan plan, const Renamed &renamed)
-        : mScreen(screen), mPlan(std::move(plan)), mRenamed(renamed)
+        : mScreen(screen),
+          mPlan(std::move(plan)),
+          mRenamed(renamed),
+          mChanges(changedFiles(),
+                   {Desktop::current().now(), GetMessage("xRenameFiles"), mPlan.folder()})
     {
     }
 
@@ -29,11 +33,12 @@ public:
 
 private:
     bool mayTake(const CollectionRow &row, const NewName &name) const;
-    bool move(const NewName &name) const;
+    bool move(const NewName &name);
 
     Form &mScreen;
     RenamingPlan mPlan;
     const Renamed &mRenamed;
+    FileChanges mChanges; // one for the whole press
 };
 
 void Renaming::rename(const CollectionRow &row)
@@ -80,14 +85,16 @@ bool Renaming::mayTake(const CollectionRow &row, const NewName &name) const
 
 // By design: a move that fails says nothing, and the row takes the new name; it shows as missing
 // when the list is read again. Only a name that the disk cannot have is told, and leaves the row.
-bool Renaming::move(const NewName &name) const
+bool Renaming::move(const NewName &name)
 {
-    if (!MoveFileReplace(name.oldPath, name.newPath))
-        return true;
-    const bool refused = errno == EINVAL || errno == EILSEQ;
-    if (refused)
-        errorBox(name.name + u": "_s + GetMessage("xNameLetterRefused"));
-    return !refused;
+    try {
+        mChanges.move(name.oldPath, name.newPath);
+    } catch (const Error &error) {
+        if (error.Number == errNameRefused)
+            errorBox(name.name + u": "_s + GetMessage("xNameLetterRefused"));
+        return error.Number != errNameRefused;
+    }
+    return true;
 }
 
 } // namespace

@@ -38,6 +38,7 @@ public:
     /// `collection` are all its rows, those that keep their names as well.
     RenamingPlan(QString folder, const std::vector<CollectionRow> &collection);
 
+    QString folder() const { return mFolder; }
     NewName nameFor(const CollectionRow &row) const;
 
     /// The row has this name from now on.

@@ -19,6 +19,7 @@
 #include "shell/frmHelp.h"
 #include "shell/frmSplash.h"
 #include "shell/ui_MainScreen.h"
+#include "shell/undoentry.h"
 #include "textimport/frmImportWizard.h"
 
 #include <QCloseEvent>
@@ -108,6 +109,7 @@ void MainScreen::setCaptions()
                          {"Import", "Import"},
                          {"mnuSave", "mnuSave"},
                          {"mnuConvertDatabase", "frmAutoUpdateUtilityCaption"},
+                         {"mnuUndoChanges", "xUndoEntry"},
                          {"Quit", "xQuit"},
                          {"mnuLiedkist", "mnuLiedkist"},
                          {"mnuSearchArtistsTitles", "mnuSearchArtistsTitles"},
@@ -181,6 +183,7 @@ void MainScreen::connectActions()
     on(mUi->Over, &MainScreen::Over_Click);
     on(mUi->tbCredits, &MainScreen::Over_Click);
     connectDiscEntries(*this); // the credits of the services come behind the program's own
+    connectUndoEntry(*this);
     on(mUi->mnuEngels, [this] { ChangeLanguage(languageEnglish); });
     on(mUi->mnuNederlands, [this] { ChangeLanguage(languageDutch); });
 }

@@ -19,7 +19,9 @@ namespace
 
 [[noreturn]] void notMoved(const QString &from, int error)
 {
-    throw Error(errFileNotMoved, u"Files"_s, from + u": "_s + qt_error_string(error));
+    const bool refused = error == EINVAL || error == EILSEQ || error == ENAMETOOLONG;
+    throw Error(refused ? errNameRefused : errFileNotMoved, u"Files"_s,
+                from + u": "_s + qt_error_string(error));
 }
 
 bool rename(const QString &from, const QString &to)

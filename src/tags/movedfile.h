@@ -3,8 +3,8 @@
 #include "tags/headchange.h"
 
 /// Gives a file another name, and what has that name to the desktop's wastebasket where there is
-/// one; where there is none it goes. The name is on the disk then. Throws Error (errFileNotMoved)
-/// with everything as it was.
+/// one; where there is none it goes. The name is on the disk then. Throws Error (errFileNotMoved,
+/// errNameRefused) with everything as it was.
 void moveFile(const QString &from, const QString &to);
 
 /// The same, but only while nothing has the new name.

@@ -14,6 +14,7 @@
 #include "discdata/frmWhatCD.h"
 #include "discdata/frmWhatNow.h"
 #include "mp3/RenamePreview.h"
+#include "mp3/UndoChanges.h"
 #include "platform/ado/connection.h"
 #include "reports/frmPageSetup.h"
 #include "reports/reportpaper.h"
@@ -286,7 +287,8 @@ class tst_Screens : public QObject
                 {"ProxyInfo", make<ProxyInfo>()},
                 {"frmWhatNow", make<frmWhatNow>()},
                 {"frmWhatCD", makeWhatCD},
-                {"RenamePreview", makeRenamePreview}};
+                {"RenamePreview", makeRenamePreview},
+                {"UndoChanges", make<UndoChanges>()}};
     }
 
     static void check(const QWidget *screen)
@@ -401,6 +403,7 @@ private slots:
         row("frmWhatNow", make<frmWhatNow>(), "");
         row("frmWhatCD", makeWhatCD, "");
         row("RenamePreview", makeRenamePreview, "");
+        row("UndoChanges", make<UndoChanges>(), "");
     }
 
     void tabWalksAround()
