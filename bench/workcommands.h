@@ -14,3 +14,4 @@ void search(const QStringList &arguments);        // CATALOGUE MODE FIELD WORD
 void exportAll(const QStringList &arguments);     // CATALOGUE FILE
 void lookUpDisc(const QStringList &arguments);    // TOC SERVICE+ADDRESS
 void importDisc(const QStringList &arguments);    // CATALOGUE FILE
+void addCollection(const QStringList &arguments); // CATALOGUE FOLDER TITLE

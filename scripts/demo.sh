@@ -1,5 +1,6 @@
 #!/usr/bin/env bash
-# Fills a catalogue with made-up discs, once, and puts a fresh copy of it where ./run --demo looks.
+# Fills a catalogue with made-up discs, once, and puts a fresh copy of it where ./run --demo looks, with two
+# collections of made-up MP3 files.
 set -eu
 cd "$(dirname "$0")/.."
 work=build/release/bin/songcase-work
@@ -15,5 +16,10 @@ if [ ! -f "$demo/filled.orv" ] || [ demo/make_demo.py -nt "$demo/filled.orv" ] |
     "$work" load "$demo/new.orv" D "$demo/texts/albums-d.txt" >/dev/null
     mv "$demo/new.orv" "$demo/filled.orv"
 fi
+rm -rf "$demo/folder" "$demo/music"
 mkdir -p "$demo/folder"
 cp "$demo/filled.orv" "$demo/folder/Compact4.orv"
+python3 demo/make_music.py "$demo/music"
+for title in "Harbour Lights" "Mixed Tape"; do
+    "$work" addcollection "$demo/folder/Compact4.orv" "$PWD/$demo/music/$title" "$title" >/dev/null
+done
