@@ -2,8 +2,10 @@
 
 #include "platform/desktop/desktop.h"
 #include "platform/text/messagetexts.h"
+#include "platform/work/pieces.h"
 #include "platform/work/wait.h"
 
+#include <QApplication>
 #include <thread>
 
 namespace
@@ -50,7 +52,8 @@ LongWork::~LongWork()
 
 QWidget *LongWork::window() const
 {
-    return mScreen->window();
+    QWidget *window = mScreen->window(); // which may still be at its load
+    return window->isVisible() ? window : QApplication::activeWindow();
 }
 
 bool LongWork::step(qint64 done, qint64 all)
@@ -99,6 +102,26 @@ bool LongWork::runInThread(const std::function<void(std::stop_token)> &piece)
     if (done && failure)
         std::rethrow_exception(failure);
     return done;
+}
+
+bool LongWork::runInThreads(qsizetype count,
+                            const std::function<void(qsizetype, std::stop_token)> &make,
+                            const std::function<void(qsizetype)> &take)
+{
+    constexpr int windowAfter = 300; // milliseconds
+    if (mCancelled || count == 0)
+        return !mCancelled;
+    Wait wait(*this, windowAfter);
+    Pieces pieces(count, make, wait);
+    const auto takeOver = [&] {
+        while (const auto number = pieces.next())
+            take(*number);
+        const int percent = int(pieces.taken() * 100 / count);
+        if (percent != std::exchange(mPercent, percent) && showPercent)
+            showPercent(percent);
+        wait.showPercent(percent);
+    };
+    return pieces.run(takeOver);
 }
 
 bool LongWork::waitUntil(const std::function<QMetaObject::Connection(const Tell &)> &connectTo)

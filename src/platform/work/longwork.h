@@ -4,6 +4,7 @@
 
 #include <QElapsedTimer>
 #include <functional>
+#include <memory>
 #include <optional>
 #include <stop_token>
 #include <vector>
@@ -54,6 +55,30 @@ public:
         return done ? std::move(value) : std::nullopt;
     }
 
+    /// What `make` gives for each number below `count`, made by several threads and taken over in
+    /// this one, in the order of the numbers. `make` is held to what valueOf() asks of its piece,
+    /// and owns all that it stands on: one that hangs on a dead medium is left behind when the work
+    /// is cancelled. `take` handles no events. False: cancelled; what was taken until then stays.
+    template <typename Value>
+    bool eachOf(qsizetype count, const std::function<Value(qsizetype, std::stop_token)> &make,
+                const std::function<void(qsizetype, Value &&)> &take)
+    {
+        using Batch = std::vector<Value>;
+        const auto made = std::make_shared<std::vector<Batch>>((count + batch - 1) / batch);
+        const auto makeBatch = [made, make, count](qsizetype number, std::stop_token stop) {
+            Batch values;
+            const qsizetype end = std::min(count, (number + 1) * batch);
+            for (qsizetype i = number * batch; i < end && !stop.stop_requested(); ++i)
+                values.push_back(make(i, stop));
+            (*made)[std::size_t(number)] = std::move(values);
+        };
+        return runInThreads(qsizetype(made->size()), makeBatch, [&](qsizetype number) {
+            Batch values = std::move((*made)[std::size_t(number)]);
+            for (std::size_t i = 0; i < values.size(); ++i)
+                take(number * batch + qsizetype(i), std::move(values[i]));
+        });
+    }
+
     /// Waits until an object of this thread, as a reply of the network, gives a signal. False: the
     /// work was cancelled, and `abort` was called.
     template <typename Sender, typename Signal, typename Abort>
@@ -73,7 +98,10 @@ public:
 private:
     friend class Wait;
     using Tell = std::function<void()>;
+    static constexpr qsizetype batch = 32; // what a thread does before it tells of it
     bool runInThread(const std::function<void(std::stop_token)> &piece);
+    bool runInThreads(qsizetype count, const std::function<void(qsizetype, std::stop_token)> &make,
+                      const std::function<void(qsizetype)> &take);
     bool waitUntil(const std::function<QMetaObject::Connection(const Tell &)> &connectTo);
 
     Form *mScreen;

@@ -5,6 +5,7 @@
 #include "platform/text/textrules.h"
 #include "platform/work/longwork.h"
 
+#include <QProgressBar>
 #include <QProgressDialog>
 #include <QTimer>
 #include <vector>
@@ -14,13 +15,11 @@ using namespace Qt::StringLiterals;
 namespace
 {
 
-constexpr int windowAfter = 500; // milliseconds
-
 std::vector<Wait *> gWaits; // the last one began last
 
 } // namespace
 
-Wait::Wait(LongWork &work) : mWork(work)
+Wait::Wait(LongWork &work, int windowAfter) : mWork(work), mWindowAfter(windowAfter)
 {
     gWaits.push_back(this);
     work.mWaits.push_back(this);
@@ -44,16 +43,30 @@ bool Wait::run()
 
 void Wait::runBehindWindow()
 {
-    QTimer::singleShot(windowAfter, &mLoop, &QEventLoop::quit);
+    QTimer::singleShot(mWindowAfter, &mLoop, &QEventLoop::quit);
     mLoop.exec(QEventLoop::ExcludeUserInputEvents);
     if (mState != State::Waiting)
         return;
     QProgressDialog window(mWork.what(), text::ofKey("cmdCancelCaption"), 0, 0, mWork.window());
     window.setObjectName(u"WorkWindow"_s);
+    mBar = new QProgressBar; // the dialog's own handles events with each value
+    window.setBar(mBar);
+    mBar->setRange(0, 0);
+    if (mPercent >= 0)
+        showPercent(mPercent);
     window.setWindowModality(Qt::ApplicationModal);
     connect(&window, &QProgressDialog::canceled, this, [this] { mWork.cancel(); });
     window.show();
     mLoop.exec();
+}
+
+void Wait::showPercent(int percent)
+{
+    mPercent = percent;
+    if (!mBar)
+        return;
+    mBar->setRange(0, 100);
+    mBar->setValue(percent);
 }
 
 // Those that began later stand on the stack above: their loops must return before this one can.
