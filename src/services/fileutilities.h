@@ -3,6 +3,7 @@
 #include <QString>
 #include <QStringList>
 #include <memory>
+#include <stop_token>
 
 class QWidget;
 
@@ -27,9 +28,13 @@ bool IsDriveRoot(const QString &text);
 /// The text up to the first NUL, in place and as the result.
 QString StripAtNull(QString &s);
 
-/// All files below a folder whose names fit the pattern, the folder's own first. Folders with
-/// "Processed" in their path are not entered, files below "SYSTEM FILES" not listed.
+/// All files below a folder whose names fit the pattern, the folder's own first, each folder's in
+/// the order of their names. Folders with "Processed" in their path are not entered, files below
+/// "SYSTEM FILES" not listed.
 QStringList FindFilesInTree(const QString &path, const QString &pattern, int mode);
+
+/// The same for a worker: nothing of the program is touched. Those found so far when it is stopped.
+QStringList filesInTree(const QString &path, const QString &pattern, const std::stop_token &stop);
 
 /// The same into gFoundFiles; gives the sum of the sizes of the files in bytes.
 double ScanFolderTree(QString path, const QString &pattern, int fileCount, int folderCount);
@@ -42,5 +47,5 @@ bool MoveFileReplace(const QString &from, const QString &to);
 QString BrowseForFolderDialog(const QString &title, const QString &initialFolder);
 
 /// The stored name of a file as this system writes it: as it is if such a file is there, else with
-/// "\" taken as the separator.
+/// "\" taken as the separator, and with letters composed or decomposed as they are on the disk.
 QString systemPath(const QString &stored);

@@ -1,5 +1,7 @@
 #include "platform/files/wholefile.h"
 
+#include "platform/files/nativename.h"
+
 #include <QFileInfo>
 #include <cerrno>
 #include <fcntl.h>
@@ -51,7 +53,7 @@ bool WholeFile::commit()
 bool syncFolder(const QString &folder)
 {
     const int handle =
-        ::open(QFile::encodeName(folder).constData(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+        ::open(nativeName(folder).constData(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
     if (handle < 0)
         return errno == EACCES; // a folder may be written and not read
     const bool synced = ::fsync(handle) == 0 || errno == EINVAL || errno == EROFS;
