@@ -5,8 +5,10 @@
 #include "platform/files/wholefile.h"
 #include "tags/tagerrors.h"
 
+#include <QDir>
 #include <QFile>
 #include <QFileInfo>
+#include <QStandardPaths>
 #include <cerrno>
 #include <cstdio>
 #include <fcntl.h>
@@ -43,6 +45,17 @@ bool find(const QString &path, struct stat &about)
     return ::lstat(nativeName(path).constData(), &about) == 0;
 }
 
+// Where the desktop has no wastebasket the toolkit would take the current folder for it. So the
+// one of the user has to be there first; on another disk it may still use one of that disk.
+bool hasWastebasket()
+{
+    const QString data = QStandardPaths::writableLocation(QStandardPaths::GenericDataLocation);
+    const QString wastebasket = data + u"/Trash"_s;
+    if (!QFileInfo::exists(wastebasket) && QDir().mkpath(data) && QDir().mkdir(wastebasket))
+        QFile::setPermissions(wastebasket, QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner);
+    return !data.isEmpty() && QFileInfo(wastebasket).isDir();
+}
+
 } // namespace
 
 bool isNameTaken(const QString &path)
@@ -63,7 +76,7 @@ void moveFile(const QString &from, const QString &to)
 {
     const FileStamp moved = stampOfName(from);
     QString inWastebasket;
-    if (isNameTaken(to) && !stampOfName(to).isSameFile(moved))
+    if (isNameTaken(to) && !stampOfName(to).isSameFile(moved) && hasWastebasket())
         QFile::moveToTrash(to, &inWastebasket);
     if (!rename(from, to)) {
         const int error = errno;

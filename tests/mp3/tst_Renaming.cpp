@@ -5,6 +5,7 @@
 
 #include <QDir>
 #include <QPushButton>
+#include <QStorageInfo>
 #include <unistd.h>
 
 namespace
@@ -67,6 +68,7 @@ private slots:
     void init()
     {
         ScreenTest::init();
+        qputenv("XDG_DATA_HOME", mCatalogue->path("data").toUtf8()); // wastebasket
         mScreen = new Form(u"frmCDRootMP3"_s);
         mScreen->Load();
     }
@@ -131,6 +133,9 @@ private slots:
         QCOMPARE(rename(rows, {u"already exists=Yes"_s}), texts("01-A-B.mp3"));
         QCOMPARE(contentOf(u"01-A-B.mp3"_s), "x.mp3");
         QCOMPARE(contentOf(u"x.mp3"_s), "none");
+        QVERIFY(!QFileInfo::exists(u"files/01-A-B.mp3"_s)); // in the current folder
+        if (QStorageInfo(folder()) == QStorageInfo(QDir::home()))
+            QCOMPARE(readFile(mCatalogue->path("data/Trash/files/01-A-B.mp3")), "other");
     }
 
     // Another name for the very file, as on a disk that makes no difference between cases.
