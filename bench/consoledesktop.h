@@ -16,6 +16,7 @@ public:
                          const QString &title) override;
     void showModal(Form &) override {}
     QString openFileName(const FileQuestion &) override { return {}; }
+    QStringList openFileNames(const FileQuestion &) override { return {}; }
     QString saveFileName(const FileQuestion &) override { return {}; }
     QString folderName(const FileQuestion &) override { return {}; }
     PrinterChoice choosePrinter(QPrinter &, int) override { return PrinterChoice::NoPrinter; }

@@ -8,6 +8,7 @@
 #include "collection/ui_frmCDList.h"
 #include "controls/list/DBListViewCTL.h"
 #include "controls/list/listcolumns.h"
+#include "mp3/collections.h"
 #include "platform/desktop/desktop.h"
 #include "platform/text/textrules.h"
 #include "platform/work/longwork.h"
@@ -257,16 +258,15 @@ void frmCDList::CDTab_Click()
     focusList();
 }
 
-// Adding and editing MP3 collections wait for their editor. There is no report of them.
+// There is no report of MP3 collections.
 void frmCDList::showPage()
 {
     const ListPage *page = current();
     mUi->cmdInsert->setVisible(page);
     mUi->cmdUpdate->setVisible(page);
     mUi->cmdDelete->setVisible(page);
-    const bool editable = page && page->page != MP3Collections;
-    mUi->cmdInsert->setEnabled(editable);
-    mUi->cmdUpdate->setEnabled(editable && page->count > 0);
+    mUi->cmdInsert->setEnabled(page);
+    mUi->cmdUpdate->setEnabled(page && page->count > 0);
     mUi->cmdDelete->setEnabled(page && page->count > 0);
     mUi->cmdStartReport->setEnabled(!page || page->page != MP3Collections);
     showCount();
@@ -393,6 +393,8 @@ void frmCDList::cmdInsert_Click()
         editors::newCompilation();
     else if (mUi->CDTab->currentIndex() == Albums)
         editors::newAlbum();
+    else if (mUi->CDTab->currentIndex() == MP3Collections)
+        collections::open();
 }
 
 void frmCDList::cmdUpdate_Click()
@@ -405,6 +407,8 @@ void frmCDList::cmdUpdate_Click()
         editors::editCompilation(item.Text().toLongLong());
     else if (page->page == Albums)
         editors::editAlbum(item.Text().toLongLong());
+    else
+        collections::edit(item.Text().toLongLong());
 }
 
 void frmCDList::cmdDelete_Click()

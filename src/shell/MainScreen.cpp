@@ -18,6 +18,7 @@
 #include "shell/freeplace.h"
 #include "shell/frmHelp.h"
 #include "shell/frmSplash.h"
+#include "shell/mp3entries.h"
 #include "shell/ui_MainScreen.h"
 #include "shell/undoentry.h"
 #include "textimport/frmImportWizard.h"
@@ -182,6 +183,7 @@ void MainScreen::connectActions()
     on(mUi->tbHelp, &ShowHelpLinks);
     on(mUi->Over, &MainScreen::Over_Click);
     on(mUi->tbCredits, &MainScreen::Over_Click);
+    connectMP3Entries(*this);
     connectDiscEntries(*this); // the credits of the services come behind the program's own
     connectUndoEntry(*this);
     on(mUi->mnuEngels, [this] { ChangeLanguage(languageEnglish); });

@@ -2,6 +2,7 @@
 #include "collection/frmCDList.h"
 #include "collection/recordtree.h"
 #include "controls/list/DBListViewCTL.h"
+#include "mp3/frmCDRootMP3.h"
 #include "platform/ado/connection.h"
 #include "support/editing.h"
 #include "support/screentest.h"
@@ -229,16 +230,21 @@ private slots:
         QCOMPARE(openEditors().last(), u"frmCDRootE U 4"_s);
     }
 
-    void mp3CollectionsAreNotEditedYet()
+    void mp3Collections()
     {
         fill();
         show();
         page(3);
-        QVERIFY(!control<QPushButton>("cmdInsert")->isEnabled());
-        QVERIFY(!control<QPushButton>("cmdUpdate")->isEnabled());
+        QTest::keyClick(list("MP3List"), Qt::Key_Return);
         QTest::keyClick(list("MP3List"), Qt::Key_Return);
         QTest::keyClick(list("MP3List"), Qt::Key_Insert);
-        QVERIFY(openEditors().isEmpty());
+        control<QPushButton>("cmdInsert")->click();
+        QStringList open;
+        for (Form *form : Form::openForms()) {
+            if (const auto *editor = qobject_cast<frmCDRootMP3 *>(form))
+                open.append(editor->Mode + QString::number(editor->CollectionId));
+        }
+        QCOMPARE(open, texts("U2", "I-999", "I-999"));
     }
 
     void aLargePageIsReadWhenItIsLookedAt()

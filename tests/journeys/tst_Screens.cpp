@@ -15,6 +15,7 @@
 #include "discdata/frmWhatNow.h"
 #include "mp3/RenamePreview.h"
 #include "mp3/UndoChanges.h"
+#include "mp3/frmCDRootMP3.h"
 #include "platform/ado/connection.h"
 #include "reports/frmPageSetup.h"
 #include "reports/reportpaper.h"
@@ -269,6 +270,7 @@ class tst_Screens : public QObject
                 {"frmCDList", make<frmCDList>()},
                 {"frmCDRoot", makeEditor<frmCDRoot>()},
                 {"frmCDRootE", makeEditor<frmCDRootE>()},
+                {"frmCDRootMP3", makeEditor<frmCDRootMP3>()},
                 {"frmImportWizard", make<frmImportWizard>()},
                 {"frmImportBusy", make<frmImportBusy>()},
                 {"frmImport", make<frmImport>()},
@@ -401,6 +403,7 @@ private slots:
         row("Credits", make<Credits>(), "");
         row("ProxyInfo", make<ProxyInfo>(), "");
         row("frmWhatNow", make<frmWhatNow>(), "");
+        row("frmCDRootMP3", makeEditor<frmCDRootMP3>(), "");
         row("frmWhatCD", makeWhatCD, "");
         row("RenamePreview", makeRenamePreview, "");
         row("UndoChanges", make<UndoChanges>(), "");

@@ -135,6 +135,11 @@ QString ScriptedDesktop::openFileName(const FileQuestion &)
     return nextFile("open");
 }
 
+QStringList ScriptedDesktop::openFileNames(const FileQuestion &)
+{
+    return nextFile("open").split(u'\n', Qt::SkipEmptyParts);
+}
+
 QString ScriptedDesktop::saveFileName(const FileQuestion &)
 {
     return nextFile("save");

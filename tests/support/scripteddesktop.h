@@ -29,6 +29,7 @@ public:
     /// Without a script the screen is left to end by itself.
     void expectModal(const QString &name, std::function<void(Form &)> script = {});
     void expectFile(const QString &name) { mFiles.push_back(name); }
+    void expectFiles(const QStringList &names) { mFiles.push_back(names.join(u'\n')); }
 
     /// The next question for a printer gets one that prints into this file; without a name the
     /// machine has none.
@@ -52,6 +53,7 @@ public:
                          const QString &title) override;
     void showModal(Form &form) override;
     QString openFileName(const FileQuestion &question) override;
+    QStringList openFileNames(const FileQuestion &question) override;
     QString saveFileName(const FileQuestion &question) override;
     QString folderName(const FileQuestion &question) override;
     PrinterChoice choosePrinter(QPrinter &printer, int pages) override;

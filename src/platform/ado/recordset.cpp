@@ -173,6 +173,13 @@ void Recordset::Delete()
     mOnDeleted = true;
 }
 
+void Recordset::arrange(const std::vector<std::uint32_t> &order)
+{
+    changeable().arrange(order);
+    mPosition = 0;
+    mOnDeleted = false;
+}
+
 std::shared_ptr<const Rows> Recordset::rows() const
 {
     requireOpen();

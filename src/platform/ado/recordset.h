@@ -56,6 +56,7 @@ public:
     void AddNew();
     void Update() {} // every value counts at once
     void Delete();   // the position stays until the next move
+    void arrange(const std::vector<std::uint32_t> &order); // keeps these rows, in this order
 
     /// The rows as they are now; they never change, whatever happens to the recordset.
     std::shared_ptr<const Rows> rows() const;

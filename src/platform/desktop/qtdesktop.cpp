@@ -147,6 +147,14 @@ QString QtDesktop::openFileName(const FileQuestion &question)
     return chosen(dialog);
 }
 
+QStringList QtDesktop::openFileNames(const FileQuestion &question)
+{
+    QFileDialog dialog(QApplication::activeWindow());
+    prepare(dialog, question);
+    dialog.setFileMode(QFileDialog::ExistingFiles);
+    return run(dialog) == QDialog::Accepted ? dialog.selectedFiles() : QStringList();
+}
+
 QString QtDesktop::saveFileName(const FileQuestion &question)
 {
     QFileDialog dialog(QApplication::activeWindow());

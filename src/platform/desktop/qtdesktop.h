@@ -12,6 +12,7 @@ public:
                          const QString &title) override;
     void showModal(Form &form) override;
     QString openFileName(const FileQuestion &question) override;
+    QStringList openFileNames(const FileQuestion &question) override;
     QString saveFileName(const FileQuestion &question) override;
     QString folderName(const FileQuestion &question) override;
     PrinterChoice choosePrinter(QPrinter &printer, int pages) override;

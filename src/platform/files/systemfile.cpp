@@ -192,6 +192,13 @@ FileStamp stampOf(const QString &path)
     return stampFrom(about);
 }
 
+std::optional<FileStamp> stampOfOrdinaryFile(const QString &path)
+{
+    struct stat about = {};
+    const bool isFile = stat(nativeName(path).constData(), &about) == 0 && S_ISREG(about.st_mode);
+    return isFile ? std::optional(stampFrom(about)) : std::nullopt;
+}
+
 QString realPath(const QString &path)
 {
     char *real = ::realpath(nativeName(path).constData(), nullptr);

@@ -3,6 +3,7 @@
 #include <QByteArray>
 #include <QString>
 #include <compare>
+#include <optional>
 
 /// What tells a file from another, and whether it has been written since.
 struct FileStamp {
@@ -56,6 +57,9 @@ private:
 
 /// Of what a name leads to; throws Error where there is nothing.
 FileStamp stampOf(const QString &path);
+
+/// The same; nothing where no ordinary file has this name.
+std::optional<FileStamp> stampOfOrdinaryFile(const QString &path);
 
 /// Where a name leads to, without links; the name itself where there is nothing.
 QString realPath(const QString &path);

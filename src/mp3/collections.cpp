@@ -1,0 +1,40 @@
+#include "mp3/collections.h"
+
+#include "mp3/frmCDRootMP3.h"
+
+using namespace Qt::StringLiterals;
+
+namespace collections
+{
+
+namespace
+{
+
+void show(const QString &mode, qint64 collection)
+{
+    auto *editor = new frmCDRootMP3;
+    editor->Mode = mode;
+    editor->CollectionId = collection;
+    editor->Show();
+}
+
+} // namespace
+
+void open()
+{
+    show(u"I"_s, 0);
+}
+
+void edit(qint64 collection)
+{
+    for (Form *form : Form::openForms()) {
+        auto *editor = qobject_cast<frmCDRootMP3 *>(form);
+        if (editor && editor->holds(collection)) {
+            editor->Show();
+            return;
+        }
+    }
+    show(u"U"_s, collection);
+}
+
+} // namespace collections

@@ -1,0 +1,13 @@
+#pragma once
+
+#include <QtGlobal>
+
+/// How the editors of MP3 collections come up: a new one for each new collection, and one per
+/// collection that is stored.
+namespace collections
+{
+
+void open();
+void edit(qint64 collection);
+
+} // namespace collections

@@ -1,0 +1,80 @@
+#include "mp3/rownames.h"
+
+#include <QDir>
+#include <QFileInfo>
+#include <algorithm>
+#include <optional>
+
+using namespace Qt::StringLiterals;
+
+namespace rownames
+{
+
+namespace
+{
+
+constexpr qsizetype longestName = 255;
+
+// The root's name ends in the separator itself.
+QString withSeparator(const QString &folder)
+{
+    return folder.endsWith(QDir::separator()) ? folder : folder + QDir::separator();
+}
+
+std::optional<QString> nameIn(const QString &folder, const QString &file)
+{
+    const QString start = withSeparator(folder);
+    return file.startsWith(start) ? std::optional(file.sliced(start.size())) : std::nullopt;
+}
+
+// A folder can be typed in more than one way, and be reached through a link.
+std::optional<QString> relativeName(const QString &folder, const QString &file)
+{
+    if (const auto plain = nameIn(QDir::cleanPath(folder), QDir::cleanPath(file)))
+        return plain;
+    const QFileInfo info(file);
+    return nameIn(QFileInfo(folder).canonicalFilePath(),
+                  withSeparator(QFileInfo(info.path()).canonicalFilePath()) + info.fileName());
+}
+
+// By design: the first of several comes last.
+QStringList inOrderOfAdding(QStringList files)
+{
+    if (files.size() > 1)
+        files.append(files.takeFirst());
+    return files;
+}
+
+} // namespace
+
+Chosen ofChosen(const QString &folder, const QStringList &files)
+{
+    Chosen chosen;
+    for (const QString &file : inOrderOfAdding(files)) {
+        const auto name = relativeName(folder, file);
+        if (!QFileInfo(file).fileName().contains(".MP3"_L1, Qt::CaseInsensitive)) {
+            chosen.refusal = "OnlyMP3Files";
+            chosen.askAgain = true;
+        } else if (!name) {
+            chosen.refusal = "InvalidDirectory";
+        } else if (name->size() > longestName) {
+            chosen.refusal = "NumberOfCharactersExceeded";
+        }
+        if (chosen.refusal)
+            break;
+        chosen.names.append(*name);
+    }
+    return chosen;
+}
+
+QStringList ofFound(const QString &folder, const QStringList &files)
+{
+    const qsizetype start = withSeparator(folder).size();
+    QStringList names;
+    names.reserve(files.size());
+    for (const QString &file : files)
+        names.append(file.sliced(start));
+    return names;
+}
+
+} // namespace rownames

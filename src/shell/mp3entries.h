@@ -1,0 +1,6 @@
+#pragma once
+
+class MainScreen;
+
+/// The entry of the menu for a new collection of MP3 files.
+void connectMP3Entries(MainScreen &frame);
