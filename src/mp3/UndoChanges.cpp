@@ -3,6 +3,7 @@
 #include "controls/list/DBListViewCTL.h"
 #include "controls/list/listcolumns.h"
 #include "discdata/changedfiles.h"
+#include "mp3/followednames.h"
 #include "mp3/ui_UndoChanges.h"
 #include "platform/desktop/desktop.h"
 #include "platform/work/longwork.h"
@@ -154,6 +155,7 @@ void UndoChanges::undo(const Batches &batches)
         undone = undoAll(batches, work);
     }
     gTagsChanged = true; // lists that are open are read again
+    follow(undone);
     setRunning(false);
     showBatches();
     tell(undone);
@@ -173,12 +175,23 @@ FileJournal::Undone UndoChanges::undoAll(const Batches &batches, LongWork &work)
                 [&](int done, int /*all*/) { return work.step(before + done, files); });
             all.files += one.files;
             all.left += one.left;
+            all.moved.insert(all.moved.end(), one.moved.begin(), one.moved.end());
         } catch (const Error &error) {
             all.left.append(batch.what + u": "_s + error.Description);
         }
         before += batch.files;
     }
     return all;
+}
+
+// Collections find their files again under the names that these have now.
+void UndoChanges::follow(const FileJournal::Undone &undone)
+{
+    try {
+        followNames(renamedBy(undone.moved));
+    } catch (const Error &error) {
+        errorBox(error.numbered(), GetMessage("MsgSysErr"));
+    }
 }
 
 void UndoChanges::setRunning(bool running)

@@ -36,6 +36,7 @@ private:
     void cmdClose_Click();
     void undo(const Batches &batches);
     FileJournal::Undone undoAll(const Batches &batches, LongWork &work);
+    void follow(const FileJournal::Undone &undone);
     void setRunning(bool running);
     void tell(const FileJournal::Undone &undone);
 

@@ -105,7 +105,7 @@ void renameFiles(Form &screen, const QString &folder, const std::vector<Collecti
     if (!LongWork::mayBegin(screen))
         return;
     LongWork work(screen, GetMessage("xRenaming"));
-    Renaming renaming(screen, {folder, collection.empty() ? rows : collection}, renamed);
+    Renaming renaming(screen, {folder, collection}, renamed);
     for (size_t done = 0; done < rows.size() && !screen.isUnloaded();) {
         renaming.rename(rows[done]);
         if (!work.step(qint64(++done), qint64(rows.size())))
@@ -118,7 +118,7 @@ void previewRenaming(Form &screen, const QString &folder, const std::vector<Coll
 {
     if (!LongWork::mayBegin(screen))
         return;
-    RenamingPlan plan(folder, collection.empty() ? rows : collection);
+    RenamingPlan plan(folder, collection);
     std::vector<PreviewedName> names;
     for (const CollectionRow &row : rows) {
         const NewName name = plan.nameFor(row);

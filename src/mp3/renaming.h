@@ -16,8 +16,8 @@ class QString;
 void renameFiles(
     Form &screen, const QString &folder, const std::vector<CollectionRow> &rows,
     const std::function<void(const CollectionRow &row, const QString &newName)> &renamed,
-    const std::vector<CollectionRow> &collection = {});
+    const std::vector<CollectionRow> &collection);
 
 /// Shows what renameFiles() would do, on a screen of its own. Nothing is touched.
 void previewRenaming(Form &screen, const QString &folder, const std::vector<CollectionRow> &rows,
-                     const std::vector<CollectionRow> &collection = {});
+                     const std::vector<CollectionRow> &collection);

@@ -81,9 +81,13 @@ FileJournal::Undone ChangeUndo::run(ChangeBatch about,
     FileJournal::Undone undone;
     FileChanges changes(mJournal, {about.when, about.what, about.where, mBatch});
     for (size_t i = 0; i < all.size() && step(int(i), int(all.size())); ++i) {
+        const FileChange &change = all[i]->change;
+        const QString now = nowAt(change.other, change.id);
         try {
             takeBack(changes, *all[i]);
             ++undone.files;
+            if (change.way == FileChange::Way::Move)
+                undone.moved.emplace_back(now, change.path);
         } catch (const Error &error) {
             undone.left.append(nowAt(all[i]->change.path, all[i]->change.id) + u": "_s +
                                error.Description);

@@ -24,6 +24,7 @@ public:
     struct Undone {
         int files = 0;
         QStringList left; // "path: why" of those that were left as they are
+        std::vector<std::pair<QString, QString>> moved; // names before it and behind it
     };
     /// Takes the changes of a batch back, the last first, as a batch of its own. A file that
     /// something else has changed since is left. `step` is told how far it is and ends it with

@@ -56,9 +56,10 @@ private:
         QStringList names;
         for (const CollectionRow &row : rows)
             names.append(row[CollectionField::FileName]);
-        renameFiles(*mScreen, folder(), rows, [&](const CollectionRow &row, const QString &name) {
+        const auto renamed = [&](const CollectionRow &row, const QString &name) {
             names[row.index - 1] = name;
-        });
+        };
+        renameFiles(*mScreen, folder(), rows, renamed, rows);
         return names;
     }
 
@@ -167,7 +168,7 @@ private slots:
                              items.Item(i).SubItems(3).section(u'.', 0, 0));
             screen.findChild<QPushButton *>(u"cmdClose"_s)->click();
         });
-        previewRenaming(*mScreen, folder(), rows);
+        previewRenaming(*mScreen, folder(), rows, rows);
         QCOMPARE(lines, texts("01-A-B.mp3: ",
                               "! 01-A-B.mp3: This is the name of the file in row 1 "
                               "of the list",

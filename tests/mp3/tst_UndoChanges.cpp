@@ -57,12 +57,16 @@ private slots:
         gTagsChanged = false;
     }
 
-    // The one that came last goes first, whatever the order of the choice.
+    // The one that came last goes first, whatever the order of the choice. The collection that was
+    // stored meanwhile finds its file.
     void severalAtATime()
     {
         change({u"a.mp3"_s, u"b.mp3"_s});
         mDesktop->time = mDesktop->time.addDays(1);
         change({u"b.mp3"_s, u"c.mp3"_s});
+        mCatalogue->exec(u"insert into MP3Files values (1,1,'c.mp3',1),(2,2,'x.mp3',1);"
+                         "insert into MP3Collections values (1,'"_s +
+                         path({}).chopped(1) + u"','All')"_s);
         show();
         QCOMPARE(lines(), texts("23 Nov 2026, 12:00|c.mp3|1|", "22 Nov 2026, 12:00|b.mp3|1|"));
         list()->selectAll();
@@ -72,6 +76,8 @@ private slots:
         mDesktop->expectBox(u"as they were before: 2"_s);
         press(u"cmdUndo"_s);
         QCOMPARE(readFile(path(u"a.mp3"_s)), "a");
+        QCOMPARE(mCatalogue->rows("select FileName from MP3Files order by ID"),
+                 texts("a.mp3", "x.mp3"));
         QVERIFY(gTagsChanged);
         QCOMPARE(lines(),
                  texts("23 Nov 2026, 12:00|Undo: b.mp3|1|", "23 Nov 2026, 12:00|Undo: c.mp3|1|",

@@ -1,0 +1,26 @@
+#pragma once
+
+#include <QHash>
+#include <QString>
+
+/// Files of the user that have other names now: full, clean names, the old one to the new one.
+using RenamedFiles = QHash<QString, QString>;
+
+/// What moves, one after the other, come to.
+RenamedFiles renamedBy(const std::vector<std::pair<QString, QString>> &moves);
+
+/// What an open editor of a collection is, to those who rename its files from outside.
+class FollowsNames
+{
+public:
+    virtual ~FollowsNames() = default;
+    virtual void followNames(const RenamedFiles &renamed) = 0;
+};
+
+/// The name in a folder that a file of a collection has now; the one that it had if it was not
+/// renamed.
+QString followedName(const RenamedFiles &renamed, const QString &folder, const QString &fileName);
+
+/// Gives the new names to the collections in the catalogue, in one transaction over gConnection,
+/// and to the open editors. Throws Error, and the catalogue is as it was then.
+void followNames(const RenamedFiles &renamed);
