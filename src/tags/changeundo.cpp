@@ -17,41 +17,46 @@ namespace
 
 } // namespace
 
-// A file that was renamed since has its new name.
-QString ChangeUndo::nowAt(const QString &path, qint64 sinceId) const
+// A file that was renamed since has its new name, and one that was written anew is another one to
+// the system.
+ChangeUndo::Now ChangeUndo::now(const QString &path, const FileJournal::Entry &since) const
 {
-    QString name = path;
-    for (auto entry = mEntries.upper_bound(sinceId); entry != mEntries.end(); ++entry) {
+    Now now{path, since.after};
+    for (auto entry = mEntries.upper_bound(since.change.id); entry != mEntries.end(); ++entry) {
         const FileChange &change = entry->second.change;
-        if (change.way == FileChange::Way::Move && entry->second.isDone && change.path == name)
-            name = change.other;
+        if (!entry->second.isDone || change.path != now.name || mTakenBack.contains(change.id))
+            continue;
+        now.stamp = entry->second.after;
+        if (change.way == FileChange::Way::Move)
+            now.name = change.other;
     }
-    return name;
+    if (const auto touched = mTouched.find(now.name); touched != mTouched.end())
+        now.stamp = touched->second;
+    return now;
 }
 
 void ChangeUndo::takeBackMove(FileChanges &changes, const FileJournal::Entry &entry) const
 {
-    const QString now = nowAt(entry.change.other, entry.change.id);
-    if (!isNameTaken(now))
+    const auto [name, stamp] = now(entry.change.other, entry);
+    if (!isNameTaken(name))
         leave("xUndoGone");
-    if (!stampOfName(now).isSameFile(entry.change.before))
+    if (!stampOfName(name).isSameFile(stamp))
         leave("xUndoChanged");
-    if (isNameTaken(entry.change.path) &&
-        !stampOfName(entry.change.path).isSameFile(entry.change.before))
+    if (isNameTaken(entry.change.path) && !stampOfName(entry.change.path).isSameFile(stamp))
         leave("xUndoNameTaken");
-    changes.move(now, entry.change.path);
+    changes.move(name, entry.change.path);
 }
 
-void ChangeUndo::takeBackHead(FileChanges &changes, const FileJournal::Entry &entry) const
+void ChangeUndo::takeBackHead(FileChanges &changes, const FileJournal::Entry &entry)
 {
     const FileChange &change = entry.change;
-    const QString now = realPath(nowAt(change.path, change.id));
-    if (!isOrdinaryFile(now))
+    const QString name = realPath(now(change.path, entry).name);
+    if (!isOrdinaryFile(name))
         leave("xUndoGone");
     const auto kept = mJournal.mStore.bytes(entry.place);
     if (!kept)
         leave("xUndoForgotten");
-    const SystemFile file(now, SystemFile::Mode::Read);
+    const SystemFile file(name, SystemFile::Mode::Read);
     QByteArray head = file.read(0, change.newHead);
     if (file.size() != change.newSize() || headChecksum(head) != change.newHeadIs)
         leave("xUndoChanged");
@@ -59,10 +64,11 @@ void ChangeUndo::takeBackHead(FileChanges &changes, const FileJournal::Entry &en
     if (change.way == FileChange::Way::InPlace)
         before =
             QByteArray(head).replace(change.from, kept->size() / 2, kept->first(kept->size() / 2));
-    changes.replaceHead(now, head, before);
+    changes.replaceHead(name, head, before);
+    mTouched[name] = stampOf(name);
 }
 
-void ChangeUndo::takeBack(FileChanges &changes, const FileJournal::Entry &entry) const
+void ChangeUndo::takeBack(FileChanges &changes, const FileJournal::Entry &entry)
 {
     if (entry.change.way == FileChange::Way::Move)
         takeBackMove(changes, entry);
@@ -85,11 +91,12 @@ FileJournal::Undone ChangeUndo::run(ChangeBatch about,
         const QString now = nowAt(change.other, change.id);
         try {
             takeBack(changes, *all[i]);
+            mTakenBack.insert(all[i]->change.id);
             ++undone.files;
             if (change.way == FileChange::Way::Move)
                 undone.moved.emplace_back(now, change.path);
         } catch (const Error &error) {
-            undone.left.append(nowAt(all[i]->change.path, all[i]->change.id) + u": "_s +
+            undone.left.append(now(all[i]->change.path, *all[i]).name + u": "_s +
                                error.Description);
         }
     }

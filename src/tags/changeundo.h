@@ -2,6 +2,8 @@
 
 #include "tags/filejournal.h"
 
+#include <set>
+
 class FileChanges;
 
 /// Takes the changes of one batch back, the last first.
@@ -15,12 +17,18 @@ public:
     FileJournal::Undone run(ChangeBatch about, const std::function<bool(int done, int all)> &step);
 
 private:
-    QString nowAt(const QString &path, qint64 sinceId) const;
-    void takeBack(FileChanges &changes, const FileJournal::Entry &entry) const;
+    struct Now {
+        QString name;
+        FileStamp stamp; // as the journal knows it
+    };
+    Now now(const QString &path, const FileJournal::Entry &since) const;
+    void takeBack(FileChanges &changes, const FileJournal::Entry &entry);
     void takeBackMove(FileChanges &changes, const FileJournal::Entry &entry) const;
-    void takeBackHead(FileChanges &changes, const FileJournal::Entry &entry) const;
+    void takeBackHead(FileChanges &changes, const FileJournal::Entry &entry);
 
     FileJournal &mJournal;
     const FileJournal::Entries &mEntries;
     const qint64 mBatch;
+    std::map<QString, FileStamp> mTouched; // by this undo
+    std::set<qint64> mTakenBack;           // the same
 };

@@ -136,8 +136,10 @@ void FileChanges::performOrMend(const HeadChange &head)
             notAccessible(change.path);
         performHead(head, file);
     } catch (...) {
-        mJournal.mendOne(change.id, true);
-        throw;
+        // The name may be there, and only its folder not be synced.
+        if (mJournal.mendOne(change.id, true) != Mended::New)
+            throw;
+        return;
     }
     mJournal.done(change.id, stampOf(change.path));
     if (change.way == FileChange::Way::Through)
@@ -210,8 +212,9 @@ void FileChanges::move(const QString &from, const QString &to)
     try {
         moveFile(from, to);
     } catch (const Error &) {
-        mJournal.mendOne(change.id, true);
-        throw;
+        if (mJournal.mendOne(change.id, true) != Mended::New)
+            throw;
+        return;
     }
     mJournal.done(change.id, stampOfName(to));
 }

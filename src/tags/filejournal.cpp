@@ -6,6 +6,7 @@
 #include "tags/headchange.h"
 #include "tags/movedfile.h"
 
+#include <QDir>
 #include <QFileInfo>
 #include <algorithm>
 #include <unistd.h>
@@ -193,13 +194,13 @@ QString FileJournal::copyName()
            QString::number(::getpid());
 }
 
-void FileJournal::mendOne(qint64 id, bool back)
+Mended FileJournal::mendOne(qint64 id, bool back)
 {
     const FileChange change = mPending[id].change;
     const auto kept = mStore.bytes(mPending[id].place);
     if (change.way == FileChange::Way::InPlace && !kept) {
         drop(id); // was not synced, so nothing was begun
-        return;
+        return Mended::Old;
     }
     const Mended end = change.way == FileChange::Way::Move
                            ? mendMove(change)
@@ -214,6 +215,19 @@ void FileJournal::mendOne(qint64 id, bool back)
         break;
     case Mended::NotNow:
         break;
+    }
+    return end;
+}
+
+// Made before the journal was told of them.
+void FileJournal::removeForgottenCopies() const
+{
+    QDir folder(mStore.folder());
+    for (const QString &name : folder.entryList({u"copy-*"_s}, QDir::Files)) {
+        const QString copy = folder.filePath(name);
+        if (std::none_of(mPending.begin(), mPending.end(),
+                         [&](const auto &entry) { return entry.second.change.other == copy; }))
+            folder.remove(name);
     }
 }
 
@@ -230,6 +244,7 @@ void FileJournal::mend()
         } catch (const Error &) { // at the next look
         }
     }
+    removeForgottenCopies();
 }
 
 FileJournal::Undone FileJournal::undo(qint64 batch, const QDateTime &when, const QString &what,

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "tags/filechange.h"
+#include "tags/headchange.h"
 #include "tags/journalstore.h"
 
 #include <functional>
@@ -61,7 +61,8 @@ private:
     void sync() { mStore.sync(); }
     void done(qint64 id, const FileStamp &after);
     void drop(qint64 id);
-    void mendOne(qint64 id, bool back);
+    Mended mendOne(qint64 id, bool back);
+    void removeForgottenCopies() const;
     QString copyName(); // of a Through
     void makeRoom();
 

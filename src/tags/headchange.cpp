@@ -123,15 +123,23 @@ void through(const FileChange &change, SystemFile &file)
     file.sync();
 }
 
-// Whether each sector is that of the old or of the new bytes.
-bool isMixture(const QByteArray &bytes, qint64 from, const QByteArray &one, const QByteArray &other)
+// The same of one sector, which a write that fell short may have begun.
+bool isBegun(QByteArrayView part, QByteArrayView oldPart, QByteArrayView newPart)
 {
+    const auto written = std::mismatch(part.begin(), part.end(), newPart.begin()).first;
+    const auto done = written - part.begin();
+    return part.sliced(done) == oldPart.sliced(done);
+}
+
+// Whether each sector is that of the old or of the new bytes.
+bool isMixture(QByteArrayView bytes, qint64 from, QByteArrayView oldBytes, QByteArrayView newBytes)
+{
+    if (bytes.size() != oldBytes.size())
+        return false;
     for (qsizetype at = 0; at < bytes.size();) {
         const qsizetype size =
             std::min<qsizetype>(bytes.size() - at, sector - (from + at) % sector);
-        const QByteArrayView part = QByteArrayView(bytes).sliced(at, size);
-        if (part != QByteArrayView(one).sliced(at, size) &&
-            part != QByteArrayView(other).sliced(at, size))
+        if (!isBegun(bytes.sliced(at, size), oldBytes.sliced(at, size), newBytes.sliced(at, size)))
             return false;
         at += size;
     }

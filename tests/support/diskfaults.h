@@ -19,9 +19,11 @@ namespace diskfaults
 {
 
 enum class Kind {
-    Full,  // that call and all writes behind it find no room; a write takes a part first
-    Broken // that call alone fails
+    Full,   // that call and all writes behind it find no room; a write takes a part first
+    Broken, // that call alone fails
+    Killed  // the process ends there, a write half done
 };
+constexpr int killed = 77; // how such a process ends
 
 /// Counts the calls below a folder from now on and lets the n-th fail; 0: none.
 class Fault
@@ -61,16 +63,33 @@ bool concerns(int handle)
 }
 
 // Whether this call is the one to fail, or comes behind it on a full disk.
-template <typename File> bool fails(File file, bool needsRoom)
+template <typename File> bool fails(File file, bool needsRoom, bool isWrite = false)
 {
     if (!concerns(file))
         return false;
     const int call = ++gState->calls;
+    if (gState->kind == diskfaults::Kind::Killed && call == gState->failing && !isWrite)
+        ::_exit(diskfaults::killed);
     const bool full = gState->kind == diskfaults::Kind::Full;
     const bool now = full ? needsRoom && gState->failing > 0 && call >= gState->failing
                           : call == gState->failing;
     errno = now ? (full ? ENOSPC : EIO) : errno;
     return now;
+}
+
+// A write. The one that fills the disk takes what there is room for, as one does in which the
+// process ends.
+template <typename Write> ssize_t part(int handle, size_t size, const Write &write)
+{
+    const int before = gState ? gState->calls : 0;
+    if (!fails(handle, true, true))
+        return write(size);
+    const bool isFirst = before + 1 == gState->failing;
+    const bool takes = gState->kind != diskfaults::Kind::Broken && isFirst && size > 1;
+    const ssize_t taken = takes ? write(size / 2) : -1;
+    if (gState->kind == diskfaults::Kind::Killed)
+        ::_exit(diskfaults::killed);
+    return taken;
 }
 
 template <typename Function> Function *next(Function *, const char *name)
@@ -114,12 +133,50 @@ int open64(const char *path, int flags, ...)
 ssize_t write(int handle, const void *data, size_t size)
 {
     static const auto system = next(&::write, "write");
-    const int before = gState ? gState->calls : 0;
-    if (!fails(handle, true))
-        return system(handle, data, size);
-    // The one that fills the disk takes what there is room for.
-    const bool part = gState->kind == diskfaults::Kind::Full && before + 1 == gState->failing;
-    return part && size > 1 ? system(handle, data, size / 2) : -1;
+    return part(handle, size, [&](size_t some) { return system(handle, data, some); });
+}
+
+ssize_t pwrite(int handle, const void *data, size_t size, off_t at)
+{
+    static const auto system = next(&::pwrite, "pwrite");
+    return part(handle, size, [&](size_t some) { return system(handle, data, some, at); });
+}
+
+ssize_t pwrite64(int handle, const void *data, size_t size, off64_t at)
+{
+    static const auto system = next(&::pwrite64, "pwrite64");
+    return part(handle, size, [&](size_t some) { return system(handle, data, some, at); });
+}
+
+ssize_t copy_file_range(int from, off64_t *fromAt, int to, off64_t *toAt, size_t size,
+                        unsigned flags)
+{
+    static const auto system = next(&::copy_file_range, "copy_file_range");
+    return part(to, size, [&](size_t some) { return system(from, fromAt, to, toAt, some, flags); });
+}
+
+int posix_fallocate(int handle, off_t at, off_t size)
+{
+    static const auto system = next(&::posix_fallocate, "posix_fallocate");
+    return fails(handle, true) ? errno : system(handle, at, size);
+}
+
+int posix_fallocate64(int handle, off64_t at, off64_t size)
+{
+    static const auto system = next(&::posix_fallocate64, "posix_fallocate64");
+    return fails(handle, true) ? errno : system(handle, at, size);
+}
+
+int ftruncate(int handle, off_t size) noexcept
+{
+    static const auto system = next(&::ftruncate, "ftruncate");
+    return fails(handle, false) ? -1 : system(handle, size);
+}
+
+int ftruncate64(int handle, off64_t size) noexcept
+{
+    static const auto system = next(&::ftruncate64, "ftruncate64");
+    return fails(handle, false) ? -1 : system(handle, size);
 }
 
 int fsync(int handle)

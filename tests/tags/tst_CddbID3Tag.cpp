@@ -1,6 +1,7 @@
 // Label: unit
 #include "platform/error/error.h"
 #include "support/datarows.h"
+#include "support/madetag.h"
 #include "support/testcatalogue.h"
 #include "tags/CddbID3Tag.h"
 
@@ -9,40 +10,6 @@
 
 namespace
 {
-
-QByteArray bigEndian(qsizetype number, int bits)
-{
-    QByteArray bytes;
-    for (int shift = 3 * bits; shift >= 0; shift -= bits)
-        bytes.append(char((number >> shift) & ((1 << bits) - 1)));
-    return bytes;
-}
-
-// A frame of version 2.3.
-QByteArray frame(const char *id, const QByteArray &content)
-{
-    return id + bigEndian(content.size(), 8) + QByteArray(2, '\0') + content;
-}
-
-QByteArray text(const char *id, const QByteArray &latin1)
-{
-    return frame(id, '\0' + latin1);
-}
-
-QByteArray comment(const QByteArray &description, const QByteArray &content)
-{
-    return frame("COMM", "\0eng"_ba + description + '\0' + content);
-}
-
-QByteArray fileId(const QByteArray &owner, const QByteArray &data)
-{
-    return frame("UFID", owner + '\0' + data);
-}
-
-QByteArray tagOf(const QByteArray &frames, char version = 3)
-{
-    return "ID3"_ba + version + QByteArray(2, '\0') + bigEndian(frames.size(), 7) + frames;
-}
 
 const QByteArray sound = "\xFF\xFB\x90\x64"_ba + QByteArray(413, '\0');
 
@@ -69,18 +36,21 @@ private slots:
     {
         const DataRows<QByteArray, int, QString> row("frames", "field", "value");
         const int genre = int(TagField::Genre), comments = int(TagField::Comments);
-        row("filled up", text("TALB", "Best  \0\0"_ba), int(TagField::Album), "Best");
-        row("zeros", text("TRCK", "03/09"), int(TagField::TrackPosition), "3/9");
-        row("a zero alone", text("TPOS", "0/2"), int(TagField::PartOfSet), "0/2");
-        row("date", text("TYER", "1985-05-13"), int(TagField::Year), "1985");
-        row("genre number", text("TCON", "(17)"), genre, "Rock");
-        row("bare number", text("TCON", "17"), genre, "Rock");
-        row("refined", text("TCON", "(17)Hard rock"), genre, "Rock/Hard rock");
-        row("words", text("TCON", "Liedjes"), genre, "Liedjes");
-        row("described last", comment("iTunNORM", "00 1F") + comment("", "mine"), comments, "mine");
-        row("described alone", comment("about", "this"), comments, "this");
-        row("other's id", fileId("http://x", "ab"), int(TagField::FileId), "http://x=6162");
-        row("own id first", fileId("http://x", "ab") + fileId(ownFileIdOwner, "\x01"),
+        row("filled up", textFrame("TALB", "Best  \0\0"_ba), int(TagField::Album), "Best");
+        row("zeros", textFrame("TRCK", "03/09"), int(TagField::TrackPosition), "3/9");
+        row("a zero alone", textFrame("TPOS", "0/2"), int(TagField::PartOfSet), "0/2");
+        row("date", textFrame("TYER", "1985-05-13"), int(TagField::Year), "1985");
+        row("genre number", textFrame("TCON", "(17)"), genre, "Rock");
+        row("bare number", textFrame("TCON", "17"), genre, "Rock");
+        row("refined", textFrame("TCON", "(17)Hard rock"), genre, "Rock/Hard rock");
+        row("words", textFrame("TCON", "Liedjes"), genre, "Liedjes");
+        row("described last", commentFrame("iTunNORM", "00 1F") + commentFrame("", "mine"),
+            comments, "mine");
+        row("described alone", commentFrame("about", "this"), comments, "this");
+        row("other's id", fileIdFrame("http://x", "ab"), int(TagField::FileId), "http://x=6162");
+        row("of both versions", frame("TIT2", QByteArray("\1\xFF\xFE\xE9\0,\0\xAC\x20", 9)),
+            int(TagField::Title), u"é,€"_s);
+        row("own id first", fileIdFrame("http://x", "ab") + fileIdFrame(ownFileIdOwner, "\x01"),
             int(TagField::FileId), "songcase=01");
     }
 
@@ -102,8 +72,8 @@ private slots:
         row("nothing", "");
         row("sound alone", sound);
         row("ID3v1 alone", sound + QByteArray("TAGTitle").leftJustified(128, '\0'));
-        row("a size that lies", "ID3\x03\0\0\x7F\x7F\x7F\x7F"_ba + text("TALB", "x").left(6));
-        row("frame cut off", tagOf(text("TALB", "Best").left(9)));
+        row("a size that lies", "ID3\x03\0\0\x7F\x7F\x7F\x7F"_ba + textFrame("TALB", "x").left(6));
+        row("frame cut off", tagOf(textFrame("TALB", "Best").left(9)));
     }
 
     void noTag()

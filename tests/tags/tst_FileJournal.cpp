@@ -1,0 +1,281 @@
+// Label: unit
+#include "platform/error/error.h"
+#include "support/datarows.h"
+#include "support/diskfaults.h"
+#include "support/madetag.h"
+#include "support/testcatalogue.h"
+#include "tags/filechanges.h"
+#include "tags/tagerrors.h"
+
+#include <QTemporaryDir>
+#include <sys/wait.h>
+#include <unistd.h>
+
+namespace
+{
+
+const QByteArray sound = "\xFF\xFB\x90\x64"_ba + QByteArray(9000, '\xAA');
+const QByteArray before =
+    tagOf(textFrame("TIT2", "Old") + textFrame("TALB", "Album"), 3, 900) + sound;
+
+const auto always = [](int, int) { return true; };
+
+} // namespace
+
+/// The journal of changed files: what it takes back, and what it makes of a disk that fails and of
+/// a process that ends at any call.
+class tst_FileJournal : public QObject
+{
+    Q_OBJECT
+
+private:
+    std::unique_ptr<QTemporaryDir> mFolder;
+    std::unique_ptr<FileJournal> mJournal;
+
+    QString path(const QString &name) const { return mFolder->filePath(name); }
+    void reopen(JournalSizes sizes = {})
+    {
+        mJournal = std::make_unique<FileJournal>(path(u"Changes"_s), sizes);
+    }
+    QString make(const QString &name) { return writeFile(path(name), before); }
+    QString title(const QString &name) const
+    {
+        CddbID3Tag tag;
+        tag.LoadFromFile(path(name), 1);
+        return tag.Title();
+    }
+    static CddbID3Tag tagWith(const QString &title)
+    {
+        CddbID3Tag tag;
+        tag.setAlbum(u"Album"_s);
+        tag.setTitle(title);
+        return tag;
+    }
+    void save(const QString &name, const QString &title)
+    {
+        FileChanges(*mJournal, {{}, title, {}}).saveTag(tagWith(title), path(name));
+    }
+    FileJournal::Undone undoLast()
+    {
+        return mJournal->undo(mJournal->batches().front().number, {}, u"undo"_s, always);
+    }
+
+private slots:
+    void init()
+    {
+        mFolder = std::make_unique<QTemporaryDir>();
+        reopen();
+    }
+
+    void undoTakesBackABatch()
+    {
+        make(u"a"_s);
+        make(u"b"_s);
+        const QString longTitle(3000, u'x');
+        {
+            FileChanges changes(*mJournal,
+                                {QDateTime(QDate(2026, 1, 2), QTime()), u"Tags"_s, u"W"_s});
+            changes.announce({{path(u"a"_s), tagWith(u"1"_s)}, {path(u"b"_s), tagWith(longTitle)}});
+            changes.saveTag(tagWith(u"1"_s), path(u"a"_s));
+            changes.saveTag(tagWith(longTitle), path(u"b"_s));
+            changes.move(path(u"b"_s), path(u"c"_s));
+        }
+        reopen(); // another run
+        const auto all = mJournal->batches();
+        QCOMPARE(all.size(), 1U);
+        QCOMPARE(all[0].files, 3);
+        QCOMPARE(all[0].what + all[0].where + all[0].when.toString(Qt::ISODate),
+                 u"TagsW2026-01-02T00:00:00"_s);
+        QCOMPARE(title(u"c"_s), longTitle);
+        QCOMPARE(undoLast().left, QStringList());
+        QCOMPARE(readFile(path(u"a"_s)), before);
+        QCOMPARE(readFile(path(u"b"_s)), before);
+        QVERIFY(!QFile::exists(path(u"c"_s)));
+        QVERIFY(mJournal->batches()[1].isTakenBack);
+        QCOMPARE(undoLast().left, QStringList()); // takes the undo back
+        QCOMPARE(title(u"c"_s), longTitle);
+        QVERIFY(!mJournal->batches()[2].isTakenBack);
+    }
+
+    void undoFindsAFileThatWasRenamedSince()
+    {
+        make(u"a"_s);
+        save(u"a"_s, u"New"_s);
+        const qint64 batch = mJournal->batches().front().number;
+        FileChanges(*mJournal, {}).move(path(u"a"_s), path(u"b"_s));
+        QCOMPARE(mJournal->undo(batch, {}, {}, always).files, 1);
+        QCOMPARE(readFile(path(u"b"_s)), before);
+    }
+
+    void whatChangedSinceIsLeft_data()
+    {
+        const DataRows<bool, QString> row("renamed", "since");
+        row("gone", false, u"gone"_s);
+        row("tag", false, u"tag"_s);
+        row("longer", false, u"longer"_s);
+        row("moved and gone", true, u"gone"_s);
+        row("moved and another in its place", true, u"taken"_s);
+    }
+
+    void whatChangedSinceIsLeft()
+    {
+        QFETCH(bool, renamed);
+        QFETCH(QString, since);
+        make(u"a"_s);
+        if (renamed)
+            FileChanges(*mJournal, {}).move(path(u"a"_s), path(u"b"_s));
+        else
+            save(u"a"_s, u"New"_s);
+        const QString now = path(renamed ? u"b"_s : u"a"_s);
+        if (since == "gone"_L1)
+            QVERIFY(QFile::remove(now));
+        else if (since == "taken"_L1)
+            make(u"a"_s);
+        else
+            writeFile(now, since == "tag"_L1 ? QByteArray(before).replace("Album", "ALBUM")
+                                             : readFile(now) + "x"_ba);
+        const QByteArray left = QFile::exists(now) ? readFile(now) : QByteArray();
+        const auto undone = undoLast();
+        QCOMPARE(undone.files, 0);
+        QCOMPARE(undone.left.size(), 1);
+        QCOMPARE(QFile::exists(now) ? readFile(now) : QByteArray(), left);
+    }
+
+    void aFileWrittenSinceItWasAnnounced()
+    {
+        make(u"a"_s);
+        FileChanges changes(*mJournal, {});
+        changes.announce({{path(u"a"_s), tagWith(u"New"_s)}});
+        const QByteArray other =
+            tagOf(textFrame("TALB", "Album") + frame("XYZW", "kept"), 3, 50) + sound;
+        writeFile(path(u"a"_s), other);
+        changes.saveTag(tagWith(u"New"_s), path(u"a"_s));
+        QVERIFY(readFile(path(u"a"_s)).contains("kept"));
+        QCOMPARE(title(u"a"_s), u"New"_s);
+    }
+
+    void theOldestGo()
+    {
+        reopen({2000, 8000});
+        make(u"a"_s);
+        for (int i = 0; i < 40; ++i)
+            save(u"a"_s, u"Title "_s + QString::number(i));
+        qint64 size = 0;
+        for (const QFileInfo &file : QDir(path(u"Changes"_s)).entryInfoList(QDir::Files))
+            size += file.size();
+        QVERIFY2(size < 12000, qPrintable(QString::number(size)));
+        const auto all = mJournal->batches();
+        QVERIFY(all.size() > 3 && all.size() < 30);
+        QCOMPARE(all.front().what, u"Title 39"_s);
+        reopen();
+        QCOMPARE(undoLast().files, 1);
+        QCOMPARE(title(u"a"_s), u"Title 38"_s);
+        QVERIFY(mJournal->batches().front().number > all.front().number);
+    }
+
+    void aMoveReplacesThroughTheWastebasket()
+    {
+        make(u"a"_s);
+        writeFile(path(u"b"_s), "other");
+        qputenv("XDG_DATA_HOME", path(u"data"_s).toUtf8());
+        FileChanges(*mJournal, {}).move(path(u"a"_s), path(u"b"_s));
+        QCOMPARE(readFile(path(u"b"_s)), before);
+        QVERIFY(!QFile::exists(path(u"a"_s)));
+        // A second name of the same file is no other file.
+        QCOMPARE(::link(path(u"b"_s).toUtf8().constData(), path(u"c"_s).toUtf8().constData()), 0);
+        FileChanges(*mJournal, {}).move(path(u"b"_s), path(u"c"_s));
+        QCOMPARE(readFile(path(u"c"_s)), before);
+        const QString tooLong = path(QString(300, u'x'));
+        QCOMPARE(numberOf([&] { FileChanges(*mJournal, {}).move(path(u"c"_s), tooLong); }),
+                 int(errFileNotMoved));
+        QCOMPARE(readFile(path(u"c"_s)), before);
+    }
+
+    // What is done, and how the disk fails.
+    void everyCallThatFails_data()
+    {
+        const DataRows<QString, int> row("what", "kind");
+        for (const QString &what : {u"in place"_s, u"beside"_s, u"through"_s, u"move"_s}) {
+            row(qPrintable(what + u", full"_s), what, int(diskfaults::Kind::Full));
+            row(qPrintable(what + u", broken"_s), what, int(diskfaults::Kind::Broken));
+            row(qPrintable(what + u", killed"_s), what, int(diskfaults::Kind::Killed));
+        }
+    }
+
+    void everyCallThatFails()
+    {
+        QFETCH(QString, what);
+        QFETCH(int, kind);
+        const bool isMove = what == "move"_L1;
+        const QString text = what == "in place"_L1 ? u"New"_s : QString(2000, u'n');
+        const auto change = [&] {
+            if (isMove)
+                FileChanges(*mJournal, {}).move(path(u"a"_s), path(u"b"_s));
+            else
+                save(u"a"_s, text);
+        };
+        bool came = true;
+        int calls = 0;
+        for (; came; ++calls) {
+            init();
+            make(u"a"_s);
+            if (what == "through"_L1)
+                QCOMPARE(
+                    ::link(path(u"a"_s).toUtf8().constData(), path(u"link"_s).toUtf8().constData()),
+                    0);
+            bool failed = false;
+            if (diskfaults::Kind(kind) == diskfaults::Kind::Killed) {
+                came = killedIn(change, calls + 1);
+            } else {
+                const diskfaults::Fault fault(mFolder->path(), diskfaults::Kind(kind), calls + 1);
+                try {
+                    change();
+                } catch (const Error &) {
+                    failed = true;
+                }
+                came = fault.came();
+            }
+            // As the next start finds it.
+            reopen();
+            mJournal->mend();
+            const bool isOld = isMove ? QFile::exists(path(u"a"_s)) : title(u"a"_s) == "Old"_L1;
+            const QString name = isMove && !isOld ? u"b"_s : u"a"_s;
+            // What was begun through a copy is completed.
+            QVERIFY2(!failed || isOld || what == "through"_L1, qPrintable(QString::number(calls)));
+            QVERIFY2(came || !isOld, "nothing failed");
+            if (isOld || isMove)
+                QCOMPARE(readFile(path(name)), before);
+            else
+                QVERIFY(title(name) == text && readFile(path(name)).endsWith(sound));
+            QCOMPARE(QDir(mFolder->path()).entryList({u".songcase*"_s}, QDir::Files | QDir::Hidden),
+                     QStringList());
+            QCOMPARE(QDir(path(u"Changes"_s)).entryList({u"copy*"_s}), QStringList());
+            if (!isOld) {
+                QCOMPARE(undoLast().files, 1);
+                QCOMPARE(readFile(path(u"a"_s)), before);
+            }
+        }
+        QVERIFY2(calls > 5, qPrintable(QString::number(calls)));
+    }
+
+private:
+    // In a process of its own, which ends at that call; false: it came through.
+    bool killedIn(const std::function<void()> &change, int call)
+    {
+        const pid_t child = fork();
+        if (child == 0) {
+            const diskfaults::Fault fault(mFolder->path(), diskfaults::Kind::Killed, call);
+            try {
+                change();
+            } catch (const Error &) {
+            }
+            _exit(0);
+        }
+        int status = 0;
+        waitpid(child, &status, 0);
+        return WEXITSTATUS(status) == diskfaults::killed;
+    }
+};
+
+QTEST_APPLESS_MAIN(tst_FileJournal)
+#include "tst_FileJournal.moc"
