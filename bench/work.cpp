@@ -28,6 +28,7 @@ constexpr Command commands[] = {
     {"export", "CATALOGUE FILE", exportAll},
     {"lookup", "TOC cddb+ADDRESS|musicbrainz+ADDRESS", lookUpDisc},
     {"importdisc", "CATALOGUE FILE", importDisc},
+    {"savetag", "FILE FIELD VALUE", saveTag},
     {"addcollection", "CATALOGUE FOLDER TITLE", addCollection},
 };
 

@@ -15,3 +15,4 @@ void exportAll(const QStringList &arguments);     // CATALOGUE FILE
 void lookUpDisc(const QStringList &arguments);    // TOC SERVICE+ADDRESS
 void importDisc(const QStringList &arguments);    // CATALOGUE FILE
 void addCollection(const QStringList &arguments); // CATALOGUE FOLDER TITLE
+void saveTag(const QStringList &arguments);       // FILE FIELD VALUE; a folder: all files in it

@@ -2,6 +2,7 @@
 
 #include "catalogue/cataloguefile.h"
 #include "catalogue/connect.h"
+#include "discdata/changedfiles.h"
 #include "platform/ado/connection.h"
 #include "platform/ado/value.h"
 #include "platform/desktop/paintwait.h"
@@ -11,6 +12,7 @@
 #include "services/frame.h"
 #include "services/globals.h"
 #include "services/messages.h"
+#include "tags/filejournal.h"
 
 #include <QCoreApplication>
 #include <QDir>
@@ -122,6 +124,15 @@ void showWait()
     paintAlone();
 }
 
+// What a crash has left in files of the user. What cannot be reached now is mended when it can.
+void mendChangedFiles()
+{
+    try {
+        changedFiles().mend();
+    } catch (const Error &) { // told when files are changed
+    }
+}
+
 } // namespace
 
 Found readSettings(const QString &programFolder)
@@ -169,6 +180,7 @@ void openCatalogue(const QString &file, bool lastRunBroken)
             gConnection->Close();
         throw;
     }
+    mendChangedFiles();
 }
 
 } // namespace startup

@@ -44,8 +44,7 @@ FileChanges::FileChanges(FileJournal &journal, About about)
 
 FileChanges::~FileChanges()
 {
-    for (const auto &[path, prepared] : mAnnounced)
-        mJournal.drop(prepared.head.change.id);
+    forgetAnnounced();
 }
 
 // A command that changes nothing leaves no batch.
@@ -87,31 +86,48 @@ void FileChanges::tell(HeadChange &head)
 
 void FileChanges::announce(const Tags &tags)
 {
-    try {
-        begin();
-        qint64 bytes = 0;
-        for (const auto &[path, tag] : tags) {
-            if (mAnnounced.size() >= announcedAtOnce || bytes > bytesAtOnce)
-                break;
-            const QString real = realPath(path);
-            try {
-                auto head = planned(tag, real);
-                // A copy of a whole file is not made before its turn.
-                if (!head || head->change.way == FileChange::Way::Through ||
-                    mAnnounced.contains(real))
-                    continue;
-                tell(*head);
-                bytes += head->oldBytes.size() + head->newBytes.size();
-                mAnnounced.insert_or_assign(real, Prepared{*head, tag});
-            } catch (const Error &) { // told at its turn
-            }
+    mToCome = tags;
+    mNext = 0;
+    announceSome();
+}
+
+void FileChanges::announceOne(const CddbID3Tag &tag, const QString &path)
+{
+    const QString real = realPath(path);
+    auto head = planned(tag, real);
+    // A copy of a whole file is not made before its turn.
+    if (!head || head->change.way == FileChange::Way::Through || mAnnounced.contains(real))
+        return;
+    begin();
+    tell(*head);
+    mAnnounced.insert_or_assign(real, Prepared{*head, tag});
+}
+
+void FileChanges::announceSome()
+{
+    qint64 bytes = 0;
+    const size_t end = std::min(mToCome.size(), mNext + announcedAtOnce);
+    for (; mNext < end && bytes < bytesAtOnce; ++mNext) {
+        const auto &[path, tag] = mToCome[mNext];
+        try {
+            announceOne(tag, path);
+        } catch (const Error &) { // told at its turn
         }
+        if (const auto found = mAnnounced.find(realPath(path)); found != mAnnounced.end())
+            bytes += found->second.head.kept().size();
+    }
+    try {
         mJournal.sync();
     } catch (const Error &) { // each save for itself tells what is wrong
-        for (const auto &[path, prepared] : mAnnounced)
-            mJournal.drop(prepared.head.change.id);
-        mAnnounced.clear();
+        forgetAnnounced();
     }
+}
+
+void FileChanges::forgetAnnounced()
+{
+    for (const auto &[path, prepared] : mAnnounced)
+        mJournal.drop(prepared.head.change.id);
+    mAnnounced.clear();
 }
 
 std::optional<HeadChange> FileChanges::takeAnnounced(const CddbID3Tag &tag, const QString &path)
@@ -125,6 +141,13 @@ std::optional<HeadChange> FileChanges::takeAnnounced(const CddbID3Tag &tag, cons
         return prepared.head;
     mJournal.drop(prepared.head.change.id);
     return {};
+}
+
+std::optional<HeadChange> FileChanges::findAnnounced(const CddbID3Tag &tag, const QString &path)
+{
+    if (!mAnnounced.contains(path) && mNext < mToCome.size())
+        announceSome();
+    return takeAnnounced(tag, path);
 }
 
 void FileChanges::performOrMend(const HeadChange &head)
@@ -164,7 +187,7 @@ void FileChanges::saveTag(const CddbID3Tag &tag, const QString &path)
     const QString real = realPath(path);
     try {
         const FileLock lock = lockOf(real);
-        auto head = takeAnnounced(tag, real);
+        auto head = findAnnounced(tag, real);
         if (!head) {
             head = planned(tag, real);
             if (!head)

@@ -20,8 +20,9 @@ public:
     FileChanges(const FileChanges &) = delete;
     FileChanges &operator=(const FileChanges &) = delete;
 
-    /// Before many saves: what stands in the files now goes into the journal with one sync, not one
-    /// each. A save that this does not cover (another tag, the file written since) does it itself.
+    /// Before many saves, in their order: what stands in the files now goes into the journal with
+    /// one sync for a hundred, not one each. A save that this does not cover (another tag, the file
+    /// written since) does it itself.
     using Tags = std::vector<std::pair<QString, CddbID3Tag>>; // path, tag
     void announce(const Tags &tags);
 
@@ -47,10 +48,16 @@ private:
     void tell(HeadChange &head);
     void perform(const HeadChange &head);
     void performOrMend(const HeadChange &head);
+    void announceSome();
+    void forgetAnnounced();
+    void announceOne(const CddbID3Tag &tag, const QString &path);
     std::optional<HeadChange> takeAnnounced(const CddbID3Tag &tag, const QString &path);
+    std::optional<HeadChange> findAnnounced(const CddbID3Tag &tag, const QString &path);
 
     FileJournal &mJournal;
     const About mAbout;
     bool mBegun = false;
     std::map<QString, Prepared> mAnnounced; // by path without links
+    Tags mToCome;                           // those from mNext on are not announced yet
+    size_t mNext = 0;
 };

@@ -177,17 +177,19 @@ private slots:
     {
         make(u"a"_s);
         writeFile(path(u"b"_s), "other");
+        QVERIFY(QDir(mFolder->path()).mkdir(u"data"_s));
         qputenv("XDG_DATA_HOME", path(u"data"_s).toUtf8());
         FileChanges(*mJournal, {}).move(path(u"a"_s), path(u"b"_s));
         QCOMPARE(readFile(path(u"b"_s)), before);
         QVERIFY(!QFile::exists(path(u"a"_s)));
+        QCOMPARE(readFile(path(u"data/Trash/files/b"_s)), "other");
         // A second name of the same file is no other file.
         QCOMPARE(::link(path(u"b"_s).toUtf8().constData(), path(u"c"_s).toUtf8().constData()), 0);
         FileChanges(*mJournal, {}).move(path(u"b"_s), path(u"c"_s));
         QCOMPARE(readFile(path(u"c"_s)), before);
         const QString tooLong = path(QString(300, u'x'));
         QCOMPARE(numberOf([&] { FileChanges(*mJournal, {}).move(path(u"c"_s), tooLong); }),
-                 int(errFileNotMoved));
+                 int(errNameRefused));
         QCOMPARE(readFile(path(u"c"_s)), before);
     }
 
