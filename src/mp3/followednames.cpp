@@ -54,7 +54,7 @@ RenamedFiles renamedBy(const std::vector<std::pair<QString, QString>> &moves)
     return renamed;
 }
 
-// An older catalogue may have stored "\\" as the separator.
+// An older catalogue may have stored "\" as the separator.
 QString followedName(const RenamedFiles &renamed, const QString &folder, const QString &fileName)
 {
     const QString base = baseOf(folder);
