@@ -88,16 +88,15 @@ FileJournal::Undone ChangeUndo::run(ChangeBatch about,
     FileChanges changes(mJournal, {about.when, about.what, about.where, mBatch});
     for (size_t i = 0; i < all.size() && step(int(i), int(all.size())); ++i) {
         const FileChange &change = all[i]->change;
-        const QString now = nowAt(change.other, change.id);
+        const QString before = now(change.other, *all[i]).name;
         try {
             takeBack(changes, *all[i]);
-            mTakenBack.insert(all[i]->change.id);
+            mTakenBack.insert(change.id);
             ++undone.files;
             if (change.way == FileChange::Way::Move)
-                undone.moved.emplace_back(now, change.path);
+                undone.moved.emplace_back(before, change.path);
         } catch (const Error &error) {
-            undone.left.append(now(all[i]->change.path, *all[i]).name + u": "_s +
-                               error.Description);
+            undone.left.append(now(change.path, *all[i]).name + u": "_s + error.Description);
         }
     }
     return undone;
