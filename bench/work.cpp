@@ -30,6 +30,7 @@ constexpr Command commands[] = {
     {"importdisc", "CATALOGUE FILE", importDisc},
     {"savetag", "FILE FIELD VALUE", saveTag},
     {"addcollection", "CATALOGUE FOLDER TITLE", addCollection},
+    {"convert", "CATALOGUE OLDFILE", convertOld},
 };
 
 int usage()
@@ -49,10 +50,12 @@ const Command *find(const QStringList &words)
     return nullptr;
 }
 
-// A look-up is the long work of a screen, which must be there, if out of sight.
+// A look-up is the long work of a screen, and so is a conversion; it must be there, if out of
+// sight.
 std::unique_ptr<QCoreApplication> makeApplication(int &argc, char **argv)
 {
-    if (argc < 2 || qstrcmp(argv[1], "lookup") != 0)
+    const QByteArray command = argc < 2 ? "" : argv[1];
+    if (command != "lookup" && command != "convert")
         return std::make_unique<QCoreApplication>(argc, argv);
     qputenv("QT_QPA_PLATFORM", "offscreen");
     return std::make_unique<QApplication>(argc, argv);

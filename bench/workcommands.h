@@ -16,3 +16,4 @@ void lookUpDisc(const QStringList &arguments);    // TOC SERVICE+ADDRESS
 void importDisc(const QStringList &arguments);    // CATALOGUE FILE
 void addCollection(const QStringList &arguments); // CATALOGUE FOLDER TITLE
 void saveTag(const QStringList &arguments);       // FILE FIELD VALUE; a folder: all files in it
+void convertOld(const QStringList &arguments);    // CATALOGUE OLDFILE

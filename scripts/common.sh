@@ -2,7 +2,7 @@
 
 jobs=$(nproc 2>/dev/null || echo 2)
 
-build_packages="g++ cmake ninja-build ccache pkg-config qt6-base-dev qt6-base-private-dev qt6-base-dev-tools qt6-l10n-tools qt6-svg-dev libsqlite3-dev libicu-dev libtag1-dev libcdio-dev libbenchmark-dev"
+build_packages="g++ cmake ninja-build ccache pkg-config qt6-base-dev qt6-base-private-dev qt6-base-dev-tools qt6-l10n-tools qt6-svg-dev libsqlite3-dev libicu-dev libtag1-dev libcdio-dev mdbtools-dev libbenchmark-dev"
 run_packages="libqt6svg6 qt6-wayland qt6-qpa-plugins qt6-translations-l10n fonts-dejavu-core xdg-utils ca-certificates"
 headless_packages="xvfb xdotool imagemagick"
 assistive_packages="at-spi2-core dbus-daemon gir1.2-atspi-2.0 python3-gi xvfb xdotool sqlite3"

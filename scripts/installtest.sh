@@ -131,6 +131,7 @@ say "packages fetched"
 install "/tmp/$(basename "$deb")" xdg-utils
 dpkg-deb --fsys-tarfile "$deb" | tar -C "$root" -d || fail "the files of the package are not those in the root"
 expect "the reader of discs does not run" in_root /usr/libexec/songcase/songcase-disc drives
+expect "the reader of old catalogues does not run" in_root sh -c '/usr/libexec/songcase/songcase-jet /etc/passwd Tracks; [ $? = 5 ]'
 say "installed"
 
 start_display

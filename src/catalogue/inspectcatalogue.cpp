@@ -1,4 +1,5 @@
 #include "catalogue/cataloguefile.h"
+#include "platform/desktop/programfolder.h"
 #include "platform/error/error.h"
 #include "services/messages.h"
 
@@ -16,6 +17,7 @@ namespace
 
 constexpr qsizetype headerSize = 100;
 constexpr qsizetype versionOffset = 60, applicationOffset = 68;
+constexpr qsizetype olderNameOffset = 4; // in a database of the older program
 
 [[noreturn]] void refuse(ErrorNumber number, const char *key, const QString &name = {})
 {
@@ -65,6 +67,16 @@ void inspectCompanions(const QString &name)
     }
 }
 
+// A person may have copied the one of the old computer over that of this program.
+[[noreturn]] void refuseOlder(const QFileInfo &file)
+{
+    const QString folder = file.absolutePath();
+    const bool users = folder == programfolder::userFolder();
+    const QString way = GetMessage(users ? "xOlderInUserFolder" : "xOlderElsewhere");
+    refuse(errCannotUse, "xOlderCatalogue",
+           way + QDir::toNativeSeparators(users ? folder : file.absoluteFilePath()));
+}
+
 } // namespace
 
 void inspect(const QString &name)
@@ -73,6 +85,8 @@ void inspect(const QString &name)
     if (info.exists() && !info.isFile()) // to open a pipe is to wait for its other end
         refuse(errCannotUse, "xNotACatalogue");
     const QByteArray header = headerOf(name);
+    if (header.mid(olderNameOffset).startsWith("Standard Jet DB"))
+        refuseOlder(info);
     const bool database = header.size() == headerSize && header.startsWith("SQLite format 3");
     if (!database ||
         qFromBigEndian<qint32>(header.constData() + applicationOffset) != applicationId)

@@ -14,6 +14,7 @@
 #include "services/messages.h"
 #include "shell/accesskeys.h"
 #include "shell/cataloguewatch.h"
+#include "shell/conversionentry.h"
 #include "shell/discentries.h"
 #include "shell/freeplace.h"
 #include "shell/frmHelp.h"
@@ -75,7 +76,7 @@ bool MainScreen::Load()
             return false;
         }
     } catch (const Error &error) {
-        showConnectErrors(error);
+        startup::showErrors(error);
     }
     mTimer1->start();
     return true;
@@ -184,22 +185,11 @@ void MainScreen::connectActions()
     on(mUi->Over, &MainScreen::Over_Click);
     on(mUi->tbCredits, &MainScreen::Over_Click);
     connectMP3Entries(*this);
+    connectConversionEntry(*this);
     connectDiscEntries(*this); // the credits of the services come behind the program's own
     connectUndoEntry(*this);
     on(mUi->mnuEngels, [this] { ChangeLanguage(languageEnglish); });
     on(mUi->mnuNederlands, [this] { ChangeLanguage(languageDutch); });
-}
-
-void MainScreen::showConnectErrors(const Error &error)
-{
-    const auto show = [](const Error &e) {
-        errorBox(u"ADO Connect Error: "_s + QString::number(e.Number) + u' ' + e.Description,
-                 GetMessage("MsgSysErr"));
-    };
-    show(error);
-    const auto entries = gConnection->Errors;
-    for (const Error &entry : entries)
-        show(entry);
 }
 
 // Nothing here hangs on a window manager, which may never activate the frame.
@@ -215,6 +205,7 @@ void MainScreen::Timer1_Timer()
     mStarted = true;
     show();
     placeOnScreen(this, pos(), QMainWindow::size()); // with what is now drawn around it
+    offerConversion(mStart.conversionPending);
     openBrowser();
     if (mStart.session == 1)
         ShowHelpLinks();

@@ -10,7 +10,6 @@
 
 class QMdiSubWindow;
 class QTimer;
-class Error;
 
 namespace Ui
 {
@@ -60,7 +59,6 @@ private:
     void setCaptions();
     void nameKeys();
     void markLanguage();
-    void showConnectErrors(const Error &error);
     void Timer1_Timer();
     void openBrowser();
     void ChangeLanguage(int language);

@@ -183,4 +183,16 @@ void openCatalogue(const QString &file, bool lastRunBroken)
     mendChangedFiles();
 }
 
+void showErrors(const Error &error)
+{
+    const auto show = [](const Error &e) {
+        errorBox(u"ADO Connect Error: "_s + QString::number(e.Number) + u' ' + e.Description,
+                 GetMessage("MsgSysErr"));
+    };
+    show(error);
+    const auto entries = gConnection->Errors;
+    for (const Error &entry : entries)
+        show(entry);
+}
+
 } // namespace startup

@@ -2,6 +2,8 @@
 
 #include <QString>
 
+class Error;
+
 /// The settings side of the start: session number, language, generation of the catalogue, proxy.
 namespace startup
 {
@@ -27,5 +29,8 @@ QString ReadProxySettings();
 /// Opens the catalogue as gConnection. Throws Error, which then stands in its Errors too,
 /// and gConnection is there but closed.
 void openCatalogue(const QString &file, bool lastRunBroken);
+
+/// Shows why the catalogue could not be opened, and what the connection says.
+void showErrors(const Error &error);
 
 } // namespace startup

@@ -4,6 +4,7 @@
 #include "collection/frmCDRoot.h"
 #include "collection/frmCDRootE.h"
 #include "collection/frmSearchArtistsTitles.h"
+#include "conversion/frmAutoUpdateUtility.h"
 #include "discdata/Candidates.h"
 #include "discdata/Credits.h"
 #include "discdata/DiscEditor.h"
@@ -280,6 +281,7 @@ class tst_Screens : public QObject
                 {"AlbumReport", makeReport<AlbumReport>()},
                 {"PlatenbakReport", makeReport<PlatenbakReport>()},
                 {"frmPageSetup", makePageSetup},
+                {"frmAutoUpdateUtility", make<frmAutoUpdateUtility>()},
                 {"frmDiscInfoCDDB", make<frmDiscInfoCDDB>()},
                 {"DiscEditor", makeDiscEditor},
                 {"Candidates", makeCandidates},

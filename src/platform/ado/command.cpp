@@ -62,7 +62,7 @@ std::shared_ptr<PreparedStatement> Command::prepared()
     return prepared;
 }
 
-void Command::bind(sqlite3_stmt *statement, std::initializer_list<Parameter> values)
+void Command::bind(sqlite3_stmt *statement, std::span<const Parameter> values)
 {
     int place = 0;
     for (const Parameter &value : values)
@@ -70,6 +70,11 @@ void Command::bind(sqlite3_stmt *statement, std::initializer_list<Parameter> val
 }
 
 Recordset Command::Execute(std::initializer_list<Parameter> values)
+{
+    return Execute(std::span(values.begin(), values.size()));
+}
+
+Recordset Command::Execute(std::span<const Parameter> values)
 {
     mConnection.requireOpen();
     const auto statement = prepared();
@@ -86,7 +91,7 @@ Command::Match Command::find(std::initializer_list<Parameter> values)
     mConnection.requireOpen();
     const auto statement = prepared();
     const Running running(*statement);
-    bind(running.statement(), values);
+    bind(running.statement(), {values.begin(), values.size()});
     mConnection.settleBefore(statement->readOnly);
     Match match;
     int code = statement->firstStep();

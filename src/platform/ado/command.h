@@ -4,6 +4,7 @@
 #include "platform/ado/value.h"
 
 #include <initializer_list>
+#include <span>
 #include <string_view>
 
 struct sqlite3_stmt;
@@ -45,6 +46,7 @@ public:
 
     /// Runs it and gives its rows, of a change a closed recordset.
     Recordset Execute(std::initializer_list<Parameter> values = {});
+    Recordset Execute(std::span<const Parameter> values);
 
     /// What a search for an id has found: the first column of the first row, and how many rows
     /// there are, 2 for all that are more than one.
@@ -56,7 +58,7 @@ public:
 
 private:
     std::shared_ptr<PreparedStatement> prepared();
-    void bind(sqlite3_stmt *statement, std::initializer_list<Parameter> values);
+    void bind(sqlite3_stmt *statement, std::span<const Parameter> values);
 
     Connection &mConnection;
     std::string_view mStatement;
