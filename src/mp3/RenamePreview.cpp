@@ -13,27 +13,30 @@ namespace
 {
 
 const std::vector<ListColumn> columns = {{ListColumn::Number, "Volgnummer"},
-                                         {ListColumn::Text, "xOldName", 4},
-                                         {ListColumn::Text, "xNewName", 4},
-                                         {ListColumn::Text, "xRemark", 5}};
+                                         {ListColumn::Text, "xOldName", 5},
+                                         {ListColumn::Text, "xNewName", 8},
+                                         {ListColumn::Text, "xRemark", 6}};
+
+bool hasItAlready(const PreviewedName &name)
+{
+    return name.newName.oldPath == name.newName.newPath;
+}
 
 QString remarkOn(const PreviewedName &name)
 {
     switch (name.newName.obstacle) {
     case NameObstacle::TagMissing:
-        return GetMessage("xNoArtistOrTitle");
+        return GetMessage("xRemarkNoTag");
     case NameObstacle::ForbiddenSymbols:
-        return GetMessage("UnableToRenameForbiddenSymbols");
+        return GetMessage("xRemarkSymbols");
     case NameObstacle::LetterRefused:
-        return GetMessage("xNameLetterRefused");
+        return GetMessage("xRemarkLetter");
     case NameObstacle::TooLong:
-        return GetMessage("xNameTooLong");
+        return GetMessage("xRemarkTooLong");
     case NameObstacle::OfAnotherRow:
-        return GetMessage("xNameOfRowPart1") + QString::number(name.newName.otherRow) +
-               GetMessage("xNameOfRowPart2");
+        return GetMessage("xRemarkRow") + QString::number(name.newName.otherRow);
     case NameObstacle::IsThere:
-        return GetMessage(name.newName.oldPath == name.newName.newPath ? "xHasNameAlready"
-                                                                       : "xFileWouldBeReplaced");
+        return GetMessage(hasItAlready(name) ? "xRemarkSame" : "xRemarkIsThere");
     case NameObstacle::None:
     case NameObstacle::MovedAlready:
         break;
@@ -44,7 +47,7 @@ QString remarkOn(const PreviewedName &name)
 // A file that has its name already is no conflict.
 bool isConflict(const PreviewedName &name)
 {
-    return name.newName.oldPath != name.newName.newPath && !remarkOn(name).isEmpty();
+    return !hasItAlready(name) && !remarkOn(name).isEmpty();
 }
 
 } // namespace

@@ -22,14 +22,23 @@ namespace
 {
 
 const std::vector<ListColumn> columns = {
-    {ListColumn::Hidden},           {ListColumn::Text, "xWhen", 5},
-    {ListColumn::Text, "xWhat", 6}, {ListColumn::Text, "xFolder", 7},
-    {ListColumn::Number, "xFiles"}, {ListColumn::Text, "xRemark", 5}};
+    {ListColumn::Hidden},           {ListColumn::Text, "xWhen", 4},
+    {ListColumn::Text, "xWhat", 5}, {ListColumn::Text, "xFolder", 9},
+    {ListColumn::Number, "xFiles"}, {ListColumn::Text, "xRemark", 4}};
 
 QString shown(const QDateTime &when)
 {
     const QLocale locale(gLanguage == languageDutch ? QLocale::Dutch : QLocale::English);
     return locale.toString(when, u"d MMM yyyy, HH:mm"_s);
+}
+
+// What takes an undo back does it again.
+QString undoOf(const QString &what)
+{
+    const QString undo = GetMessage("xUndoOf"), redo = GetMessage("xRedoOf");
+    if (what.startsWith(undo))
+        return redo + what.sliced(undo.size());
+    return undo + (what.startsWith(redo) ? what.sliced(redo.size()) : what);
 }
 
 int filesOf(const std::vector<FileJournal::Batch> &batches)
@@ -171,7 +180,7 @@ FileJournal::Undone UndoChanges::undoAll(const Batches &batches, LongWork &work)
             break;
         try {
             const auto one = changedFiles().undo(
-                batch.number, Desktop::current().now(), GetMessage("xUndoOf") + batch.what,
+                batch.number, Desktop::current().now(), undoOf(batch.what),
                 [&](int done, int /*all*/) { return work.step(before + done, files); });
             all.files += one.files;
             all.left += one.left;

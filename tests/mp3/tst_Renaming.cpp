@@ -164,18 +164,14 @@ private slots:
             auto items = screen.findChild<DBListViewCTL *>()->ListItems();
             for (int i = 1; i <= items.Count(); ++i)
                 lines.append((items.Item(i).Bold() ? u"! "_s : QString()) +
-                             items.Item(i).SubItems(2) + u": "_s +
-                             items.Item(i).SubItems(3).section(u'.', 0, 0));
+                             items.Item(i).SubItems(2) + u": "_s + items.Item(i).SubItems(3));
             screen.findChild<QPushButton *>(u"cmdClose"_s)->click();
         });
         previewRenaming(*mScreen, folder(), rows, rows);
-        QCOMPARE(lines, texts("01-A-B.mp3: ",
-                              "! 01-A-B.mp3: This is the name of the file in row 1 "
-                              "of the list",
-                              "! : The tag names no artist or no title",
-                              "02-C-D.mp3: The file has this name already",
-                              "! 03-E-F.mp3: This is the name of the file in row 6 of the list",
-                              "04-G-H.mp3: "));
+        QCOMPARE(lines,
+                 texts("01-A-B.mp3: ", "! 01-A-B.mp3: Name of the file in row 1",
+                       "! : No artist or no title in the tag", "02-C-D.mp3: Has this name already",
+                       "! 03-E-F.mp3: Name of the file in row 6", "04-G-H.mp3: "));
         QCOMPARE(QDir(folder()).entryList(QDir::Files), before);
     }
 };

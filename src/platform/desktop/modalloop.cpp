@@ -7,12 +7,14 @@
 #include <QEventLoop>
 #include <QMessageBox>
 #include <QPushButton>
+#include <QScreen>
 
 void runModal(Form &form)
 {
     const auto frameless = form.windowFlags() & Qt::FramelessWindowHint;
     form.setWindowFlags(Qt::Dialog | frameless);
     form.setWindowModality(Qt::ApplicationModal);
+    form.resize(form.size().boundedTo(form.screen()->availableSize())); // its buttons are below
     const QPointer<Form> alive = &form;
     QEventLoop loop;
     QObject::connect(&form, &Form::hid, &loop, &QEventLoop::quit);
