@@ -4,6 +4,8 @@
 #include "discdata/Credits.h"
 #include "discdata/DiscEditor.h"
 #include "discdata/SignUp.h"
+#include "discdata/cddbtagmanager.h"
+#include "discdata/filelookupid.h"
 #include "discdata/lookup.h"
 #include "discdata/mmcontrol.h"
 #include "discs/discid.h"
@@ -142,6 +144,7 @@ void CDDBControl::ShutDown()
 {
     mParent.clear();
     mMatch = {};
+    mFileMatches.reset();
 }
 
 QString CDDBControl::GetTocFromDevice(int deviceId) const
@@ -268,6 +271,42 @@ CddbGenreListPtr CDDBControl::GetGenreList(int) const
     return std::make_shared<CddbGenreList>(mGenres);
 }
 
+// What is found counts, whoever has answered; a track that is not told stays what it was.
+CddbDiscPtr CDDBControl::lookUpFile(const AskFile &ask, int &track)
+{
+    mFileMatches.reset();
+    const auto services = lookup();
+    FileLookup::Found found;
+    {
+        LongWork work(screen(), GetMessage("xLookingUp"));
+        FileLookup lookup(*services, work);
+        found = ask(lookup);
+    }
+    if (found.keptOn)
+        tellKept(*found.keptOn);
+    if (!found.candidates.empty())
+        mFileMatches =
+            std::make_shared<CddbMatchList>(CddbMatchList{std::move(found.candidates), {}});
+    if (!found.disc)
+        return nullptr;
+    track = found.track;
+    return discOf(*found.disc, {});
+}
+
+CddbDiscPtr CDDBControl::LookupByFileId(const QString &fileId, int, int &track)
+{
+    mFileMatches.reset();
+    const auto id = trackOfFileId(fileId);
+    if (!id)
+        return nullptr;
+    return lookUpFile([&](FileLookup &lookup) { return lookup.byId(*id); }, track);
+}
+
+std::unique_ptr<CddbTagManager> CDDBControl::GetTagManager()
+{
+    return std::make_unique<CddbTagManager>(*this);
+}
+
 void CDDBControl::ShowAboutBox()
 {
     (new Credits)->ShowModal();
@@ -290,7 +329,8 @@ void setUpCddb(CDDBControl &control, QWidget *owner, bool withLanguage)
     Desktop::current().pump();
     CddbOptions options = control.GetOptions();
     options.ProxyPassword = gProxyPassword;
-    options.ProxyServerPortNumber = int(ADODB::Value(gProxyServerPort).toLong());
+    options.ProxyServerPortNumber =
+        gProxyServerPort.isEmpty() ? 0 : int(ADODB::Value(gProxyServerPort).toLong());
     options.ProxyUserName = gProxyUserName;
     options.ProxyServer = gProxyServer;
     options.ExtraOption = 0;

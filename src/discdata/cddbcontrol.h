@@ -2,10 +2,12 @@
 
 #include "discdata/cddbobjects.h"
 #include "discdata/cddbuserprofile.h"
+#include "discdata/filelookup.h"
 #include "platform/error/error.h"
 
 #include <QPointer>
 
+class CddbTagManager;
 class Form;
 class Lookup;
 class LongWork;
@@ -65,10 +67,25 @@ public:
     /// Gives no meaning to its result; the disc is stored when it returns.
     int SubmitDisc(const CddbDiscPtr &disc, int flags);
     CddbGenreListPtr GetGenreList(int reserved) const;
+
+    /// The disc of the track that the file identifier of a tag tells, and its number; nothing where
+    /// it tells none, or the services know it no longer. Several that hold it are left for
+    /// GetFileMatches.
+    CddbDiscPtr LookupByFileId(const QString &fileId, int flags, int &track);
+
+    /// The candidates that the last look-up of a file has left; nothing if there are none.
+    CddbMatchListPtr GetFileMatches() const { return mFileMatches; }
+
+    /// Works with this control and must not outlive it.
+    std::unique_ptr<CddbTagManager> GetTagManager();
     void ShowAboutBox();
     int ShowRegistrationDialog(const CddbUserProfile &profile, int flags);
 
 private:
+    friend class CddbTagManager;
+    using AskFile = std::function<FileLookup::Found(FileLookup &lookup)>;
+    CddbDiscPtr lookUpFile(const AskFile &ask, int &track);
+
     Form &screen() const;
     std::unique_ptr<Lookup> lookup() const;
     void requireRegistered() const;
@@ -77,6 +94,7 @@ private:
     QPointer<QWidget> mParent;
     CddbOptions mOptions;
     CddbMatch mMatch;
+    CddbMatchListPtr mFileMatches;
     std::shared_ptr<GenreTable> mGenres;
 };
 

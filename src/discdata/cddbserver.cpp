@@ -129,6 +129,8 @@ CddbAnswer CddbServer::command(const QString &words, LongWork &work)
     CddbAnswer answer = understood(name(), [&] { return readCddbAnswer(got.body); });
     if (answer.isRefusal())
         throw Error(errServiceRefused, name(), answer.text);
+    if (answer.isMissing())
+        throw Error(errNothingFound, name(), answer.text);
     if (answer.code / 100 != 2)
         throw Error(errServiceFailed, name(), answer.text);
     if (!answer.isWhole)
@@ -170,6 +172,13 @@ DiscRecord CddbServer::complete(const DiscRecord &candidate, LongWork &work)
     return read(candidate, work);
 }
 
+// The query before it can only be made of what the id says.
+DiscRecord CddbServer::again(const DiscRecord &candidate, LongWork &work)
+{
+    query(cddbQueryOfId(candidate.keyB), work);
+    return read(candidate, work);
+}
+
 DiscRecord CddbServer::read(const DiscRecord &candidate, LongWork &work)
 {
     mHasQueried = false;
@@ -180,6 +189,8 @@ DiscRecord CddbServer::read(const DiscRecord &candidate, LongWork &work)
         throw Error(errServiceRefused, name(), refusalIn(disc));
     disc.service = name();
     disc.category = candidate.keyA;
+    disc.fromA = candidate.keyA;
+    disc.fromB = candidate.keyB;
     disc.keyA.clear();
     disc.keyB.clear();
     return disc;

@@ -18,6 +18,7 @@ public:
     std::vector<DiscRecord> find(const TableOfContents &toc, LongWork &work) override;
     std::vector<DiscRecord> search(const SearchWords &words, LongWork &work) override; // cannot
     DiscRecord complete(const DiscRecord &candidate, LongWork &work) override;
+    DiscRecord again(const DiscRecord &candidate, LongWork &work) override;
 
     /// `category` says where it is stored. A record that the server has already, for this very
     /// disc, goes as its next revision, any other as a new one.

@@ -1,16 +1,14 @@
 #include "discdata/filesofdisc.h"
 
+#include "discdata/rippedfiles.h"
 #include "discs/candidates.h"
 #include "discs/cuesheet.h"
 #include "discs/tocsheet.h"
-#include "tags/playingtime.h"
 
-#include <QCollator>
 #include <QDir>
 #include <QFile>
 #include <QFileInfo>
 #include <QRegularExpression>
-#include <QSet>
 
 using namespace Qt::StringLiterals;
 
@@ -19,7 +17,6 @@ namespace
 
 constexpr qint64 largestSheet = 1 << 20; // bytes; an image with the ending of a sheet is larger
 constexpr int longestName = 255;         // of a file, in what is shown
-constexpr int mostFiles = 999;           // of a folder; more than that is no disc
 
 FoundDisc nothing(const char *problem, const QString &about)
 {
@@ -125,33 +122,6 @@ std::optional<qint64> SheetFolder::measure(const QString &name, LengthIn unit)
     return sound ? std::optional<qint64>(framesOfSound(sound->length)) : std::nullopt;
 }
 
-struct RippedFile {
-    QString name;
-    SoundFile sound;
-};
-
-bool haveNumbers(const std::vector<RippedFile> &files)
-{
-    QSet<int> numbers;
-    for (const RippedFile &file : files)
-        numbers.insert(file.sound.track);
-    return !numbers.contains(0) && numbers.size() == qsizetype(files.size());
-}
-
-// "2 Second" stands before "10 Tenth".
-void sortAsTracks(std::vector<RippedFile> &files)
-{
-    QCollator order{QLocale(QLocale::English)}; // that of C knows no numbers
-    order.setNumericMode(true);
-    order.setCaseSensitivity(Qt::CaseInsensitive);
-    if (haveNumbers(files))
-        std::ranges::sort(files, {}, [](const RippedFile &file) { return file.sound.track; });
-    else
-        std::ranges::sort(files, [&](const RippedFile &a, const RippedFile &b) {
-            return order.compare(a.name, b.name) < 0;
-        });
-}
-
 TrackRecord trackOf(const RippedFile &file)
 {
     static const QRegularExpression number(u"^[0-9]{1,3}[ ._-]+"_s);
@@ -176,12 +146,9 @@ Value common(const std::vector<RippedFile> &files, Value SoundFile::*value)
 std::optional<DiscSheet> discOf(const std::vector<RippedFile> &files)
 {
     DiscSheet sheet;
-    std::vector<int> lengths;
-    for (const RippedFile &file : files) {
-        lengths.push_back(file.sound.length);
+    for (const RippedFile &file : files)
         sheet.known.tracks.push_back(trackOf(file));
-    }
-    const auto toc = tocOfLengths(lengths);
+    const auto toc = tocOf(files);
     if (!toc)
         return {};
     sheet.toc = *toc;
@@ -189,24 +156,6 @@ std::optional<DiscSheet> discOf(const std::vector<RippedFile> &files)
     sheet.known.genre = cleanText(common(files, &SoundFile::genre));
     sheet.known.year = yearOf(QString::number(common(files, &SoundFile::year)));
     return discsheet::complete(sheet) ? std::optional(sheet) : std::nullopt;
-}
-
-// One that cannot be read is told: without it the others would be another disc.
-std::vector<RippedFile> soundFilesIn(const QDir &folder, const std::stop_token &stop,
-                                     QString &unreadable)
-{
-    std::vector<RippedFile> files;
-    for (const QString &name : folder.entryList(QDir::Files, QDir::Name)) {
-        if (stop.stop_requested() || files.size() > mostFiles)
-            break;
-        if (!isSoundFile(name))
-            continue;
-        const auto sound = readSoundFile(folder.filePath(name));
-        if (!sound && unreadable.isEmpty())
-            unreadable = folder.filePath(name);
-        files.push_back({name, sound.value_or(SoundFile())});
-    }
-    return files;
 }
 
 // Empty if none lies beside the image.
@@ -257,12 +206,13 @@ FoundDisc readSoundFolder(const QString &name, const std::stop_token &stop)
             return disc;
     }
     QString unreadable;
-    std::vector<RippedFile> files = soundFilesIn(folder, stop, unreadable);
+    std::vector<RippedFile> files = soundFilesIn(folder, isSoundFile, stop, unreadable);
     if (!unreadable.isEmpty())
         return nothing("xDiscFileUnreadable", unreadable);
     if (files.empty())
         return nothing("xDiscNoSound", name);
-    sortAsTracks(files);
+    if (haveNumbers(files))
+        sortByNumbers(files);
     const auto sheet = discOf(files);
     return sheet ? found(*sheet) : nothing("xDiscTooLong", name);
 }

@@ -31,7 +31,10 @@ QString questionOf(const TableOfContents &toc)
 
 QString questionOf(const SearchWords &words)
 {
-    return QStringList{u"search"_s, words.artist, words.title, words.barcode}.join(u'\t');
+    QStringList parts{u"search"_s, words.artist, words.title, words.barcode};
+    if (!words.track.isEmpty())
+        parts.append(words.track);
+    return parts.join(u'\t');
 }
 
 QString questionOf(const DiscRecord &candidate)
@@ -123,6 +126,13 @@ void Lookup::requireNotRefused(const DiscService &service) const
         throw Error(errServiceRefused, service.name(), *words);
 }
 
+void Lookup::requireReached(const DiscService &service) const
+{
+    const auto failure = mNotReached.constFind(service.name());
+    if (failure != mNotReached.constEnd())
+        throw Error(*failure);
+}
+
 void Lookup::tell(const QString &words, Round &round) const
 {
     round.told = true;
@@ -146,6 +156,7 @@ std::vector<DiscRecord> Lookup::askOne(DiscService &service, const Ask &ask, Rou
 {
     try {
         requireNotRefused(service);
+        requireReached(service);
         auto records = ask(service);
         if (records.empty())
             round.withoutMatch.append(service.name());
@@ -155,6 +166,8 @@ std::vector<DiscRecord> Lookup::askOne(DiscService &service, const Ask &ask, Rou
             throw;
         if (error.Number == errServiceRefused)
             noteRefusal(service, error, round);
+        if (error.Number == errHostNotFound)
+            mNotReached.insert(service.name(), error);
         round.failures.emplace_back(service.name(), error);
         return {};
     }
@@ -235,17 +248,38 @@ Lookup::Found Lookup::find(const SearchWords &words, LongWork &work)
     return finished(askAll(questionOf(words), ask, false), work);
 }
 
+Lookup::Found Lookup::ofRecording(const QString &id, LongWork &work)
+{
+    const auto ask = [&](DiscService &service) { return service.recording(id, work); };
+    return finished(askAll(u"recording\t"_s + id, ask, false), work);
+}
+
 Lookup::Whole Lookup::complete(const DiscRecord &candidate, LongWork &work)
+{
+    return read(candidate, &DiscService::complete, work);
+}
+
+Lookup::Whole Lookup::again(const DiscRecord &candidate, LongWork &work)
+{
+    return read(candidate, &DiscService::again, work);
+}
+
+Lookup::Whole Lookup::read(const DiscRecord &candidate, Read read, LongWork &work)
 {
     if (candidate.isWhole())
         return {candidate, {}};
     DiscService &service = serviceNamed(candidate.service);
+    const QString question = keptAs(service.name(), questionOf(candidate));
     try {
-        return {completeAt(service, candidate, work), {}};
+        requireNotRefused(service);
+        DiscRecord disc = (service.*read)(candidate, work);
+        disc.soughtTrack = candidate.soughtTrack;
+        mKept.keep(question, {disc});
+        return {disc, {}};
     } catch (const Error &error) {
-        if (error.Number == errLookupCancelled)
+        if (error.Number == errLookupCancelled || error.Number == errNothingFound)
             throw;
-        if (auto kept = mKept.find(keptAs(service.name(), questionOf(candidate))))
+        if (auto kept = mKept.find(question))
             return {std::move(kept->records.front()), kept->date};
         Round round;
         if (error.Number == errServiceRefused)
@@ -254,14 +288,6 @@ Lookup::Whole Lookup::complete(const DiscRecord &candidate, LongWork &work)
             tell(error.Description, round);
         throw;
     }
-}
-
-DiscRecord Lookup::completeAt(DiscService &service, const DiscRecord &candidate, LongWork &work)
-{
-    requireNotRefused(service);
-    DiscRecord disc = service.complete(candidate, work);
-    mKept.keep(keptAs(service.name(), questionOf(candidate)), {disc});
-    return disc;
 }
 
 void Lookup::send(const DiscRecord &disc, const TableOfContents &toc, LongWork &work)

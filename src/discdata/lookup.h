@@ -46,8 +46,15 @@ public:
     Found find(const TableOfContents &toc, LongWork &work);
     Found find(const SearchWords &words, LongWork &work);
 
-    /// The whole record of a candidate, from the service it comes from.
+    /// The discs that hold a recording which other programs have put the id of into a file.
+    Found ofRecording(const QString &id, LongWork &work);
+
+    /// The whole record of a candidate, from the service it comes from. errNothingFound: it is not
+    /// there any more.
     Whole complete(const DiscRecord &candidate, LongWork &work);
+
+    /// The same long after it was found: of a record nothing but service and keys.
+    Whole again(const DiscRecord &candidate, LongWork &work);
 
     /// To the CDDB server, whatever the order; errNotAccepted as well. A refusal is not told here.
     void send(const DiscRecord &disc, const TableOfContents &toc, LongWork &work);
@@ -60,9 +67,11 @@ private:
     std::optional<Found> keptOf(const Round &round, const QString &question) const;
     void throwUnlessKnown(const Round &round, bool senderDecides) const;
     Found finished(Found found, LongWork &work);
-    DiscRecord completeAt(DiscService &service, const DiscRecord &candidate, LongWork &work);
+    using Read = DiscRecord (DiscService::*)(const DiscRecord &candidate, LongWork &work);
+    Whole read(const DiscRecord &candidate, Read read, LongWork &work);
 
     void requireNotRefused(const DiscService &service) const;
+    void requireReached(const DiscService &service) const;
     void noteRefusal(const DiscService &service, const Error &error, Round &round);
     void tell(const QString &words, Round &round) const;
     QString identityOf(const DiscService &service) const;
@@ -71,6 +80,7 @@ private:
     ServiceOptions mOptions;
     KeptAnswers mKept;
     std::shared_ptr<Refusals> mRefusals;
+    QHash<QString, Error> mNotReached; // by service: another question would wait as long
     std::vector<std::unique_ptr<DiscService>> mServices; // in the order of the user
     std::vector<std::unique_ptr<DiscService>> mOthers;   // not in it, and needed nevertheless
 };

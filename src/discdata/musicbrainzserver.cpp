@@ -131,10 +131,20 @@ std::vector<DiscRecord> MusicBrainzServer::search(const SearchWords &words, Long
     if (words.isEmpty() || query.isEmpty())
         return {};
     const QByteArray question = "query=" + QUrl::toPercentEncoding(query) + "&limit=25";
-    const QByteArray json = ask(u"release"_s, question, work);
+    const bool ofTrack = !words.track.isEmpty();
+    const QByteArray json = ask(ofTrack ? u"recording"_s : u"release"_s, question, work);
     if (json.isEmpty())
         return {};
-    return ofService(understood(name(), [&] { return musicBrainzSearch(json); }));
+    const auto read = ofTrack ? musicBrainzRecordings : musicBrainzSearch;
+    return ofService(understood(name(), [&] { return read(json); }));
+}
+
+std::vector<DiscRecord> MusicBrainzServer::recording(const QString &id, LongWork &work)
+{
+    const QByteArray json = ask(u"recording/"_s + id, "inc=artist-credits+releases+media", work);
+    if (json.isEmpty())
+        return {};
+    return ofService(understood(name(), [&] { return musicBrainzRecordings(json); }));
 }
 
 DiscRecord MusicBrainzServer::complete(const DiscRecord &candidate, LongWork &work)
@@ -142,6 +152,8 @@ DiscRecord MusicBrainzServer::complete(const DiscRecord &candidate, LongWork &wo
     if (candidate.isWhole())
         return candidate;
     const QByteArray json = ask(u"release/"_s + candidate.keyA, included, work);
+    if (json.isEmpty())
+        throw Error(errNothingFound, name(), errorText("xServiceNoRecord", {}));
     const int medium = candidate.keyB.toInt();
     DiscRecord disc = understood(name(), [&] { return musicBrainzRelease(json, medium); });
     disc.service = name();

@@ -16,6 +16,7 @@ public:
     /// asked for a table that the service takes for invalid.
     std::vector<DiscRecord> find(const TableOfContents &toc, LongWork &work) override;
     std::vector<DiscRecord> search(const SearchWords &words, LongWork &work) override;
+    std::vector<DiscRecord> recording(const QString &id, LongWork &work) override;
     DiscRecord complete(const DiscRecord &candidate, LongWork &work) override;
 
 private:

@@ -140,6 +140,11 @@ bool CddbAnswer::isRefusal() const
     return code >= 400 && code < 600 && code != noSuchEntry && !isTrouble();
 }
 
+bool CddbAnswer::isMissing() const
+{
+    return code == noSuchEntry;
+}
+
 bool CddbAnswer::isTrouble() const
 {
     return code == serverError || code == environmentError || code == tooManyUsers ||

@@ -15,6 +15,8 @@ struct CddbAnswer {
     /// so: no such entry (401), an entry that is damaged (403), and its own trouble.
     bool isRefusal() const;
 
+    bool isMissing() const; // no such entry
+
     /// An error of the server or too many users: it may be asked again later.
     bool isTrouble() const;
 };

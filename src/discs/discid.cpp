@@ -1,6 +1,7 @@
 #include "discs/discid.h"
 
 #include <QCryptographicHash>
+#include <QRegularExpression>
 
 using namespace Qt::StringLiterals;
 
@@ -50,6 +51,21 @@ QString cddbQuery(const TableOfContents &toc)
 {
     return cddbId(toc) + u' ' + QString::number(toc.tracks.size()) + offsetsOf(toc) + u' ' +
            QString::number(toc.seconds());
+}
+
+int tracksOfCddbId(const QString &id)
+{
+    static const QRegularExpression form(u"^[0-9A-Fa-f]{8}$"_s);
+    return form.match(id).hasMatch() ? id.right(2).toInt(nullptr, 16) : 0;
+}
+
+QString cddbQueryOfId(const QString &id)
+{
+    const int tracks = tracksOfCddbId(id), playing = id.mid(2, 4).toInt(nullptr, 16);
+    QString all = id + u' ' + QString::number(tracks);
+    for (int track = 0; track < tracks; ++track)
+        all += u' ' + QString::number(firstFrame + playing * framesPerSecond / tracks * track);
+    return all + u' ' + QString::number(playing + firstFrame / framesPerSecond);
 }
 
 TableOfContents withoutDataBehind(TableOfContents toc)

@@ -8,6 +8,13 @@ QString cddbId(const TableOfContents &toc);
 /// The arguments of a query there: id, number of tracks, offsets, seconds; blanks between.
 QString cddbQuery(const TableOfContents &toc);
 
+/// The arguments of a query of which only such an id is known: its tracks and its seconds, the
+/// tracks of one length.
+QString cddbQueryOfId(const QString &id);
+
+/// How many tracks the disc of such an id has; 0 where it is no such id.
+int tracksOfCddbId(const QString &id);
+
 /// The id of a disc at MusicBrainz: 28 characters. Data tracks at the end do not count.
 QString musicBrainzId(const TableOfContents &toc);
 

@@ -45,6 +45,13 @@ struct DiscRecord {
     QString keyA; // category, or release
     QString keyB; // disc id, or number of the medium
 
+    // The same two of a record that is whole, by which it can be had again; empty where there is
+    // no way back to it.
+    QString fromA, fromB;
+
+    // The track that was asked for by its words or its id, from 1; 0 where the whole disc was.
+    int soughtTrack = 0;
+
     // Of a record of a CDDB server, for sending it back.
     QString category;
     QStringList discIds;
@@ -54,9 +61,14 @@ struct DiscRecord {
     bool operator==(const DiscRecord &) const = default;
 };
 
-/// Words that a search goes by; those that are empty do not count.
+/// Words that a search goes by; those that are empty do not count. With the title of a track it is
+/// that track which is searched, on any disc.
 struct SearchWords {
     QString artist, title, barcode;
-    bool isEmpty() const { return artist.isEmpty() && title.isEmpty() && barcode.isEmpty(); }
+    QString track = {};
+    bool isEmpty() const
+    {
+        return artist.isEmpty() && title.isEmpty() && barcode.isEmpty() && track.isEmpty();
+    }
     bool operator==(const SearchWords &) const = default;
 };

@@ -151,6 +151,20 @@ std::vector<DiscRecord> nearest(const QJsonArray &releases, const std::vector<in
     return records;
 }
 
+// One track alone is listed, that of the recording. The credit is left out where it is the same.
+void addMediaWith(std::vector<DiscRecord> &records, QJsonObject release,
+                  const QJsonObject &recording)
+{
+    if (!release.contains("artist-credit"_L1))
+        release["artist-credit"_L1] = recording.value("artist-credit"_L1);
+    for (Medium medium : mediaOf(release)) {
+        const int offset = medium.medium.value("track-offset"_L1).toInt(-1);
+        medium.medium.remove("tracks"_L1);
+        records.push_back(recordOf(medium));
+        records.back().soughtTrack = offset + 1;
+    }
+}
+
 // A disc that somebody has typed in and nobody has looked at: texts alone.
 DiscRecord recordOfStub(const QJsonObject &stub)
 {
@@ -220,6 +234,19 @@ std::vector<DiscRecord> musicBrainzSearch(const QByteArray &json)
     return records;
 }
 
+std::vector<DiscRecord> musicBrainzRecordings(const QByteArray &json)
+{
+    const QJsonObject answer = objectIn(json);
+    const bool isOne = !answer.contains("recordings"_L1);
+    const QJsonArray recordings = isOne ? QJsonArray{answer} : listIn(answer, u"recordings"_s);
+    std::vector<DiscRecord> records;
+    for (const auto &recording : recordings) {
+        for (const auto &release : listIn(recording.toObject(), u"releases"_s))
+            addMediaWith(records, release.toObject(), recording.toObject());
+    }
+    return records;
+}
+
 QString musicBrainzError(const QByteArray &json)
 {
     return textIn(QJsonDocument::fromJson(json).object(), u"error"_s);
@@ -232,8 +259,8 @@ QString musicBrainzQuery(const SearchWords &words)
         inside.replace(u'\\', "\\\\"_L1).replace(u'"', "\\\""_L1);
         return inside.isEmpty() ? QString() : field + u":\""_s + inside + u'"';
     };
-    QStringList parts{phrase(u"barcode"_s, words.barcode), phrase(u"artist"_s, words.artist),
-                      phrase(u"release"_s, words.title)};
+    QStringList parts{phrase(u"barcode"_s, words.barcode), phrase(u"recording"_s, words.track),
+                      phrase(u"artist"_s, words.artist), phrase(u"release"_s, words.title)};
     parts.removeAll(QString());
     return parts.join(" AND "_L1);
 }

@@ -28,8 +28,13 @@ DiscRecord musicBrainzRelease(const QByteArray &json, int medium);
 /// media gives a candidate for each.
 std::vector<DiscRecord> musicBrainzSearch(const QByteArray &json);
 
+/// The discs that hold a recording, which is asked for by words or by its id: candidates with both
+/// keys and the track that was sought.
+std::vector<DiscRecord> musicBrainzRecordings(const QByteArray &json);
+
 /// The text of an "error" answer; empty if there is none.
 QString musicBrainzError(const QByteArray &json);
 
-/// The search text for these words, its special signs escaped; not yet encoded for an address.
+/// The search text for these words, of releases or, with a track among them, of recordings: its
+/// special signs escaped; not yet encoded for an address.
 QString musicBrainzQuery(const SearchWords &words);

@@ -164,9 +164,9 @@ DiscRecord recordOfMedium(const QJsonObject &release, const QJsonObject &medium,
     takeTracks(disc, medium.value("tracks"_L1).toArray());
     disc.trackCount =
         disc.tracks.empty() ? medium.value("track-count"_L1).toInt() : int(disc.tracks.size());
-    if (disc.tracks.empty()) {
-        disc.keyA = textIn(release, u"id"_s);
-        disc.keyB = disc.numberInSet;
-    }
+    QString &keyA = disc.tracks.empty() ? disc.keyA : disc.fromA;
+    QString &keyB = disc.tracks.empty() ? disc.keyB : disc.fromB;
+    keyA = textIn(release, u"id"_s);
+    keyB = disc.numberInSet;
     return disc;
 }

@@ -47,6 +47,9 @@ template <typename Disc, typename Each> void discFields(Disc &disc, Each each)
     each(u"service"_s, disc.service);
     each(u"keyA"_s, disc.keyA);
     each(u"keyB"_s, disc.keyB);
+    each(u"fromA"_s, disc.fromA);
+    each(u"fromB"_s, disc.fromB);
+    each(u"soughtTrack"_s, disc.soughtTrack);
     each(u"category"_s, disc.category);
     each(u"discIds"_s, disc.discIds);
     each(u"revision"_s, disc.revision);

@@ -184,7 +184,7 @@ private slots:
         server.answer("release/gone?", {.body = "{}", .status = 404});
         DiscRecord gone = found[0];
         gone.keyA = u"gone"_s;
-        QCOMPARE(numberOf([&] { service.complete(gone, *mWork); }), int(errServiceFailed));
+        QCOMPARE(numberOf([&] { service.complete(gone, *mWork); }), int(errNothingFound));
     }
 };
 

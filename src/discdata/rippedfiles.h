@@ -1,0 +1,28 @@
+#pragma once
+
+#include "discs/toc.h"
+#include "tags/playingtime.h"
+
+#include <QDir>
+#include <functional>
+#include <stop_token>
+
+/// A file of sound in a folder, as a track of a disc.
+struct RippedFile {
+    QString name;
+    SoundFile sound;
+};
+
+/// Those of a folder whose names are wanted, in the order of their names: "2 Second" stands before
+/// "10 Tenth". Of the first that cannot be read `unreadable` is the full name: without it the
+/// others would be another disc. More than a thousand are no disc either and are left out.
+std::vector<RippedFile> soundFilesIn(const QDir &folder,
+                                     const std::function<bool(const QString &name)> &isWanted,
+                                     const std::stop_token &stop, QString &unreadable);
+
+/// Whether the tags of all have a number, and each another one.
+bool haveNumbers(const std::vector<RippedFile> &files);
+void sortByNumbers(std::vector<RippedFile> &files);
+
+/// The disc that they would make, one behind the other; nothing where no disc can have it.
+std::optional<TableOfContents> tocOf(const std::vector<RippedFile> &files);
