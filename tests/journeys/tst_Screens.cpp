@@ -14,9 +14,13 @@
 #include "discdata/frmDiscInfoCDDB.h"
 #include "discdata/frmWhatCD.h"
 #include "discdata/frmWhatNow.h"
+#include "mp3/EditMP3Tags.h"
 #include "mp3/RenamePreview.h"
 #include "mp3/UndoChanges.h"
 #include "mp3/frmCDRootMP3.h"
+#include "mp3/frmMatchWithSongcase.h"
+#include "mp3/frmTagWizardPg1.h"
+#include "mp3/frmTracks.h"
 #include "platform/ado/connection.h"
 #include "reports/frmPageSetup.h"
 #include "reports/reportpaper.h"
@@ -140,6 +144,37 @@ Form *makeSignUp()
     CddbUserProfile profile;
     profile.services = knownServices();
     return new SignUp(profile);
+}
+
+// With a row whose file has gone.
+Form *makeTagWizard()
+{
+    auto *wizard = new frmTagWizardPg1;
+    wizard->Folder = u"/gone/"_s;
+    wizard->FileRecords = std::make_shared<ADODB::Recordset>();
+    for (const char *name :
+         {"Nr", "Filename", "Album", "Artist", "Title", "TrackPosition", "PartOfSet", "TrackYear",
+          "Genre", "CopyrightHolder", "Label", "Comments", "ID"})
+        wizard->FileRecords->appendField(QLatin1String(name), ADODB::adVarWChar);
+    wizard->FileRecords->Open();
+    wizard->FileRecords->AddNew();
+    wizard->FileRecords->Fields(u"Filename").setValue(u"gone.mp3"_s);
+    return wizard;
+}
+
+Form *makeTagEditor()
+{
+    auto *editor = new EditMP3Tags;
+    editor->Load();
+    editor->EnableTagItems();
+    return editor;
+}
+
+void signUp()
+{
+    CddbUserProfile profile;
+    profile.registered = true;
+    profile.store();
 }
 
 Form *makeWhatCD()
@@ -291,6 +326,10 @@ class tst_Screens : public QObject
                 {"ProxyInfo", make<ProxyInfo>()},
                 {"frmWhatNow", make<frmWhatNow>()},
                 {"frmWhatCD", makeWhatCD},
+                {"EditMP3Tags", makeTagEditor},
+                {"frmTracks", make<frmTracks>()},
+                {"frmMatchWithSongcase", make<frmMatchWithSongcase>()},
+                {"frmTagWizardPg1", makeTagWizard},
                 {"RenamePreview", makeRenamePreview},
                 {"UndoChanges", make<UndoChanges>()}};
     }
@@ -314,6 +353,7 @@ private slots:
     {
         ScriptedDesktop desktop;
         TestCatalogue catalogue;
+        signUp();
         QSet<QString> here{u"MainScreen"_s}; // by theFrame()
         for (const auto &[name, make] : screens()) {
             const std::unique_ptr<Form> screen(make());
@@ -367,6 +407,7 @@ private slots:
         gLanguage = language;
         ScriptedDesktop desktop;
         TestCatalogue catalogue;
+        signUp();
         if (qstrncmp(QTest::currentDataTag(), "frmWhatCD", 9) == 0)
             desktop.expectBox(GetMessage("MsgStillNoCDOfThisType").section(u'\r', 0, 0));
         Form *screen = make();
@@ -407,6 +448,10 @@ private slots:
         row("frmWhatNow", make<frmWhatNow>(), "");
         row("frmCDRootMP3", makeEditor<frmCDRootMP3>(), "");
         row("frmWhatCD", makeWhatCD, "");
+        row("EditMP3Tags", makeTagEditor, "");
+        row("frmTracks", make<frmTracks>(), "");
+        row("frmMatchWithSongcase", make<frmMatchWithSongcase>(), "");
+        row("frmTagWizardPg1", makeTagWizard, "");
         row("RenamePreview", makeRenamePreview, "");
         row("UndoChanges", make<UndoChanges>(), "");
     }
@@ -416,6 +461,7 @@ private slots:
         QFETCH(Make, make);
         ScriptedDesktop desktop;
         TestCatalogue catalogue;
+        signUp();
         catalogue.exec(uR"(insert into Artiesten values (1,'Zed');
             insert into Tracks values (1,1,'One',null,null);
             insert into CDTitels values (1,'Best',null,'V',null,1990),(2,'Zebra',1,'E',null,1990);
