@@ -161,6 +161,18 @@ void CollectionRows::setFileName(const QString &volgnummer, const QString &fileN
     }
 }
 
+void CollectionRows::followNames(const RenamedFiles &renamed, const QString &folder)
+{
+    for (const auto &records : {WorkingRecords, BaselineRecords}) {
+        if (records->RecordCount() > 0)
+            records->MoveFirst();
+        for (; !records->isEOF(); records->MoveNext()) {
+            auto name = records->Fields(nameColumn);
+            name.setValue(followedName(renamed, folder, name.Value().toText()));
+        }
+    }
+}
+
 CollectionRows::Reading CollectionRows::read(const QString &folder, LongWork &work)
 {
     Reading reading;

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "mp3/collectionrow.h"
+#include "mp3/followednames.h"
 #include "mp3/tagreading.h"
 #include "platform/ado/recordset.h"
 
@@ -38,6 +39,9 @@ public:
 
     /// In all rows with this number.
     void setFileName(const QString &volgnummer, const QString &fileName);
+
+    /// Files were renamed from outside, in the catalogue too.
+    void followNames(const RenamedFiles &renamed, const QString &folder);
 
     /// What a reading has found besides the tags.
     struct Reading {

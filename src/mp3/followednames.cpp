@@ -39,6 +39,18 @@ void followInCollection(qint64 collection, const QString &folder, const RenamedF
     }
 }
 
+void followInCatalogue(const RenamedFiles &renamed)
+{
+    ADODB::Transaction transaction(*gConnection);
+    auto collections = gConnection->Execute(u"select ID, Map from MP3Collections"_s);
+    for (; !collections.isEOF(); collections.MoveNext()) {
+        const QString folder = collections.Fields(1).Value().toText();
+        if (holdsAny(folder, renamed))
+            followInCollection(collections.Fields(0).Value().toLong(), folder, renamed);
+    }
+    transaction.CommitTrans();
+}
+
 } // namespace
 
 RenamedFiles renamedBy(const std::vector<std::pair<QString, QString>> &moves)
@@ -65,16 +77,8 @@ QString followedName(const RenamedFiles &renamed, const QString &folder, const Q
 
 void followNames(const RenamedFiles &renamed)
 {
-    if (renamed.isEmpty())
-        return;
-    ADODB::Transaction transaction(*gConnection);
-    auto collections = gConnection->Execute(u"select ID, Map from MP3Collections"_s);
-    for (; !collections.isEOF(); collections.MoveNext()) {
-        const QString folder = collections.Fields(1).Value().toText();
-        if (holdsAny(folder, renamed))
-            followInCollection(collections.Fields(0).Value().toLong(), folder, renamed);
-    }
-    transaction.CommitTrans();
+    if (!renamed.isEmpty())
+        followInCatalogue(renamed);
     const auto forms = Form::openForms();
     for (Form *form : forms) {
         if (auto *editor = dynamic_cast<FollowsNames *>(form))

@@ -9,7 +9,8 @@ using RenamedFiles = QHash<QString, QString>;
 /// What moves, one after the other, come to.
 RenamedFiles renamedBy(const std::vector<std::pair<QString, QString>> &moves);
 
-/// What an open editor of a collection is, to those who rename its files from outside.
+/// What an open editor of a collection is, to those who change its files from outside; which of
+/// them have another name now it is told.
 class FollowsNames
 {
 public:
@@ -21,6 +22,7 @@ public:
 /// renamed.
 QString followedName(const RenamedFiles &renamed, const QString &folder, const QString &fileName);
 
-/// Gives the new names to the collections in the catalogue, in one transaction over gConnection,
-/// and to the open editors. Throws Error, and the catalogue is as it was then.
+/// After files were changed: gives the new names to the collections in the catalogue, in one
+/// transaction over gConnection, and tells the open editors. Throws Error, and nothing has happened
+/// then.
 void followNames(const RenamedFiles &renamed);

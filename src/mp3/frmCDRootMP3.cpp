@@ -245,7 +245,7 @@ void frmCDRootMP3::RefreshAndHandleButtons()
     Desktop::current().pump();
     if (RedrawLocked)
         Desktop::current().freeze(this);
-    gTagsChanged = false;
+    gTagsChanged = mFilesChanged = false;
     const auto reading = mRows.read(folder(), work);
     mColumns->show(mRows.WorkingRecords);
     setButtons(mRows.count() == 0  ? ButtonState::NoRows
@@ -335,12 +335,18 @@ void frmCDRootMP3::Form_Activate()
     if (!FormReady || isBusy() || !mUi->TheMP3Collection->isEnabled())
         return;
     SyncSelection();
-    if (gTagsChanged)
+    if (gTagsChanged || mFilesChanged)
         RefreshAndHandleButtons();
     const QWidget *focus = focusWidget();
     const bool wasClicked = focus && focus->underMouse() && qApp->mouseButtons() != Qt::NoButton;
     if (!wasClicked)
         mUi->TheMP3Collection->setFocus();
+}
+
+void frmCDRootMP3::followNames(const RenamedFiles &renamed)
+{
+    mRows.followNames(renamed, folder());
+    mFilesChanged = true;
 }
 
 bool frmCDRootMP3::eventFilter(QObject *watched, QEvent *event)

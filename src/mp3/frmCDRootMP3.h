@@ -18,7 +18,7 @@ class frmCDRootMP3;
 /// read from the files at each refresh. Nothing is written to the catalogue before cmdOK.
 ///
 /// A command makes the form busy: what comes in while events are handled is passed over.
-class frmCDRootMP3 : public Form
+class frmCDRootMP3 : public Form, public FollowsNames
 {
     Q_OBJECT
 
@@ -40,6 +40,10 @@ public:
 
     /// Lets the user add files that are in this folder, or below it.
     void OpenMP3FileDialog(const QString &folder);
+
+    /// What the files are and hold has been changed from outside: they are read again when the
+    /// form is activated.
+    void followNames(const RenamedFiles &renamed) override;
 
 protected:
     void Form_Load() override;
@@ -115,6 +119,7 @@ private:
     QString LoadedFolder, LoadedTitle;
     QString LastGoodFolder;
     bool FormReady = false;
+    bool mFilesChanged = false; // from outside, since the last refresh
     bool RedrawLocked = false;
     int CurrentRow = 1;
     int SelectedCount = 0;
