@@ -199,7 +199,7 @@ void frmAutoUpdateUtility::convert(LongWork &work)
     log(u"Analyzing data...."_s);
 
     CatalogueCopy copy(*mOldConnection, *gConnection, hasMP3Tables(mOldDatabasePath));
-    copy.mayGoOn = [&] { return !mCancelRequested && work.step(); };
+    copy.mayGoOn = [&] { return work.step() && !mCancelRequested; }; // asked behind the pump
     copy.counted = [this](const OldTable &table, qint64 rows) {
         log(u"Found "_s + QString::number(rows) + QLatin1String(table.found));
     };
