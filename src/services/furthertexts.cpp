@@ -275,6 +275,7 @@ const Message furtherTexts[] = {
     {"xUndoLeft", "Files that were left as they are, and why:", "Bestanden die zijn gebleven zoals ze zijn, en waarom:"},
     {"xUndonePart1", "Files that are as they were before: ", "Bestanden die weer zijn zoals ze waren: "},
     {"xUndonePart2", "Files that were left as they are: ", "Bestanden die zijn gebleven zoals ze zijn: "},
+    {"xErrFileFailed", "A file cannot be read or written.", "Een bestand kan niet worden gelezen of geschreven."},
     {"xTagNotAccessible", "The file cannot be written.", "Het bestand kan niet worden beschreven."},
     {"xTagDamaged", "The tag of this file is damaged, so it was not changed.", "De tag van dit bestand is beschadigd en is daarom niet gewijzigd."},
     {"xTagTooLong", "That is more than a tag can hold.", "Dat is meer dan er in een tag past."},

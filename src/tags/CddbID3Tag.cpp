@@ -11,6 +11,6 @@ const char *const ownFileIdOwner = "songcase";
 void CddbID3Tag::LoadFromFile(const QString &path, int)
 {
     if (!isOrdinaryFile(path))
-        throw makeError(errCannotUse, path);
+        throw makeError(errFileFailed, path);
     *this = readTag(path).fields;
 }

@@ -52,7 +52,7 @@ public:
     void setField(TagField which, const QString &text) { mFields[size_t(which)] = text; }
 
     /// Fills the fields from a file's ID3v2 tag (2.2, 2.3, 2.4); without one they become empty.
-    /// ID3v1, APE and other tags do not count. Throws Error (errCannotUse) where there is no
+    /// ID3v1, APE and other tags do not count. Throws Error (errFileFailed) where there is no
     /// ordinary file of this name, or it cannot be opened.
     void LoadFromFile(const QString &path, int flags);
 

@@ -198,7 +198,7 @@ void FileChanges::saveTag(const CddbID3Tag &tag, const QString &path)
         }
         perform(*head);
     } catch (const Error &error) {
-        if (error.Number == errCannotUse)
+        if (error.Number == errFileFailed)
             notWritten(error);
         throw;
     }

@@ -129,7 +129,7 @@ void JournalStore::beginPart()
 {
     const bool isNew = !QFileInfo::exists(mFolder);
     if (isNew && !QDir().mkpath(mFolder))
-        throw makeError(errCannotUse, mFolder);
+        throw makeError(errFileFailed, mFolder);
     auto all = parts();
     const int last = all.empty() ? 0 : all.rbegin()->first;
     mFile.reset();

@@ -14,7 +14,7 @@ struct JournalSizes {
 /// Entries one behind the other in files of a folder, "changes-1" and on: some words about each,
 /// and bytes. What was synced is read again after any end of the program; an entry that was cut
 /// off, and what stands behind it, is not there. Only what an entry says is read to find it, not
-/// its bytes. Throws Error (errCannotUse) where the disk fails.
+/// its bytes. Throws Error (errFileFailed) where the disk fails.
 class JournalStore
 {
 public:

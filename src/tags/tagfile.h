@@ -12,6 +12,6 @@ struct FileTag {
         true; // false: damaged, or not at the beginning; it is read but not to be written
 };
 
-/// Throws Error (errCannotUse) where the file cannot be opened or read.
+/// Throws Error (errFileFailed) where the file cannot be opened or read.
 FileTag readTag(const QString &path);
 FileTag readTag(const SystemFile &file);

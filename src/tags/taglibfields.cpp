@@ -94,7 +94,7 @@ std::optional<CddbID3Tag> fieldsByTagLib(const QString &path)
     TagLib::MPEG::File file(nativeName(path).constData(), TagLib::ID3v2::FrameFactory::instance(),
                             false);
     if (!file.isOpen())
-        throw makeError(errCannotUse, path);
+        throw makeError(errFileFailed, path);
     if (!file.hasID3v2Tag())
         return {};
     const Tag &tag = *file.ID3v2Tag();

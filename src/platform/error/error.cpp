@@ -18,6 +18,7 @@ struct Words {
 constexpr Words errorWords[] = {
     {errOverflow, "xErrOverflow"},
     {errTypeMismatch, "xErrTypeMismatch"},
+    {errFileFailed, "xErrFileFailed"},
     {errItemNotFound, "xErrItemNotFound"},
     {errNoCurrentRecord, "xErrNoCurrentRecord"},
     {errObjectClosed, "xErrObjectClosed"},

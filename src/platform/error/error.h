@@ -30,6 +30,7 @@ private:
 enum ErrorNumber : int {
     errOverflow = 6,
     errTypeMismatch = 13,
+    errFileFailed = 57, // a file that is no catalogue cannot be read or written
     errItemNotFound = 3265,
     errNoCurrentRecord = 3021,
     errObjectClosed = 3704,

@@ -30,7 +30,7 @@ FileStamp stampFrom(const struct stat &about)
 
 [[noreturn]] void failed(const QString &path)
 {
-    throw makeError(errCannotUse, path + u": "_s + qt_error_string(errno));
+    throw makeError(errFileFailed, path + u": "_s + qt_error_string(errno));
 }
 
 int flagsOf(SystemFile::Mode mode)

@@ -19,7 +19,7 @@ struct FileStamp {
 };
 
 /// An ordinary file that is open, closed with this object. Reads and writes whole pieces, however
-/// many calls it takes, and throws Error (errCannotUse) with the words of the system. Reading
+/// many calls it takes, and throws Error (errFileFailed) with the words of the system. Reading
 /// leaves no trace in the time of the last access where the system lets it.
 class SystemFile
 {
