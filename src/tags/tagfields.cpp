@@ -58,6 +58,12 @@ Identifier identifierIn(const QByteArray &content)
     return {content.left(end), end < 0 ? QByteArray() : content.mid(end + 1)};
 }
 
+// As an identifier is read, whatever letters stand in it.
+QString hexadecimal(const QString &data)
+{
+    return QString::fromLatin1(QByteArray::fromHex(data.toLatin1()).toHex());
+}
+
 // Collects what the frames of one tag say.
 class Reading
 {
@@ -183,13 +189,19 @@ bool isFrameOf(TagField field, const TagFrame &frame, const QByteArray &tag,
 QString asRead(TagField field, const QString &text)
 {
     constexpr qsizetype digits = 4;
-    const QString plain = withoutFilling(text);
+    // A zero would end the text, a byte order mark would be taken for one.
+    const QString plain =
+        withoutFilling(QString(text).remove(QChar(0)).remove(QChar(QChar::ByteOrderMark)));
     switch (field) {
     case TagField::Year:
-        return plain.left(digits);
+        return withoutFilling(plain.left(digits));
     case TagField::PartOfSet:
     case TagField::TrackPosition:
         return withoutZeros(plain);
+    case TagField::FileId: {
+        const QString own = QLatin1String(ownFileIdOwner) + u'=';
+        return plain.startsWith(own) ? own + hexadecimal(plain.mid(own.size())) : plain;
+    }
     case TagField::Genre: {
         QStringList names = genreNames(plain);
         names.removeDuplicates();

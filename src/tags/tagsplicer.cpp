@@ -119,8 +119,9 @@ private:
             return commentContent(text, before, mLayout.version);
         if (field == TagField::FileId)
             return ownIdentifier(text);
-        // Two brackets are read as one.
-        const bool isBracketed = field == TagField::Genre && text.startsWith("(("_L1);
+        // Two brackets are read as one, and none is taken for that of a number.
+        const bool isBracketed = field == TagField::Genre && text.startsWith(u'(') &&
+                                 genreNames(text) != QStringList(text);
         return encodedText(isBracketed ? u'(' + text : text, mLayout.version);
     }
 
@@ -181,9 +182,12 @@ QByteArray composed(const QByteArray &tag, const TagLayout &layout, const QByteA
 
 CddbID3Tag asRead(const CddbID3Tag &wanted, const CddbID3Tag &current)
 {
-    CddbID3Tag fields;
-    for (int i = 0; i < tagFields; ++i)
-        fields.setField(TagField(i), asRead(TagField(i), wanted.field(TagField(i))));
+    CddbID3Tag fields = current;
+    for (int i = 0; i < tagFields; ++i) {
+        const auto field = TagField(i);
+        if (wanted.field(field) != current.field(field))
+            fields.setField(field, asRead(field, wanted.field(field)));
+    }
     if (!isOwn(fields.FileId()) && !(fields.FileId().isEmpty() && isOwn(current.FileId())))
         fields.setFileId(current.FileId());
     return fields;

@@ -4,6 +4,8 @@
 #include "tags/tagfields.h"
 #include "tags/tagsplicer.h"
 
+using namespace Qt::StringLiterals;
+
 namespace
 {
 
@@ -54,8 +56,8 @@ fuzz::Target tags(
                                  frame("TPE1", "\3\xC3\xA9\0\xC3\xA8"_ba, 4) +
                                  fileIdFrame("songcase", "ab", 4);
         return fuzz::Inputs{
-            tagOf(frames, 3, 40) + "|Été",
-            tagOf(unsynchronised(frames), 3, 9, char(0x80)) + "|€uro",
+            tagOf(frames, 3, 40) + "|Été"_ba,
+            tagOf(unsynchronised(frames), 3, 9, char(0x80)) + "|€uro"_ba,
             tagOf(later, 4, 20) + "|(18)x",
             tagOf("\0\0\0\x0E\1\x30\5\1\1\1\1\1\1\x40"_ba + later, 4, 20, 0x40) + "|songcase=01",
             tagOf(textFrame("TT2", "Title", 2) + commentFrame("", "x", 2), 2, 12) + "|07/09"};
