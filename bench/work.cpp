@@ -6,6 +6,7 @@
 #include "workcommands.h"
 
 #include <QApplication>
+#include <algorithm>
 #include <cstdio>
 #include <memory>
 
@@ -28,6 +29,8 @@ constexpr Command commands[] = {
     {"export", "CATALOGUE FILE", exportAll},
     {"lookup", "TOC cddb+ADDRESS|musicbrainz+ADDRESS", lookUpDisc},
     {"importdisc", "CATALOGUE FILE", importDisc},
+    {"tags", "FOLDER", readTags},
+    {"collection", "CATALOGUE ID", openCollection},
     {"savetag", "FILE FIELD VALUE", saveTag},
     {"addcollection", "CATALOGUE FOLDER TITLE", addCollection},
     {"convert", "CATALOGUE OLDFILE", convertOld},
@@ -50,12 +53,14 @@ const Command *find(const QStringList &words)
     return nullptr;
 }
 
-// A look-up is the long work of a screen, and so is a conversion; it must be there, if out of
-// sight.
+// A command that is the long work of a screen needs one to be there, if out of sight.
 std::unique_ptr<QCoreApplication> makeApplication(int &argc, char **argv)
 {
-    const QByteArray command = argc < 2 ? "" : argv[1];
-    if (command != "lookup" && command != "convert")
+    constexpr const char *ofScreens[] = {"lookup", "convert", "tags", "collection"};
+    const bool needsScreen =
+        argc > 1 && std::any_of(std::begin(ofScreens), std::end(ofScreens),
+                                [&](const char *name) { return qstrcmp(argv[1], name) == 0; });
+    if (!needsScreen)
         return std::make_unique<QCoreApplication>(argc, argv);
     qputenv("QT_QPA_PLATFORM", "offscreen");
     return std::make_unique<QApplication>(argc, argv);

@@ -206,6 +206,7 @@ void frmCDRootMP3::cmdBrowse_Click()
     if (!chosen.isEmpty() && chosen != before && !changeFolder(before, chosen))
         return;
     // By design: a dialog that was cancelled stores the empty text.
+    settings.CreateKey(settingsKey);
     settings.SetValue(settingsKey, u"LastDir"_s, chosen);
 }
 

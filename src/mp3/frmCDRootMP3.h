@@ -3,6 +3,7 @@
 #include "controls/list/listitems.h"
 #include "mp3/collectionrows.h"
 #include "mp3/collectionstore.h"
+#include "mp3/followednames.h"
 #include "platform/desktop/form.h"
 
 #include <QCursor>

@@ -33,8 +33,11 @@ std::optional<QString> relativeName(const QString &folder, const QString &file)
     if (const auto plain = nameIn(QDir::cleanPath(folder), QDir::cleanPath(file)))
         return plain;
     const QFileInfo info(file);
-    return nameIn(QFileInfo(folder).canonicalFilePath(),
-                  withSeparator(QFileInfo(info.path()).canonicalFilePath()) + info.fileName());
+    const QString here = QFileInfo(folder).canonicalFilePath(); // empty if there is none
+    const QString there = QFileInfo(info.path()).canonicalFilePath();
+    if (here.isEmpty() || there.isEmpty())
+        return {};
+    return nameIn(here, withSeparator(there) + info.fileName());
 }
 
 // By design: the first of several comes last.

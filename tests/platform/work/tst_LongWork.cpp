@@ -13,6 +13,7 @@
 #include <QTcpSocket>
 #include <QThread>
 #include <QTimer>
+#include <atomic>
 
 namespace
 {
@@ -139,6 +140,44 @@ private slots:
         });
         QVERIFY(!value && work.isCancelled() && !workWindow());
         QVERIFY(!work.valueOf<int>([](auto) { return 1; }));
+    }
+
+    void eachInItsOrder()
+    {
+        LongWork work(*mScreen);
+        QList<qsizetype> taken;
+        const auto square = [](qsizetype i, auto) {
+            QThread::usleep(i % 7 == 0 ? 50 : 0);
+            return i * i;
+        };
+        QVERIFY(work.eachOf<qsizetype>(1000, square, [&](qsizetype i, qsizetype &&value) {
+            QCOMPARE(value, i * i);
+            taken.append(i);
+        }));
+        QCOMPARE(taken.size(), 1000);
+        QVERIFY(std::is_sorted(taken.begin(), taken.end()));
+        const auto fails = [](qsizetype i, auto) {
+            return i == 500 ? throw Error(7, u"there"_s, u"no"_s) : i;
+        };
+        QVERIFY_EXCEPTION_THROWN(work.eachOf<qsizetype>(1000, fails, [](auto, auto &&) {}), Error);
+        QVERIFY(!workWindow());
+    }
+
+    // Of a dead medium nothing ever comes back.
+    void cancelLeavesAThreadBehind()
+    {
+        const auto end = std::make_shared<std::atomic<bool>>(false);
+        const auto hangs = [end](qsizetype i, auto) {
+            while (i == 40 && !*end)
+                QThread::yieldCurrentThread();
+            return i;
+        };
+        LongWork work(*mScreen, u"Reading"_s);
+        cancelByHand(mScreen.get());
+        qsizetype taken = 0;
+        QVERIFY(!work.eachOf<qsizetype>(100, hangs, [&](auto, auto &&) { ++taken; }));
+        QCOMPARE(taken, 32);
+        *end = true;
     }
 
     void cancelEndsASocket()
