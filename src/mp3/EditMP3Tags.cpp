@@ -312,6 +312,7 @@ bool EditMP3Tags::save()
     takeBoxes();
     TagManager->SaveTagToFile(TagObject, TagFilePath, 1);
     gTagsChanged = true;
+    mUi->lblSound->setText(factsLine(TagFilePath));
     return true;
 }
 

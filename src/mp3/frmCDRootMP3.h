@@ -107,6 +107,8 @@ private:
     void cmdImportAsCD_Click();
     void cmdUpdateID3_Click();
     void cmdTagWizard_Click();
+    void openTagWizard(const std::vector<CollectionRow> &rows);
+    void backFromTagScreen();
 
     // Save.
     void cmdOK_Click();

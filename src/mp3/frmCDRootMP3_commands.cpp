@@ -4,7 +4,9 @@
 #include "mp3/frmCDRootMP3.h"
 
 #include "controls/list/DBListViewCTL.h"
+#include "mp3/EditMP3Tags.h"
 #include "mp3/collectionfolder.h"
+#include "mp3/frmTagWizardPg1.h"
 #include "mp3/importascd.h"
 #include "mp3/renaming.h"
 #include "mp3/ui_frmCDRootMP3.h"
@@ -12,11 +14,51 @@
 #include "platform/work/longwork.h"
 #include "services/fileutilities.h"
 
-// The tag screens are still to come.
-void frmCDRootMP3::enableTagScreens(bool, bool)
+#include <QDir>
+
+namespace
 {
-    mUi->cmdUpdateID3->setEnabled(false);
-    mUi->cmdTagWizard->setEnabled(false);
+
+// The fields that the Tags Processor takes its rows with, and the row's own that goes into each. By
+// design the last one is told "y", that the file is there: the file id does not travel.
+constexpr std::pair<const char *, CollectionField> taggedFields[] = {
+    {"Nr", CollectionField::Volgnummer},
+    {"Filename", CollectionField::FileName},
+    {"Album", CollectionField::Album},
+    {"Artist", CollectionField::LeadArtist},
+    {"Title", CollectionField::Title},
+    {"TrackPosition", CollectionField::TrackPosition},
+    {"PartOfSet", CollectionField::PartOfSet},
+    {"TrackYear", CollectionField::TrackYear},
+    {"Genre", CollectionField::Genre},
+    {"CopyrightHolder", CollectionField::CopyrightHolder},
+    {"Label", CollectionField::Label},
+    {"Comments", CollectionField::Comments},
+    {"ID", CollectionField::DoesFileExist}};
+
+ADODB::RecordsetPtr recordsetOf(const std::vector<CollectionRow> &rows)
+{
+    auto records = std::make_shared<ADODB::Recordset>();
+    for (const auto &[name, field] : taggedFields)
+        records->appendField(QLatin1String(name), field == CollectionField::Volgnummer
+                                                      ? ADODB::adBigInt
+                                                      : ADODB::adVarWChar);
+    records->Open();
+    for (const CollectionRow &row : rows) {
+        records->AddNew();
+        for (const auto &[name, field] : taggedFields)
+            records->Fields(QString::fromLatin1(name)).setValue(row[field]);
+        records->Update();
+    }
+    return records;
+}
+
+} // namespace
+
+void frmCDRootMP3::enableTagScreens(bool edit, bool wizard)
+{
+    mUi->cmdUpdateID3->setEnabled(edit);
+    mUi->cmdTagWizard->setEnabled(wizard);
 }
 
 std::vector<CollectionRow> frmCDRootMP3::rowsAt(const std::vector<int> &indexes) const
@@ -74,13 +116,22 @@ void frmCDRootMP3::cmdUpdateID3_Click()
     const ListItem item = mUi->TheMP3Collection->SelectedItem();
     const QString path = pathInFolder(folder(), item.SubItems(int(CollectionField::FileName)));
     if (FileExists(path)) {
-        RedrawLocked = true;
-        Form_Activate();
-        RedrawLocked = false;
+        EditMP3Tags::edit(path);
+        backFromTagScreen();
     } else {
         RefreshAndHandleButtons();
         Form_Activate();
     }
+}
+
+// Its list is read again if a tag was written.
+void frmCDRootMP3::backFromTagScreen()
+{
+    if (isUnloaded())
+        return;
+    RedrawLocked = true;
+    Form_Activate();
+    RedrawLocked = false;
 }
 
 void frmCDRootMP3::cmdTagWizard_Click()
@@ -88,14 +139,27 @@ void frmCDRootMP3::cmdTagWizard_Click()
     if (!mUi->cmdTagWizard->isEnabled() || !LongWork::mayBegin(*this))
         return;
     const Hourglass hourglass(this);
-    for (const CollectionRow &row : rowsAt(selectedRows())) {
+    const std::vector<CollectionRow> rows = rowsAt(selectedRows());
+    for (const CollectionRow &row : rows) {
         if (FileExists(pathInFolder(folder(), row[CollectionField::FileName])))
             continue;
         RefreshAndHandleButtons();
         Form_Activate();
         return;
     }
-    RedrawLocked = true;
-    Form_Activate();
-    RedrawLocked = false;
+    try {
+        openTagWizard(rows);
+    } catch (const Error &error) {
+        plainBox(error.numbered());
+    }
+}
+
+void frmCDRootMP3::openTagWizard(const std::vector<CollectionRow> &rows)
+{
+    auto &wizard = defaultInstance<frmTagWizardPg1>();
+    wizard.Folder = folder() + QDir::separator(); // two of them behind a drive's root
+    wizard.FileRecords = recordsetOf(rows);
+    Desktop::current().pump();
+    wizard.ShowModal();
+    backFromTagScreen();
 }
