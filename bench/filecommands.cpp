@@ -14,14 +14,20 @@ namespace
 
 TagField fieldNamed(const QString &name)
 {
-    const std::map<QString, TagField> names{
-        {u"album"_s, TagField::Album},         {u"title"_s, TagField::Title},
-        {u"comments"_s, TagField::Comments},   {u"artist"_s, TagField::LeadArtist},
-        {u"track"_s, TagField::TrackPosition}, {u"year"_s, TagField::Year},
-        {u"genre"_s, TagField::Genre}};
+    const std::map<QString, TagField> names{{u"album"_s, TagField::Album},
+                                            {u"title"_s, TagField::Title},
+                                            {u"comments"_s, TagField::Comments},
+                                            {u"artist"_s, TagField::LeadArtist},
+                                            {u"track"_s, TagField::TrackPosition},
+                                            {u"year"_s, TagField::Year},
+                                            {u"genre"_s, TagField::Genre},
+                                            {u"copyright"_s, TagField::CopyrightHolder},
+                                            {u"label"_s, TagField::Label},
+                                            {u"part"_s, TagField::PartOfSet},
+                                            {u"id"_s, TagField::FileId}};
     const auto found = names.find(name);
     if (found == names.end())
-        throw Error(errSyntax, {}, u"album, title, comments, artist, track, year or genre"_s);
+        throw Error(errSyntax, {}, u"no such field: "_s + name);
     return found->second;
 }
 

@@ -7,6 +7,7 @@ run_packages="libqt6svg6 qt6-wayland qt6-qpa-plugins qt6-translations-l10n fonts
 headless_packages="xvfb xdotool imagemagick"
 assistive_packages="at-spi2-core dbus-daemon gir1.2-atspi-2.0 python3-gi xvfb xdotool sqlite3"
 check_packages="mold clang-format sqlite3 python3 poppler-utils desktop-file-utils appstream mandoc tidy"
+tagreader_packages="python3-mutagen eyed3 kid3-cli libimage-exiftool-perl"
 tidy_packages="clang-tidy"
 package_packages="dpkg-dev file"
 cleanroot_packages="mmdebstrap"
