@@ -4,6 +4,7 @@
 #include "platform/text/messagetexts.h"
 #include "platform/work/pieces.h"
 #include "platform/work/wait.h"
+#include "platform/work/workwindow.h"
 
 #include <QApplication>
 #include <thread>
@@ -12,6 +13,7 @@ namespace
 {
 
 constexpr qint64 pumpInterval = 20; // milliseconds
+constexpr int windowAfter = 300;    // milliseconds; where it is known how much there is to do
 
 std::vector<LongWork *> gWorks; // the last one began last
 
@@ -42,6 +44,7 @@ void LongWork::cancelAll()
 LongWork::LongWork(Form &screen, const QString &what) : mScreen(&screen), mBusy(screen), mWhat(what)
 {
     gWorks.push_back(this);
+    mSince.start();
     mLastPump.start();
 }
 
@@ -62,7 +65,19 @@ bool LongWork::step(qint64 done, qint64 all)
     if (percent != mPercent && showPercent)
         showPercent(percent);
     mPercent = percent;
+    if (!showPercent && !mWhat.isEmpty())
+        showStep();
     return step();
+}
+
+void LongWork::showStep()
+{
+    if (!mWindow && mSince.elapsed() >= windowAfter && !mCancelled) {
+        mWindow = std::make_unique<WorkWindow>(*this);
+        mWindow->show();
+    }
+    if (mWindow)
+        mWindow->showPercent(mPercent);
 }
 
 bool LongWork::step()
@@ -108,7 +123,6 @@ bool LongWork::runInThreads(qsizetype count,
                             const std::function<void(qsizetype, std::stop_token)> &make,
                             const std::function<void(qsizetype)> &take)
 {
-    constexpr int windowAfter = 300; // milliseconds
     if (mCancelled || count == 0)
         return !mCancelled;
     Wait wait(*this, windowAfter);

@@ -10,6 +10,7 @@
 #include <vector>
 
 class Wait;
+class WorkWindow;
 
 /// One long work of a screen, for as long as this object lives: a text load, an export, a save, a
 /// print, a look-up. The screen is busy meanwhile, so it refuses to close. The work handles events
@@ -37,7 +38,8 @@ public:
     /// The screen's own progress: told the whole per cent of what is done whenever that changes.
     std::function<void(int percent)> showPercent;
 
-    /// To be called after each step, however small. False: cancelled.
+    /// To be called after each step, however small. False: cancelled. Where the screen shows no
+    /// progress and it is known what the work is, a window does after a moment.
     bool step(qint64 done, qint64 all);
     bool step(); // where no size is known, or somebody else counts
 
@@ -98,6 +100,7 @@ public:
 private:
     friend class Wait;
     using Tell = std::function<void()>;
+    void showStep();
     static constexpr qsizetype batch = 32; // what a thread does before it tells of it
     bool runInThread(const std::function<void(std::stop_token)> &piece);
     bool runInThreads(qsizetype count, const std::function<void(qsizetype, std::stop_token)> &make,
@@ -108,7 +111,8 @@ private:
     Form::Busy mBusy;
     QString mWhat;
     std::vector<Wait *> mWaits;
-    QElapsedTimer mLastPump;
+    std::unique_ptr<WorkWindow> mWindow; // of steps
+    QElapsedTimer mSince, mLastPump;
     int mPercent = -1;
     bool mCancelled = false;
 };

@@ -1,12 +1,10 @@
 #include "platform/work/wait.h"
 
 #include "platform/desktop/nestedloop.h"
-#include "platform/text/messagetexts.h"
 #include "platform/text/textrules.h"
 #include "platform/work/longwork.h"
+#include "platform/work/workwindow.h"
 
-#include <QProgressBar>
-#include <QProgressDialog>
 #include <QTimer>
 #include <vector>
 
@@ -47,15 +45,10 @@ void Wait::runBehindWindow()
     mLoop.exec(QEventLoop::ExcludeUserInputEvents);
     if (mState != State::Waiting)
         return;
-    QProgressDialog window(mWork.what(), text::ofKey("cmdCancelCaption"), 0, 0, mWork.window());
-    window.setObjectName(u"WorkWindow"_s);
-    mBar = new QProgressBar; // the dialog's own handles events with each value
-    window.setBar(mBar);
-    mBar->setRange(0, 0);
+    WorkWindow window(mWork);
+    mWindow = &window;
     if (mPercent >= 0)
         showPercent(mPercent);
-    window.setWindowModality(Qt::ApplicationModal);
-    connect(&window, &QProgressDialog::canceled, this, [this] { mWork.cancel(); });
     window.show();
     mLoop.exec();
 }
@@ -63,10 +56,8 @@ void Wait::runBehindWindow()
 void Wait::showPercent(int percent)
 {
     mPercent = percent;
-    if (!mBar)
-        return;
-    mBar->setRange(0, 100);
-    mBar->setValue(percent);
+    if (mWindow)
+        mWindow->showPercent(percent);
 }
 
 // Those that began later stand on the stack above: their loops must return before this one can.

@@ -5,7 +5,7 @@
 #include <QPointer>
 
 class LongWork;
-class QProgressBar;
+class WorkWindow;
 
 /// Handles events until done() or the work's end. Waits end last in, first out: one that ends while
 /// a later one still waits inside it cancels that one first.
@@ -32,7 +32,7 @@ private:
 
     LongWork &mWork;
     const int mWindowAfter;
-    QPointer<QProgressBar> mBar;
+    QPointer<WorkWindow> mWindow;
     int mPercent = -1;
     QEventLoop mLoop;
     State mState = State::Waiting;

@@ -8,6 +8,7 @@
 #include "support/scripteddesktop.h"
 
 #include <QApplication>
+#include <QDeadlineTimer>
 #include <QPushButton>
 #include <QTcpServer>
 #include <QTcpSocket>
@@ -178,6 +179,16 @@ private slots:
         QVERIFY(!work.eachOf<qsizetype>(100, hangs, [&](auto, auto &&) { ++taken; }));
         QCOMPARE(taken, 32);
         *end = true;
+    }
+
+    void stepsAreShownToo()
+    {
+        LongWork work(*mScreen, u"Renaming"_s);
+        cancelByHand(mScreen.get());
+        const QDeadlineTimer limit(10000);
+        while (work.step(1, 3) && !limit.hasExpired())
+            QThread::yieldCurrentThread();
+        QVERIFY(work.isCancelled());
     }
 
     void cancelEndsASocket()
