@@ -397,8 +397,10 @@ private slots:
             mDesktop->expectBox(u"/sub/out\r"_s + qt_error_string(EFBIG));
             exportTo(name);
         } else {
-            QFile::setPermissions(folder, QFile::ReadOwner | QFile::ExeOwner | QFile::ReadOther |
-                                              QFile::ExeOther);
+            const auto readable =
+                QFile::ReadOwner | QFile::ExeOwner | QFile::ReadOther | QFile::ExeOther;
+            QFile::setPermissions(folder, readable);
+            QFile::setPermissions(mCatalogue->path(u""_s), readable | QFile::WriteOwner);
             const OrdinaryUser nobody;
             exportTo(name);
         }
