@@ -83,6 +83,7 @@ void openCollection(const QStringList &arguments)
         editor->RefreshAndHandleButtons();
         return std::string();
     });
+    std::printf("open_kib=%ld\n", peakMemory());
     std::printf("scroll: longest=%.4f\n", longestStep(*editor));
     editor->Unload();
     CollectionRows rows;

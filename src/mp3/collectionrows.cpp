@@ -1,6 +1,7 @@
 #include "mp3/collectionrows.h"
 
 #include "platform/work/longwork.h"
+#include "services/fileutilities.h"
 #include "services/globals.h"
 
 #include <QHash>
@@ -48,15 +49,22 @@ bool sameRow(const ADODB::Rows &a, const ADODB::Rows &b, qsizetype row)
 
 } // namespace
 
-// A field of a tag is empty until its file was read, and takes no room in the rows as loaded.
+// What the statement gives for the fields of a tag is not kept: they are empty until the file was
+// read.
 void CollectionRows::load(qint64 collection)
 {
+    ADODB::Recordset stored;
+    stored.Open(selectFiles(collection), *gConnection, ADODB::adOpenStatic,
+                ADODB::adLockOptimistic);
     WorkingRecords = std::make_shared<ADODB::Recordset>();
-    WorkingRecords->Open(selectFiles(collection), *gConnection, ADODB::adOpenStatic,
-                         ADODB::adLockOptimistic);
-    for (; !WorkingRecords->isEOF(); WorkingRecords->MoveNext()) {
-        for (int column = nameColumn + 1; column < collectionFields; ++column)
-            WorkingRecords->Fields(column).setValue({});
+    for (const ADODB::FieldInfo &field : stored.rows()->fields())
+        WorkingRecords->appendField(field.name, field.type, field.size);
+    WorkingRecords->Open();
+    for (; !stored.isEOF(); stored.MoveNext()) {
+        WorkingRecords->AddNew();
+        for (const int column : {volgnummerColumn, nameColumn})
+            WorkingRecords->Fields(column).setValue(stored.Fields(column).Value());
+        WorkingRecords->Update();
     }
     BaselineRecords = std::make_shared<ADODB::Recordset>(*WorkingRecords);
     mFiles.assign(std::size_t(count()), {});
@@ -178,18 +186,26 @@ CollectionRows::Reading CollectionRows::read(const QString &folder, LongWork &wo
     Reading reading;
     if (count() > 0)
         WorkingRecords->MoveFirst();
-    // What the workers stand on is theirs: it never changes, and outlives this routine.
+    // The folder itself comes first: a dead medium must not be asked from here. What the workers
+    // stand on is theirs: it never changes, and outlives this routine.
     const auto look = [folder, rows = WorkingRecords->rows(),
                        files = std::make_shared<const std::vector<FileMemory>>(mFiles)](
-                          qsizetype row, const std::stop_token &) {
+                          qsizetype number, const std::stop_token &) {
+        if (number == 0)
+            return FileFound{{DirExists(folder) ? FileMemory::Read : FileMemory::Missing}};
+        const qsizetype row = number - 1;
         return lookAtFile(folder, rows->text(row, nameColumn), (*files)[std::size_t(row)]);
     };
     qsizetype next = 0;
-    const bool whole = work.eachOf<FileFound>(count(), look, [&](qsizetype row, FileFound &&found) {
-        take(row, std::move(found), reading);
+    const auto takeOver = [&](qsizetype number, FileFound &&found) {
+        if (number == 0) {
+            reading.folderExists = found.memory.state == FileMemory::Read;
+            return;
+        }
+        take(next++, std::move(found), reading);
         WorkingRecords->MoveNext();
-        next = row + 1;
-    });
+    };
+    const bool whole = work.eachOf<FileFound>(count() + 1, look, takeOver);
     reading.cancelled = !whole;
     for (; !whole && next < count(); ++next, WorkingRecords->MoveNext()) {
         if (mFiles[std::size_t(next)].state == FileMemory::Unread)

@@ -45,6 +45,7 @@ public:
 
     /// What a reading has found besides the tags.
     struct Reading {
+        bool folderExists = false;
         bool allExist = true;
         bool cancelled = false;
         QStringList unreadable; // newly found so

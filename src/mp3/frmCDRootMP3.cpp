@@ -166,7 +166,7 @@ bool frmCDRootMP3::isHeaderValid() const
 
 void frmCDRootMP3::txtFolder_Validate()
 {
-    if (DirExists(folder()))
+    if (mUi->txtFolder->text() != LastGoodFolder && DirExists(folder()))
         LastGoodFolder = mUi->txtFolder->text();
 }
 
@@ -190,7 +190,7 @@ void frmCDRootMP3::ValidateFolderAndTitle()
         errorBox(GetMessage("NameTitleNotOptional"));
         setNoButtons();
     } else {
-        setButtons(hasRows ? ButtonState::AllThere : ButtonState::NoRows);
+        setButtons(hasRows ? ButtonState::AllThere : ButtonState::NoRows, isHeaderValid());
     }
 }
 
@@ -249,14 +249,16 @@ void frmCDRootMP3::RefreshAndHandleButtons()
     gTagsChanged = mFilesChanged = false;
     const auto reading = mRows.read(folder(), work);
     mColumns->show(mRows.WorkingRecords);
+    const bool isValid = reading.folderExists && !mUi->txtTitel->text().isEmpty();
     setButtons(mRows.count() == 0  ? ButtonState::NoRows
-               : !isHeaderValid()  ? ButtonState::InvalidHeader
+               : !isValid          ? ButtonState::InvalidHeader
                : !reading.allExist ? ButtonState::FileMissing
-                                   : ButtonState::AllThere);
+                                   : ButtonState::AllThere,
+               isValid);
     if (!isUnloaded()) {
         if (!reading.unreadable.isEmpty())
             tellUnreadable(reading.unreadable);
-        if (mRows.count() > 0 && !reading.allExist && isHeaderValid())
+        if (mRows.count() > 0 && !reading.allExist && isValid)
             tellMissingFiles();
     }
     if (RedrawLocked)
@@ -264,12 +266,12 @@ void frmCDRootMP3::RefreshAndHandleButtons()
     RestoreListPosition();
 }
 
-void frmCDRootMP3::setButtons(ButtonState state)
+void frmCDRootMP3::setButtons(ButtonState state, bool isHeaderValid)
 {
     using enum ButtonState;
     const bool hasRows = state != NoRows, isValid = state == AllThere || state == FileMissing;
     const bool allThere = state == AllThere;
-    const bool mayAdd = allThere || (state == NoRows && isHeaderValid());
+    const bool mayAdd = allThere || (state == NoRows && isHeaderValid);
     mUi->TheMP3Collection->setEnabled(isValid);
     mUi->cmdBrowse->setEnabled(true);
     mUi->cmdAdd->setEnabled(mayAdd);

@@ -71,7 +71,7 @@ private:
 
     // The list and the buttons.
     void cmdRefreshList_Click();
-    void setButtons(ButtonState state);
+    void setButtons(ButtonState state, bool isHeaderValid);
     void setNoButtons();
     void enableTagScreens(bool edit, bool wizard);
     void tellMissingFiles();

@@ -20,9 +20,9 @@ struct FileMemory {
 
 /// What a look at one file has found.
 struct FileFound {
-    FileMemory memory;
-    bool isNew = false; // otherwise all is as it was remembered
-    CddbID3Tag tag;     // of one that was read now
+    FileMemory memory = {};
+    bool isNew = false;  // otherwise all is as it was remembered
+    CddbID3Tag tag = {}; // of one that was read now
 };
 
 /// Looks at a file of a collection, and reads its tag unless it is as remembered. What is no

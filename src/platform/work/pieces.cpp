@@ -3,7 +3,7 @@
 #include "platform/work/wait.h"
 
 #include <algorithm>
-#include <atomic>
+#include <condition_variable>
 #include <exception>
 #include <mutex>
 #include <thread>
@@ -13,6 +13,7 @@ namespace
 {
 
 constexpr unsigned mostThreads = 4; // more would only wait for the disk
+constexpr qsizetype mostAhead = 64; // pieces that are made and not yet taken over
 
 } // namespace
 
@@ -20,18 +21,30 @@ struct Pieces::Shared {
     Shared(qsizetype pieces, Make make) : make(std::move(make)), done(std::size_t(pieces)) {}
 
     const Make make;
-    std::atomic<std::size_t> begun = 0;
     std::stop_source stop;
 
     std::mutex mutex; // of all below
+    std::condition_variable_any room;
+    qsizetype begun = 0, taken = 0;
     std::vector<bool> done;
     std::exception_ptr failure;
     std::function<void()> tell; // empty once nobody listens
 
-    void finish(std::size_t piece, std::exception_ptr with)
+    // The next one to make; nothing when there are no more.
+    std::optional<qsizetype> begin()
+    {
+        std::unique_lock lock(mutex);
+        const bool mayGoOn =
+            room.wait(lock, stop.get_token(), [this] { return begun < taken + mostAhead; });
+        if (!mayGoOn || begun == qsizetype(done.size()))
+            return {};
+        return begun++;
+    }
+
+    void finish(qsizetype piece, std::exception_ptr with)
     {
         const std::lock_guard lock(mutex);
-        done[piece] = true;
+        done[std::size_t(piece)] = true;
         if (with && !failure)
             failure = std::move(with);
         if (tell)
@@ -44,6 +57,12 @@ Pieces::Pieces(qsizetype count, const Make &make, Wait &wait)
 {
 }
 
+qsizetype Pieces::taken() const
+{
+    const std::lock_guard lock(mShared->mutex);
+    return mShared->taken;
+}
+
 Pieces::~Pieces()
 {
     mShared->stop.request_stop();
@@ -53,17 +72,14 @@ Pieces::~Pieces()
 
 void Pieces::work(const std::shared_ptr<Shared> &shared)
 {
-    const std::size_t count = shared->done.size();
-    for (std::size_t piece; (piece = shared->begun++) < count;) {
+    while (const auto piece = shared->begin()) {
         std::exception_ptr failure;
         try {
-            if (shared->stop.stop_requested())
-                return;
-            shared->make(qsizetype(piece), shared->stop.get_token());
+            shared->make(*piece, shared->stop.get_token());
         } catch (...) {
             failure = std::current_exception();
         }
-        shared->finish(piece, failure);
+        shared->finish(*piece, failure);
     }
 }
 
@@ -79,7 +95,7 @@ bool Pieces::run(const std::function<void()> &takeOver)
         const std::lock_guard lock(mShared->mutex);
         if (!failure)
             failure = mShared->failure;
-        if (failure || std::size_t(mTaken) == mShared->done.size())
+        if (failure || mShared->taken == qsizetype(mShared->done.size()))
             mWait.done();
     };
     mShared->tell = [this, &come] {
@@ -97,7 +113,11 @@ bool Pieces::run(const std::function<void()> &takeOver)
 std::optional<qsizetype> Pieces::next()
 {
     const std::lock_guard lock(mShared->mutex);
-    const bool made = !mShared->failure && std::size_t(mTaken) < mShared->done.size() &&
-                      mShared->done[std::size_t(mTaken)];
-    return made ? std::optional(mTaken++) : std::nullopt;
+    const auto next = mShared->taken;
+    const bool made = !mShared->failure && next < qsizetype(mShared->done.size()) &&
+                      mShared->done[std::size_t(next)];
+    if (!made)
+        return {};
+    mShared->room.notify_all();
+    return mShared->taken++;
 }

@@ -25,7 +25,7 @@ public:
     bool run(const std::function<void()> &takeOver);
 
     std::optional<qsizetype> next(); // that is made, in the order
-    qsizetype taken() const { return mTaken; }
+    qsizetype taken() const;
 
 private:
     struct Shared;
@@ -33,5 +33,4 @@ private:
 
     std::shared_ptr<Shared> mShared;
     Wait &mWait;
-    qsizetype mTaken = 0;
 };
