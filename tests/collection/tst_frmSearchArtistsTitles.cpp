@@ -400,7 +400,7 @@ private slots:
             const auto readable =
                 QFile::ReadOwner | QFile::ExeOwner | QFile::ReadOther | QFile::ExeOther;
             QFile::setPermissions(folder, readable);
-            QFile::setPermissions(mCatalogue->path(u""_s), readable | QFile::WriteOwner);
+            QFile::setPermissions(QFileInfo(folder).path(), readable | QFile::WriteOwner);
             const OrdinaryUser nobody;
             exportTo(name);
         }
