@@ -16,7 +16,6 @@
 #include <QCloseEvent>
 #include <QDir>
 #include <QLocale>
-#include <QScrollBar>
 #include <cmath>
 
 using namespace Qt::StringLiterals;
@@ -337,5 +336,5 @@ void frmAutoUpdateUtility::log(const QString &line)
 void frmAutoUpdateUtility::showLogText(const QString &text)
 {
     mUi->ReportList->setPlainText(text);
-    mUi->ReportList->verticalScrollBar()->setValue(mUi->ReportList->verticalScrollBar()->maximum());
+    mUi->ReportList->moveCursor(QTextCursor::End);
 }
