@@ -398,7 +398,7 @@ private slots:
             exportTo(name);
         } else {
             const auto readable =
-                QFile::ReadOwner | QFile::ExeOwner | QFile::ReadOther | QFile::ExeOther;
+                QFile::ReadOwner | QFile::ExeOwner | QFile::ReadGroup | QFile::ExeGroup;
             QFile::setPermissions(folder, readable);
             QFile::setPermissions(QFileInfo(folder).path(), readable | QFile::WriteOwner);
             const OrdinaryUser nobody;
