@@ -325,7 +325,8 @@ void EditMP3Tags::takeBoxes()
     }
 }
 
-// By design: it closes whether the file could be written or not.
+// By design: it closes whether the file could be written or not, and what could not be saved is not
+// asked for once more.
 void EditMP3Tags::cmdOK_Click()
 {
     if (isBusy())
@@ -333,6 +334,7 @@ void EditMP3Tags::cmdOK_Click()
     ShowSaveMessages = false;
     if (TagInfoChanged())
         cmdSaveTag_Click();
+    mSaveTried = true;
     Unload();
 }
 
@@ -357,7 +359,8 @@ void EditMP3Tags::keyPressEvent(QKeyEvent *event)
 // By design: there is no way to stay.
 bool EditMP3Tags::QueryUnload()
 {
-    if (!SkipUnsavedCheck && TagInfoChanged() && askYesNo(GetMessage("MP3UnsavedChanges")) == vbYes)
+    if (!SkipUnsavedCheck && !mSaveTried && TagInfoChanged() &&
+        askYesNo(GetMessage("MP3UnsavedChanges")) == vbYes)
         cmdSaveTag_Click();
     return true;
 }

@@ -86,4 +86,5 @@ private:
     int MatchedTrack = 0; // found by a look-up or chosen
     bool ShowSaveMessages = true;
     bool SkipUnsavedCheck = false;
+    bool mSaveTried = false; // by cmdOK
 };

@@ -99,7 +99,8 @@ void frmTagWizardPg1::Form_Load()
 }
 
 // By design: each time the form becomes the active one the list is made anew, and matches that were
-// not saved are gone. The end of a dialog that belongs to a match does not count.
+// not saved are gone. The end of a dialog that belongs to a match does not count. What handles
+// events or asks has to wait until the toolkit is through with the activation.
 void frmTagWizardPg1::Form_Activate()
 {
     if (mPassOver || isBusy()) {
@@ -107,8 +108,8 @@ void frmTagWizardPg1::Form_Activate()
         return;
     }
     fillList();
-    InitializeCDDBControl();
     mUi->TheFileList->setFocus();
+    QMetaObject::invokeMethod(this, &frmTagWizardPg1::InitializeCDDBControl, Qt::QueuedConnection);
 }
 
 void frmTagWizardPg1::Form_Unload()
@@ -133,6 +134,8 @@ void frmTagWizardPg1::fillList()
 // Who does not sign up is asked once, not at each activation.
 void frmTagWizardPg1::InitializeCDDBControl()
 {
+    if (isUnloaded())
+        return;
     try {
         setUpCddb(*mControl, this, false);
         if (mControl->IsUserRegistered(0) != 0 || mSignUpAsked)
