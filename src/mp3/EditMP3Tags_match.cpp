@@ -104,6 +104,8 @@ void EditMP3Tags::matchWithCatalogue()
     search.Artist =
         !artist.isEmpty() ? artist : (name.artist.isEmpty() ? name.albumArtist : name.artist);
     search.Title = !title.isEmpty() || name.albumArtist.isEmpty() ? title : name.album;
+    const int number = mUi->txtTrack->text().section(u'/', 0, 0).toInt();
+    search.Track = number > 0 ? number : name.track;
     search.ShowModal();
     Desktop::current().pump();
     if (!gMatchChosen || isUnloaded())

@@ -146,14 +146,30 @@ void frmMatchWithSongcase::search()
         showNothing();
         return;
     }
-    QTreeView *tree = mUi->TreeViewCD;
     const Freeze freeze(this);
     mTree->showDiscs(found.rows(), ChooseTracks);
-    tree->setCurrentIndex(mTree->index(0, 0));
-    tree->setExpanded(mTree->index(0, 0), ChooseTracks && found.RecordCount() == 1);
+    mUi->TreeViewCD->setCurrentIndex(mTree->index(0, 0));
+    if (ChooseTracks && found.RecordCount() == 1)
+        proposeTrack();
     mUi->cmdChoose->setEnabled(true);
-    tree->setFocus();
-    tellCurrentRow(tree);
+    mUi->TreeViewCD->setFocus();
+    tellCurrentRow(mUi->TreeViewCD);
+}
+
+// Of the only disc: the one that the caller thinks of, or the first.
+void frmMatchWithSongcase::proposeTrack()
+{
+    const QModelIndex disc = mTree->index(0, 0);
+    mUi->TreeViewCD->expand(disc);
+    QModelIndex proposed = mTree->index(0, 0, disc);
+    for (int row = 0; row < mTree->rowCount(disc); ++row) {
+        const QModelIndex track = mTree->index(row, 0, disc);
+        QString key = track.data(MatchTree::keyRole).toString();
+        if (Track > 0 && matchkey::takeNumber(key, QStringLiteral("Trackno")) == Track)
+            proposed = track;
+    }
+    if (proposed.isValid())
+        mUi->TreeViewCD->setCurrentIndex(proposed);
 }
 
 void frmMatchWithSongcase::showNothing()

@@ -25,6 +25,7 @@ public:
     int NumberOfTracks = -99;  // discs must have this number of tracks; -99: any
     bool ChooseTracks = false; // the tree lists the tracks too, and one must be chosen
     QString Artist, Title;     // proposed
+    int Track = 0;             // the one that is chosen first where a single disc is found; 0: any
 
 protected:
     void Form_Load() override;
@@ -40,6 +41,7 @@ private:
     MatchQuestion question() const;
     void cmdSearch_Click();
     void search();
+    void proposeTrack();
     void showNothing();
     void cmdChoose_Click();
 

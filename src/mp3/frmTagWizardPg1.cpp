@@ -137,6 +137,7 @@ void frmTagWizardPg1::InitializeCDDBControl()
     if (isUnloaded())
         return;
     try {
+        mIsSetUp = true;
         setUpCddb(*mControl, this, false);
         if (mControl->IsUserRegistered(0) != 0 || mSignUpAsked)
             return;
@@ -251,6 +252,8 @@ bool frmTagWizardPg1::MatchFileWithCDDB(const QString &path)
 
 CddbDiscPtr frmTagWizardPg1::lookUp(const QString &path, CddbMatchListPtr &matches)
 {
+    if (!mIsSetUp) // pressed at once
+        InitializeCDDBControl();
     const Hourglass hourglass(this);
     int track = 0;
     CddbDiscPtr disc = mTagManager->LookupByFile(path, 0, track);

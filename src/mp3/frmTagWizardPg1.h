@@ -70,7 +70,7 @@ private:
     std::unique_ptr<CddbTagManager> mTagManager;
     ListColumns *mColumns;
     MatchedCells *mCells;
-    bool mSignUpAsked = false;
+    bool mIsSetUp = false, mSignUpAsked = false;
     bool mPassOver = false;  // the next activation only follows the end of a dialog of our own
     bool mCancelled = false; // the match, by the user
 };

@@ -136,6 +136,17 @@ private slots:
         QCOMPARE(chosen(), u"1 2 2"_s);
     }
 
+    // One press searches and one chooses.
+    void proposedTrack()
+    {
+        open(-99, true, u"Zoë"_s, u"Alone"_s);
+        mForm->Track = 7;
+        check("chkCompilations", false);
+        press("cmdSearch");
+        press("cmdChoose");
+        QCOMPARE(chosen(), u"3 1 7"_s);
+    }
+
     void endings_data()
     {
         const DataRows<QString, QString> row("ending", "chosen");
