@@ -37,6 +37,8 @@ QString remarkOn(const PreviewedName &name)
         return GetMessage("xRemarkRow") + QString::number(name.newName.otherRow);
     case NameObstacle::IsThere:
         return GetMessage(hasItAlready(name) ? "xRemarkSame" : "xRemarkIsThere");
+    case NameObstacle::FileGone:
+        return GetMessage("xRemarkGone");
     case NameObstacle::None:
     case NameObstacle::MovedAlready:
         break;

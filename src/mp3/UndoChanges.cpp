@@ -91,10 +91,20 @@ void UndoChanges::Form_Activate()
         mUi->ChangeList->setFocus();
 }
 
+UndoChanges::Batches UndoChanges::allBatches()
+{
+    try {
+        return changedFiles().batches();
+    } catch (const Error &error) {
+        errorBox(error.numbered(), GetMessage("MsgSysErr"));
+        return {};
+    }
+}
+
 // Nothing is chosen then but the newest.
 void UndoChanges::showBatches()
 {
-    const Batches batches = changedFiles().batches();
+    const Batches batches = allBatches();
     const auto rows = std::make_shared<ADODB::Recordset>();
     for (const char *field : {"number", "when", "what", "where", "files", "remark"})
         rows->appendField(QLatin1String(field), ADODB::adVarWChar);
@@ -123,7 +133,7 @@ UndoChanges::Batches UndoChanges::chosenBatches() const
         if (items.Item(index).Selected())
             chosen.insert(items.Item(index).Text().toLongLong());
     }
-    Batches batches = changedFiles().batches();
+    Batches batches = allBatches();
     std::erase_if(batches, [&](const auto &batch) { return !chosen.contains(batch.number); });
     return batches;
 }

@@ -29,6 +29,7 @@ protected:
 private:
     using Batches = std::vector<FileJournal::Batch>;
     void setTexts();
+    static Batches allBatches(); // newest first
     void showBatches();
     Batches chosenBatches() const;
     void handleButtons();

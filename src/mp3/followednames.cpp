@@ -13,10 +13,16 @@ using namespace Qt::StringLiterals;
 namespace
 {
 
+// As the catalogue keeps texts, in composed letters.
+QString keyOf(const QString &path)
+{
+    return QDir::cleanPath(path).normalized(QString::NormalizationForm_C);
+}
+
 // With its separator.
 QString baseOf(const QString &folder)
 {
-    const QString path = QDir::cleanPath(folder);
+    const QString path = keyOf(folder);
     return path.endsWith(QDir::separator()) ? path : path + QDir::separator();
 }
 
@@ -57,7 +63,7 @@ RenamedFiles renamedBy(const std::vector<std::pair<QString, QString>> &moves)
 {
     RenamedFiles renamed, firstNames; // the latter by the names now
     for (const auto &[from, to] : moves) {
-        const QString before = QDir::cleanPath(from), now = QDir::cleanPath(to);
+        const QString before = keyOf(from), now = keyOf(to);
         const QString first = firstNames.value(before, before);
         firstNames.remove(before);
         firstNames.insert(now, first);
@@ -71,7 +77,7 @@ QString followedName(const RenamedFiles &renamed, const QString &folder, const Q
 {
     const QString base = baseOf(folder);
     const QString asHere = QString(fileName).replace(u'\\', QDir::separator());
-    const QString now = renamed.value(base + fileName, renamed.value(base + asHere));
+    const QString now = renamed.value(keyOf(base + fileName), renamed.value(keyOf(base + asHere)));
     return now.startsWith(base) ? now.sliced(base.size()) : fileName;
 }
 

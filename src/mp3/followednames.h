@@ -3,7 +3,8 @@
 #include <QHash>
 #include <QString>
 
-/// Files of the user that have other names now: full, clean names, the old one to the new one.
+/// Files of the user that have other names now: full names, clean and composed, the old
+/// one to the new one.
 using RenamedFiles = QHash<QString, QString>;
 
 /// What moves, one after the other, come to.

@@ -30,6 +30,7 @@ public:
     }
 
     void rename(const CollectionRow &row);
+    bool isStopped() const { return mIsStopped || mScreen.isUnloaded(); }
 
 private:
     bool mayTake(const CollectionRow &row, const NewName &name) const;
@@ -39,6 +40,7 @@ private:
     RenamingPlan mPlan;
     const Renamed &mRenamed;
     FileChanges mChanges; // one for the whole press
+    bool mIsStopped = false;
 };
 
 void Renaming::rename(const CollectionRow &row)
@@ -77,6 +79,7 @@ bool Renaming::mayTake(const CollectionRow &row, const NewName &name) const
     case NameObstacle::IsThere: // its own name counts too
         return askYesNo(name.name + u": "_s + GetMessage("FileAlreadyExists")) == vbYes;
     case NameObstacle::None:
+    case NameObstacle::FileGone:
     case NameObstacle::MovedAlready:
         break;
     }
@@ -84,15 +87,19 @@ bool Renaming::mayTake(const CollectionRow &row, const NewName &name) const
 }
 
 // By design: a move that fails says nothing, and the row takes the new name; it shows as missing
-// when the list is read again. Only a name that the disk cannot have is told, and leaves the row.
+// when the list is read again. A name that the disk cannot have is told, and leaves the row; so is
+// that the move could not be taken back, which ends all.
 bool Renaming::move(const NewName &name)
 {
     try {
         mChanges.move(name.oldPath, name.newPath);
     } catch (const Error &error) {
-        if (error.Number == errNameRefused)
+        mIsStopped = error.Number == errChangeNotKept;
+        if (mIsStopped)
+            errorBox(error.Description);
+        else if (error.Number == errNameRefused)
             errorBox(name.name + u": "_s + GetMessage("xNameLetterRefused"));
-        return error.Number != errNameRefused;
+        return !mIsStopped && error.Number != errNameRefused;
     }
     return true;
 }
@@ -106,7 +113,7 @@ void renameFiles(Form &screen, const QString &folder, const std::vector<Collecti
         return;
     LongWork work(screen, GetMessage("xRenaming"));
     Renaming renaming(screen, {folder, collection}, renamed);
-    for (size_t done = 0; done < rows.size() && !screen.isUnloaded();) {
+    for (size_t done = 0; done < rows.size() && !renaming.isStopped();) {
         renaming.rename(rows[done]);
         if (!work.step(qint64(++done), qint64(rows.size())))
             return;
@@ -118,16 +125,18 @@ void previewRenaming(Form &screen, const QString &folder, const std::vector<Coll
 {
     if (!LongWork::mayBegin(screen))
         return;
-    RenamingPlan plan(folder, collection);
     std::vector<PreviewedName> names;
-    for (const CollectionRow &row : rows) {
-        const NewName name = plan.nameFor(row);
-        names.push_back({row.index, row[CollectionField::FileName], name});
-        const bool moves = name.obstacle == NameObstacle::None ||
-                           name.obstacle == NameObstacle::IsThere ||
-                           name.obstacle == NameObstacle::MovedAlready;
-        if (moves)
-            plan.pretend(row, name);
+    {
+        LongWork work(screen, GetMessage("xLookingAtNames"));
+        RenamingPlan plan(folder, collection);
+        for (const CollectionRow &row : rows) {
+            const NewName name = plan.nameFor(row);
+            names.push_back({row.index, row[CollectionField::FileName], name});
+            if (name.obstacle == NameObstacle::None || name.obstacle >= NameObstacle::IsThere)
+                plan.pretend(row, name);
+            if (!work.step(qint64(names.size()), qint64(rows.size())))
+                return;
+        }
     }
     (new RenamePreview(names))->ShowModal();
 }

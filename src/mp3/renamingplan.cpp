@@ -53,6 +53,21 @@ bool isTooLong(const QString &path)
     return lstat(nativeName(path).constData(), &about) != 0 && errno == ENAMETOOLONG;
 }
 
+qsizetype endOfFolder(const QString &path)
+{
+    return path.lastIndexOf(QDir::separator()) + 1;
+}
+
+// With its separator. It was found under its path either as it is stored or with "\" taken as the
+// separator, which shows in their number.
+QString subFolderOf(const QString &stored, const QString &path, const QString &folder)
+{
+    const auto parts = [](const QString &s) { return s.count(QDir::separator()); };
+    const bool asStored = parts(path) == parts(folder) + 1 + parts(stored);
+    const QString name = asStored ? stored : QString(stored).replace(u'\\', QDir::separator());
+    return name.first(endOfFolder(name));
+}
+
 // A name counts as the same if a disk could take it for the same.
 QString keyOf(const QString &path)
 {
@@ -74,7 +89,11 @@ RenamingPlan::RenamingPlan(QString folder, const std::vector<CollectionRow> &col
 {
     mUsers.reserve(qsizetype(collection.size()));
     for (const CollectionRow &row : collection) {
-        const QString path = QDir::cleanPath(pathInFolder(mFolder, row[CollectionField::FileName]));
+        // The disk is asked only where the name may be another one there.
+        const QString &name = row[CollectionField::FileName];
+        const QString path =
+            QDir::cleanPath(name.contains(u'\\') ? pathInFolder(mFolder, name)
+                                                 : mFolder + QDir::separator() + name);
         mUsers.insert(keyOf(path), {row.index, path});
     }
 }
@@ -82,12 +101,10 @@ RenamingPlan::RenamingPlan(QString folder, const std::vector<CollectionRow> &col
 NewName RenamingPlan::nameFor(const CollectionRow &row) const
 {
     NewName name;
-    name.oldPath = pathInFolder(mFolder, row[CollectionField::FileName]);
-    // The stored name as this system writes it has the same length.
-    const QString oldName = name.oldPath.last(row[CollectionField::FileName].size());
-    const QString subFolder = oldName.first(oldName.lastIndexOf(QDir::separator()) + 1);
-    name.name = subFolder + nameOf(row);
-    name.newPath = name.oldPath.chopped(oldName.size()) + name.name;
+    const QString &stored = row[CollectionField::FileName];
+    name.oldPath = pathInFolder(mFolder, stored);
+    name.name = subFolderOf(stored, name.oldPath, mFolder) + nameOf(row);
+    name.newPath = name.oldPath.first(endOfFolder(name.oldPath)) + nameOf(row);
     name.otherRow = otherRowWith(row, name);
     name.obstacle = obstacleTo(row, name);
     return name;
@@ -107,7 +124,9 @@ NameObstacle RenamingPlan::obstacleTo(const CollectionRow &row, const NewName &n
         return NameObstacle::MovedAlready;
     if (name.otherRow != 0)
         return NameObstacle::OfAnotherRow;
-    return isThere(name.newPath) ? NameObstacle::IsThere : NameObstacle::None;
+    if (isThere(name.newPath))
+        return NameObstacle::IsThere;
+    return FileExists(name.oldPath) ? NameObstacle::None : NameObstacle::FileGone;
 }
 
 // 0: none has it. Names that differ in case alone are one where the disk makes no difference.

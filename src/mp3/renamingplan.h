@@ -6,8 +6,8 @@
 #include <QSet>
 #include <vector>
 
-/// What stands in the way of a new name. IsThere is a question to the user; with the others the
-/// file keeps its name.
+/// What stands in the way of a new name. IsThere is a question to the user; before FileGone all
+/// others leave the file its name.
 enum class NameObstacle {
     None,
     TagMissing,       // no artist or no title
@@ -16,6 +16,7 @@ enum class NameObstacle {
     TooLong,          // for the file system
     OfAnotherRow,     // whose file would be lost
     IsThere,          // a file has this name; it may be the row's own
+    FileGone,         // the row's own
     MovedAlready      // by another row that stands for the same file
 };
 

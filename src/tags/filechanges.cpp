@@ -230,7 +230,7 @@ void FileChanges::move(const QString &from, const QString &to)
         mJournal.announce(change, {});
         mJournal.sync();
     } catch (const Error &error) {
-        throw Error(errFileNotMoved, error.Source, error.Description);
+        throw Error(errChangeNotKept, error.Source, error.Description);
     }
     try {
         moveFile(from, to);

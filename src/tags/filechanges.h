@@ -31,7 +31,7 @@ public:
     void saveTag(const CddbID3Tag &tag, const QString &path);
 
     /// Gives a file another name, and what has that name to the desktop's wastebasket where there
-    /// is one. Throws Error (errFileNotMoved, errNameRefused).
+    /// is one. Throws Error (errFileNotMoved, errNameRefused, errChangeNotKept).
     void move(const QString &from, const QString &to);
 
     /// Gives a file another beginning, `before` being what it begins with now.

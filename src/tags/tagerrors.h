@@ -9,7 +9,8 @@ enum TagError : int {
     errTagTooLong = int(0x82FC1002),       // more than a tag can hold
     errTagNotWritten = int(0x82FC1003),    // the disk failed; the file is as it was
     errFileNotMoved = int(0x82FC1004),
-    errNameRefused = int(0x82FC1005), // not moved: the disk cannot have such a name
+    errNameRefused = int(0x82FC1005),   // not moved: the disk cannot have such a name
+    errChangeNotKept = int(0x82FC1006), // not done: the journal cannot be written
 };
 
 /// The text of a key of the message table, the name of the file behind it.

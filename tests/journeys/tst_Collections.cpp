@@ -80,6 +80,19 @@ private slots:
         QCOMPARE(column("SngList", 2), texts("Best"));
         press("cmdOK");
 
+        // The names are taken back; the editor that stands open follows.
+        openStored();
+        mDesktop->expectModal(u"UndoChanges"_s, [this](Form &form) {
+            mDesktop->expectBox(GetMessage("xUndoQuestion") + u'3', vbYes);
+            mDesktop->expectBox(GetMessage("xUndonePart1") + u'3');
+            form.findChild<QPushButton *>(u"cmdUndo"_s)->click();
+            form.Unload();
+        });
+        mProgram->choose("mnuUndoChanges");
+        press("cmdRefreshList");
+        QCOMPARE(files(), u"2.mp3 1.mp3 3.mp3"_s);
+        press("cmdOK"); // nothing is left to save
+
         // The medium is taken out, and comes back.
         openStored();
         QVERIFY(QDir().rename(folder(), folder() + u"2"_s) && QDir().mkpath(folder()));

@@ -150,14 +150,33 @@ private slots:
         QCOMPARE(contentOf(u"01-A-B.mp3"_s), "x.mp3");
     }
 
+    // As other systems write names; the catalogue has them composed.
+    void aFolderOfDecomposedLetters()
+    {
+        const QString name = u"\u00e9/x.mp3"_s;
+        makeFiles(rowsOf(name.normalized(QString::NormalizationForm_D)));
+        QCOMPARE(rename(rowsOf(name + u"|A|B|4"_s), {}), QStringList(u"\u00e9/04-A-B.mp3"_s));
+        QVERIFY(QFile::exists(folder() + u"/e\u0301/04-A-B.mp3"_s));
+    }
+
     // By design a move that fails says nothing, and the row has the new name.
     void aFileThatIsGone() { QCOMPARE(rename(rowsOf(u"x.mp3|A|B|1"_s), {}), texts("01-A-B.mp3")); }
+
+    void whatCannotBeTakenBackIsNotDone()
+    {
+        const auto rows = rowsOf(u"x.mp3|A|B|1\ny.mp3|A|C|2"_s);
+        makeFiles(rows);
+        writeFile(mCatalogue->path("Changes"), "not a folder");
+        QCOMPARE(rename(rows, {u"error [Songcase]"_s}), texts("x.mp3", "y.mp3"));
+        QCOMPARE(contentOf(u"x.mp3"_s), "x.mp3");
+    }
 
     void preview()
     {
         const auto rows = rowsOf(u"a.mp3|A|B|1\nb.mp3|A|B|1\nc.mp3|A||\n02-C-D.mp3|C|D|2\n"
-                                 "e.mp3|E|F|3\n03-E-F.mp3|G|H|4"_s);
+                                 "e.mp3|E|F|3\n03-E-F.mp3|G|H|4\ngone.mp3|I|J|5"_s);
         makeFiles(rows);
+        QVERIFY(QFile::remove(folder() + u"/gone.mp3"_s));
         const QStringList before = QDir(folder()).entryList(QDir::Files);
         QStringList lines;
         mDesktop->expectModal(u"RenamePreview"_s, [&](Form &screen) {
@@ -171,7 +190,8 @@ private slots:
         QCOMPARE(lines,
                  texts("01-A-B.mp3: ", "! 01-A-B.mp3: Name of the file in row 1",
                        "! : No artist or no title in the tag", "02-C-D.mp3: Has this name already",
-                       "! 03-E-F.mp3: Name of the file in row 6", "04-G-H.mp3: "));
+                       "! 03-E-F.mp3: Name of the file in row 6",
+                       "04-G-H.mp3: ", "! 05-I-J.mp3: The file is not found"));
         QCOMPARE(QDir(folder()).entryList(QDir::Files), before);
     }
 };
