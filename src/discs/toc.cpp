@@ -1,5 +1,7 @@
 #include "discs/toc.h"
 
+#include <cmath>
+
 #include <algorithm>
 
 namespace
@@ -47,15 +49,22 @@ int framesOfSound(qint64 milliseconds)
                millisecondsPerSecond);
 }
 
+// Whole frames are those of the disc, and the rounding of milliseconds goes. Other lengths, as
+// those of most MP3 files, are true but for a part of a frame: rounded one by one they would add up
+// to another disc.
 std::optional<TableOfContents> tocOfLengths(const std::vector<int> &milliseconds)
 {
+    constexpr double rounding = 0.08; // frames, a millisecond
     TableOfContents toc;
-    toc.leadOut = firstFrame;
+    double at = firstFrame;
     for (const int length : milliseconds) {
-        toc.tracks.push_back({toc.leadOut});
-        toc.leadOut += framesOfSound(std::max(length, 0));
-        if (toc.leadOut > mostFrames)
+        toc.tracks.push_back({int(std::lround(at))});
+        const double frames = std::max(length, 0) * framesPerSecond / double(millisecondsPerSecond);
+        const double whole = std::round(frames);
+        at += std::abs(frames - whole) < rounding ? whole : frames;
+        if (at > mostFrames)
             return std::nullopt;
     }
+    toc.leadOut = int(std::lround(at));
     return toc.isValid() ? std::optional(toc) : std::nullopt;
 }

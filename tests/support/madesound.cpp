@@ -1,8 +1,9 @@
 #include "support/madesound.h"
 
+#include "support/madetag.h"
 #include "support/testcatalogue.h"
 
-#include <QtEndian>
+#include <cmath>
 
 using namespace Qt::StringLiterals;
 
@@ -10,48 +11,35 @@ namespace
 {
 
 constexpr int frameBytes = 104; // 32 kbit/s, 44.1 kHz, mono
-constexpr double frameLength = 1152 * 1000.0 / 44100;
+constexpr int frameSamples = 1152;
 constexpr int framesThere = 8;
+constexpr int delay = 576; // samples before the sound
 
-QByteArray big(quint32 number)
-{
-    number = qToBigEndian(number);
-    return {reinterpret_cast<const char *>(&number), sizeof number};
-}
-
-QByteArray frame()
+QByteArray soundFrame()
 {
     return QByteArray("\xFF\xFB\x10\xC0", 4) + QByteArray(frameBytes - 4, '\0');
 }
 
 // What stands behind the side information, 17 bytes in mono.
-QByteArray frameThatTells(int frames)
+QByteArray frameThatTells(int frames, int added)
 {
-    QByteArray first = frame();
-    const QByteArray told =
-        "Xing" + big(3) + big(quint32(frames)) + big(quint32(frames * frameBytes));
-    return first.replace(4 + 17, told.size(), told);
-}
-
-QByteArray tagFrame(const QByteArray &name, const QByteArray &content)
-{
-    return name + big(quint32(content.size())) + QByteArray(2, '\0') + content;
-}
-
-// Sizes of tags have seven bits in each byte.
-QByteArray tagOf(const QByteArray &frames)
-{
-    const auto size = quint32(frames.size());
-    return QByteArray("ID3\3\0\0", 6) +
-           big((size & 0x7F) | (size & 0x3F80) << 1 | (size & 0x1FC000) << 2) + frames;
+    QByteArray told =
+        "Xing" + tagNumber(3, 8) + tagNumber(frames, 8) + tagNumber(frames * frameBytes, 8);
+    if (added > 0)
+        told += "LAME3.100" + QByteArray(12, '\0') + tagNumber(delay << 12 | (added - delay), 8, 3);
+    return soundFrame().replace(4 + 17, told.size(), told);
 }
 
 } // namespace
 
-QByteArray silentMP3(int milliseconds)
+QByteArray silentMP3(int milliseconds, Added added)
 {
-    const int frames = std::max(1, qRound(milliseconds / frameLength));
-    return frameThatTells(frames) + frame().repeated(framesThere);
+    const double samples = milliseconds * 44.1;
+    const bool told = added == Added::Told;
+    const int frames = told ? int(std::ceil((samples + delay) / frameSamples))
+                            : std::max(1, qRound(samples / frameSamples));
+    return frameThatTells(frames, told ? frames * frameSamples - qRound(samples) : 0) +
+           soundFrame().repeated(framesThere);
 }
 
 QByteArray id3Tag(const std::vector<std::pair<QByteArray, QString>> &frames)
@@ -59,14 +47,9 @@ QByteArray id3Tag(const std::vector<std::pair<QByteArray, QString>> &frames)
     QByteArray all;
     for (const auto &[name, text] : frames) {
         const QByteArray utf16(reinterpret_cast<const char *>(text.utf16()), text.size() * 2);
-        all += tagFrame(name, "\1\xFF\xFE" + utf16);
+        all += frame(name.constData(), "\1\xFF\xFE" + utf16);
     }
     return tagOf(all);
-}
-
-QByteArray fileIdTag(const QByteArray &owner, const QByteArray &id)
-{
-    return tagOf(tagFrame("UFID", owner + '\0' + id));
 }
 
 QStringList makeSounds(const QString &folder,
