@@ -385,6 +385,7 @@ QModelIndex DBListViewCTL::moveCursor(CursorAction action, Qt::KeyboardModifiers
 void DBListViewCTL::selectionChanged(const QItemSelection &selected, const QItemSelection &old)
 {
     constexpr qsizetype many = 1000;
+    mSelectionMoved = true;
     if (!QAccessible::isActive() || rowsIn(selected) + rowsIn(old) < many) {
         QTableView::selectionChanged(selected, old);
         return;

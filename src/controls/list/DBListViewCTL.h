@@ -63,7 +63,7 @@ public:
     void scrollTo(const QModelIndex &index, ScrollHint hint = EnsureVisible) override;
 
 signals:
-    void ItemClick(ListItem item);
+    void ItemClick(ListItem item); // and once more if the button, going up, selects other rows
     void ItemCheck(ListItem item); // the user has changed a check mark
     void ColumnClick(int index);   // from 1; by mouse, or Ctrl+1 to 9 for those that show
     void DblClick();
@@ -130,6 +130,7 @@ private:
     bool mSorted = false;
     int mSortKey = 0;
     bool mCheckPressed = false;
+    bool mSelectionMoved = false; // since the button of the mouse went down
     ListItem mDropHighlight;
     QString mTyped;
     QElapsedTimer mTypedAt;

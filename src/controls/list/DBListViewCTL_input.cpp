@@ -178,6 +178,7 @@ void DBListViewCTL::mousePressEvent(QMouseEvent *event)
     QTableView::mousePressEvent(event);
     keepOneSelected();
     columnsChanged(); // the cursor stands in the cell that tells of the whole row
+    mSelectionMoved = false;
     if (index.isValid())
         emit ItemClick(itemAt(index.row()));
 }
@@ -192,12 +193,18 @@ void DBListViewCTL::mouseMoveEvent(QMouseEvent *event)
 
 void DBListViewCTL::mouseReleaseEvent(QMouseEvent *event)
 {
-    if (mDrag->running())
-        mDrag->released(event->position().toPoint());
-    else if (!mCheckPressed)
+    const bool selects = !mDrag->running() && !mCheckPressed;
+    if (selects)
         QTableView::mouseReleaseEvent(event);
+    else if (mDrag->running())
+        mDrag->released(event->position().toPoint());
     keepOneSelected();
-    mCheckPressed = false;
+    // A press on one of several selected rows leaves the others so until the button goes up, and
+    // one that is held selects on.
+    const bool isClick = selects && mSelectionMoved && currentIndex().isValid();
+    mCheckPressed = mSelectionMoved = false;
+    if (isClick)
+        emit ItemClick(itemAt(currentIndex().row()));
 }
 
 void DBListViewCTL::mouseDoubleClickEvent(QMouseEvent *event)

@@ -386,6 +386,9 @@ private slots:
         QCOMPARE(told,
                  texts("down 1 0 30", "item 30 of 11 9 30*< 4 5", "down 1 2 5",
                        "item 5 of 11 9 30* 4 5*<", "down 2 0 11", "item 11 of 11*< 9 30 4 5"));
+        list.click(4, Qt::ControlModifier);
+        list.click(1); // one of two: the other goes when the button does
+        QCOMPARE(told.last(), u"item 11 of 11*< 9 30 4 5"_s);
         told.clear();
         const QPoint below(50, list.viewport()->height() - 3);
         QTest::mouseDClick(list.viewport(), Qt::LeftButton, {}, below);
