@@ -4,6 +4,7 @@
 #include "conversion/olderrors.h"
 #include "conversion/streamedtables.h"
 #include "helpers/jetheader.h"
+#include "platform/files/nativename.h"
 #include "platform/work/helperprogram.h"
 #include "platform/work/longwork.h"
 #include "services/messages.h"
@@ -53,7 +54,7 @@ void requireTables(const StreamedTables &tables, bool withMP3)
 bool read(ADODB::Connection &connection, const QString &file, bool withMP3, LongWork &work)
 {
     const QString program = HelperProgram::placeOf(u"songcase-jet"_s);
-    QStringList arguments = {file};
+    QStringList arguments = {QString::fromLatin1(nativeName(file).toPercentEncoding("/"))};
     for (const OldTable &table : oldTables())
         arguments.append(QLatin1String(table.name));
     HelperProgram helper(work, program, arguments, limits);
@@ -89,14 +90,18 @@ bool openOldCatalogue(ADODB::Connection &connection, const QString &file, bool w
     const QString named = connection.ConnectionString;
     connection.Open({}, {}, u"Data Source=:memory:; "_s); // tables that go with the connection
     connection.ConnectionString = named;
+    const auto close = [&] {
+        if (connection.State() == ADODB::adStateOpen) // the screen may have gone meanwhile
+            connection.Close();
+    };
     bool done = false;
     try {
         done = read(connection, file, withMP3, work);
     } catch (const Error &) {
-        connection.Close();
+        close();
         throw;
     }
     if (!done)
-        connection.Close();
+        close();
     return done;
 }

@@ -1,6 +1,28 @@
 #include "helpers/jet.h"
 
 #include <cstdio>
+#include <cstdlib>
+
+namespace
+{
+
+// Names of files are bytes, arguments pass through texts: "%41" is an A.
+std::string unescaped(const std::string &argument)
+{
+    constexpr std::size_t digits = 2;
+    std::string name;
+    for (std::size_t i = 0; i < argument.size(); ++i) {
+        if (argument[i] == '%') {
+            name.push_back(char(std::strtol(argument.substr(i + 1, digits).c_str(), nullptr, 16)));
+            i += digits;
+        } else {
+            name.push_back(argument[i]);
+        }
+    }
+    return name;
+}
+
+} // namespace
 
 int main(int count, char **arguments)
 {
@@ -8,5 +30,5 @@ int main(int count, char **arguments)
         std::fputs("songcase-jet FILE TABLE...\n", stderr);
         return int(jet::Result::Usage);
     }
-    return int(jet::printTables(arguments[1], {arguments + 2, arguments + count}));
+    return int(jet::printTables(unescaped(arguments[1]), {arguments + 2, arguments + count}));
 }

@@ -11,7 +11,7 @@ namespace jet
 namespace
 {
 
-const auto noConverter = reinterpret_cast<iconv_t>(-1);
+const auto noConverter = reinterpret_cast<iconv_t>(-1); // NOLINT(performance-no-int-to-ptr)
 constexpr char32_t replacement = 0xFFFD;
 
 void append(std::string &utf8, char32_t c)

@@ -69,7 +69,7 @@ private slots:
     {
         const DataRows<int, QString> row("generation", "name");
         row("Jet 4", 4, "Compact3.orv");
-        row("Jet 4, of the newest program", 4, "Compact4 old.orv");
+        row("Jet 4, of the newest program", 4, "Compact4 100%41.orv");
         row("Jet 3", 3, "Compact3.orv");
         row("Jet 3, without MP3", 3, "Compact.orv");
     }
