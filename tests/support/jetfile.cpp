@@ -1,8 +1,6 @@
 #include "support/jetfile.h"
 
 #include <QtEndian>
-#include <array>
-#include <numeric>
 
 namespace
 {
@@ -65,7 +63,6 @@ private:
     int addPage();
     int addDataPage(quint32 owner);
     int addRow(int page, const QByteArray &row);
-    bool fits(int page, const QByteArray &row) const;
     void writeTable(int page, const JetTable &table);
     int writeMaps(const std::vector<int> &pages);
     std::vector<int> writeRows(int page, const JetTable &table);
@@ -99,27 +96,19 @@ int Maker::addDataPage(quint32 owner)
     return page;
 }
 
-// Rows stand from the end of a page towards its beginning, where their places are.
-bool Maker::fits(int page, const QByteArray &row) const
-{
-    const QByteArray &bytes = mPages[size_t(page)];
-    const int rows = qFromLittleEndian<quint16>(bytes.constData() + mLayout.rowCount);
-    const int from =
-        rows == 0
-            ? mLayout.pageSize
-            : qFromLittleEndian<quint16>(bytes.constData() + mLayout.firstRow + 2 * (rows - 1));
-    return from - row.size() >= mLayout.firstRow + 2 * (rows + 1);
-}
-
+// Rows stand from the end of a page towards its beginning, where their places are. -1: no room.
 int Maker::addRow(int page, const QByteArray &row)
 {
     QByteArray &bytes = mPages[size_t(page)];
     const int rows = qFromLittleEndian<quint16>(bytes.constData() + mLayout.rowCount);
-    const char *last = bytes.constData() + mLayout.firstRow + 2 * (rows - 1);
-    const int end = rows == 0 ? mLayout.pageSize : qFromLittleEndian<quint16>(last);
+    const int places = mLayout.firstRow + 2 * rows;
+    const int end =
+        rows == 0 ? mLayout.pageSize : qFromLittleEndian<quint16>(bytes.constData() + places - 2);
     const int start = end - int(row.size());
+    if (start < places + 2)
+        return -1;
     bytes.replace(start, row.size(), row);
-    put(bytes, mLayout.firstRow + 2 * rows, quint16(start));
+    put(bytes, places, quint16(start));
     put(bytes, mLayout.rowCount, quint16(rows + 1));
     return rows;
 }
@@ -198,9 +187,10 @@ std::vector<int> Maker::writeRows(int page, const JetTable &table)
     std::vector<int> pages;
     for (const QVariantList &values : table.rows) {
         const QByteArray row = rowOf(table, values);
-        if (pages.empty() || !fits(pages.back(), row))
+        if (pages.empty() || addRow(pages.back(), row) < 0) {
             pages.push_back(addDataPage(quint32(page)));
-        addRow(pages.back(), row);
+            addRow(pages.back(), row);
+        }
     }
     return pages;
 }
@@ -286,20 +276,13 @@ QByteArray Maker::headerPage() const
             page[0x42 + i] = char(page[0x42 + i] ^ int(created) >> 8 * (i % 4));
         put(page, 0x72, created);
     }
-    std::array<quint8, 256> state;
-    std::iota(state.begin(), state.end(), 0);
-    const QByteArray key("\xC7\xDA\x39\x6B");
-    quint8 i = 0, j = 0;
-    for (int n = 0; n < 256; ++n) {
-        j = quint8(j + state[size_t(n)] + quint8(key[n % 4]));
-        std::swap(state[size_t(n)], state[j]);
-    }
-    j = 0;
-    for (int n = 0; n < (mHeader.generation == 4 ? 128 : 126); ++n) {
-        j = quint8(j + state[++i]);
-        std::swap(state[i], state[j]);
-        page[0x18 + n] = char(page[0x18 + n] ^ state[quint8(state[i] + state[j])]);
-    }
+    const QByteArray mask = QByteArray::fromHex(
+        "b56f03626108c255eba96772433f009c7a9f90ff809a31c579baed30bcdfcc9d63d9e4c37b42"
+        "fb8abc4e86fbec375d449cfac65e28e613b68a6054947b36f572dfb177f41343cfafb1333461"
+        "795b92b57c2a05f17c99011b98fd124f4a946c3e60265f95f8d089248567c61f2744d2eecf65"
+        "edff07c746a178160cede92d62d4");
+    for (int n = 0; n < (mHeader.generation == 4 ? 128 : 126); ++n)
+        page[0x18 + n] = char(page[0x18 + n] ^ mask[n]);
     return page;
 }
 
@@ -336,32 +319,19 @@ QByteArray jetFile(const std::vector<JetTable> &tables, const JetHeader &header)
 // Some columns in another order and another spelling than the statements have.
 std::vector<JetTable> emptyOldCatalogue()
 {
-    using enum JetColumn::Type;
-    return {
-        {"ARTIESTEN", {{"Naam", Text}, {"ID", Long}}, {}},
-        {"Tracks",
-         {{"ID", Long}, {"artiest_id", Long}, {"Titel", Text}, {"Genre", Text}, {"Hitjaar", Int}},
-         {}},
-        {"CDTitels",
-         {{"ID", Long},
-          {"Titel", Memo},
-          {"Artiest_ID", Long},
-          {"CD_Type", Text},
-          {"Genre", Text},
-          {"Hitjaar", Double}},
-         {}},
-        {"CompactDiscs",
-         {{"ID", Long},
-          {"CDTitels_ID", Long},
-          {"Opmerking", Text},
-          {"DiskNo", Byte},
-          {"TrackNo", Int},
-          {"Track_ID", Long}},
-         {}},
-        {"MP3Collections", {{"ID", Long}, {"Map", Text}, {"Album", Text}}, {}},
-        {"MP3Files",
-         {{"ID", Long}, {"Volgnummer", Long}, {"FileName", Text}, {"CollectionId", Long}},
-         {}}};
+    const auto table = [](const QByteArray &name, const QByteArray &columns) {
+        JetTable empty{name, {}, {}};
+        for (const QByteArray &column : columns.split(' ')) // "ID:4"
+            empty.columns.push_back(
+                {column.split(':')[0], JetColumn::Type(column.split(':')[1].toInt())});
+        return empty;
+    };
+    return {table("ARTIESTEN", "Naam:10 ID:4"),
+            table("Tracks", "ID:4 artiest_id:4 Titel:10 Genre:10 Hitjaar:3"),
+            table("CDTitels", "ID:4 Titel:12 Artiest_ID:4 CD_Type:10 Genre:10 Hitjaar:7"),
+            table("CompactDiscs", "ID:4 CDTitels_ID:4 Opmerking:10 DiskNo:2 TrackNo:3 Track_ID:4"),
+            table("MP3Collections", "ID:4 Map:10 Album:10"),
+            table("MP3Files", "ID:4 Volgnummer:4 FileName:10 CollectionId:4")};
 }
 
 std::vector<JetTable> oldCatalogue()
