@@ -72,7 +72,6 @@ UndoChanges::~UndoChanges() = default;
 void UndoChanges::setTexts()
 {
     applyCaptions(this, {{"UndoChanges", "xUndoChangesCaption"},
-                         {"lblWhich", "xUndoWhich"},
                          {"lblLeft", "xUndoLeft"},
                          {"cmdUndo", "xUndo"}});
     mUi->ChangeList->setAccessibleName(GetMessage("xUndoChangesCaption"));
@@ -121,6 +120,7 @@ void UndoChanges::showBatches()
             rows->Fields(column++).setValue(cell);
     }
     mColumns->show(rows);
+    mUi->lblWhich->setText(GetMessage(batches.empty() ? "xUndoNone" : "xUndoWhich"));
     handleButtons();
 }
 

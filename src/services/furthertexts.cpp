@@ -265,6 +265,7 @@ const Message furtherTexts[] = {
     {"xUndoEntry", "&Undo changes to files…", "&Wijzigingen in bestanden ongedaan maken…"},
     {"xUndoChangesCaption", "Undo changes to files", "Wijzigingen in bestanden ongedaan maken"},
     {"xUndoWhich", "Choose what is to be taken back. A file that something else has changed since is left as it is. What you take back can be taken back in turn.", "Kies wat ongedaan moet worden gemaakt. Een bestand dat sindsdien door iets anders is gewijzigd, blijft zoals het is. Ook het ongedaan maken kan weer ongedaan worden gemaakt."},
+    {"xUndoNone", "The program has not changed any of your files yet.", "Het programma heeft nog geen bestanden van u gewijzigd."},
     {"xWhen", "When", "Wanneer"},
     {"xWhat", "What", "Wat"},
     {"xFolder", "Folder", "Map"},

@@ -76,7 +76,7 @@ void ChangeUndo::takeBack(FileChanges &changes, const FileJournal::Entry &entry)
         takeBackHead(changes, entry);
 }
 
-FileJournal::Undone ChangeUndo::run(ChangeBatch about,
+FileJournal::Undone ChangeUndo::run(const ChangeBatch &about,
                                     const std::function<bool(int done, int all)> &step)
 {
     std::vector<const FileJournal::Entry *> all;

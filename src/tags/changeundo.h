@@ -14,7 +14,8 @@ public:
         : mJournal(journal), mEntries(entries), mBatch(batch)
     {
     }
-    FileJournal::Undone run(ChangeBatch about, const std::function<bool(int done, int all)> &step);
+    FileJournal::Undone run(const ChangeBatch &about,
+                            const std::function<bool(int done, int all)> &step);
 
 private:
     struct Now {
