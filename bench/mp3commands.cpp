@@ -95,3 +95,19 @@ void openCollection(const QStringList &arguments)
         return count("rows", rows.count());
     });
 }
+
+void addCollection(const QStringList &arguments)
+{
+    openForWork(arguments[0]);
+    const QString &folder = arguments[1];
+    CollectionRows rows;
+    rows.load(-1);
+    rows.append(rownames::ofFound(folder, FindFilesInTree(folder, u"*.mp3"_s, 1)));
+    measured("addcollection", [&] {
+        ADODB::Transaction transaction(*gConnection);
+        const qint64 id = collectionstore::insertHeader({folder, arguments[2]});
+        collectionstore::replaceFiles(id, *rows.WorkingRecords->rows());
+        transaction.CommitTrans();
+        return count("files", rows.count());
+    });
+}
