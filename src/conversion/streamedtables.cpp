@@ -47,10 +47,14 @@ std::string unescaped(std::string_view cell)
     std::string text;
     text.reserve(cell.size());
     for (std::size_t i = 0; i < cell.size(); ++i) {
-        const bool escape = cell[i] == '\\' && ++i < cell.size();
-        const auto letter = escape ? letters.find(cell[i]) : std::string_view::npos;
-        text.push_back(letter == std::string_view::npos ? cell[std::min(i, cell.size() - 1)]
-                                                        : signs[letter]);
+        if (cell[i] != '\\') {
+            text.push_back(cell[i]);
+            continue;
+        }
+        const auto letter = ++i < cell.size() ? letters.find(cell[i]) : std::string_view::npos;
+        if (letter == std::string_view::npos)
+            throw oldDatabaseError("xOldDamaged");
+        text.push_back(signs[letter]);
     }
     return text;
 }

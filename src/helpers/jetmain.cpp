@@ -1,7 +1,9 @@
 #include "helpers/jet.h"
 
+#include <csignal>
 #include <cstdio>
 #include <cstdlib>
+#include <sys/prctl.h>
 
 namespace
 {
@@ -30,5 +32,6 @@ int main(int count, char **arguments)
         std::fputs("songcase-jet FILE TABLE...\n", stderr);
         return int(jet::Result::Usage);
     }
+    prctl(PR_SET_PDEATHSIG, SIGKILL); // a program that is gone cannot end what loops here
     return int(jet::printTables(unescaped(arguments[1]), {arguments + 2, arguments + count}));
 }

@@ -125,6 +125,16 @@ private slots:
         QCOMPARE(mCatalogue->rows("select Titel from CDTitels where ID = 8"), QStringList(memo));
     }
 
+    void deletedAndMovedRows()
+    {
+        auto tables = emptyOldCatalogue();
+        tables[0].rows = {{u"deleted"_s, 1}, {u"was here"_s, 2}, {u"moved"_s, 3}, {u"stays"_s, 4}};
+        tables[0].marks = {0xC000, 0x4000, 0x8000};
+        tables[0].statedRows = 2;
+        convert(u"Compact3.orv"_s, jetFile(tables));
+        QCOMPARE(everything(), texts("3|moved", "4|stays"));
+    }
+
     void emptyCatalogue()
     {
         const QStringList lines = convert(u"Compact3.orv"_s, jetFile(emptyOldCatalogue()));

@@ -62,7 +62,7 @@ public:
 private:
     int addPage();
     int addDataPage(quint32 owner);
-    int addRow(int page, const QByteArray &row);
+    int addRow(int page, const QByteArray &row, int mark = 0);
     void writeTable(int page, const JetTable &table);
     int writeMaps(const std::vector<int> &pages);
     std::vector<int> writeRows(int page, const JetTable &table);
@@ -97,18 +97,18 @@ int Maker::addDataPage(quint32 owner)
 }
 
 // Rows stand from the end of a page towards its beginning, where their places are. -1: no room.
-int Maker::addRow(int page, const QByteArray &row)
+int Maker::addRow(int page, const QByteArray &row, int mark)
 {
     QByteArray &bytes = mPages[size_t(page)];
     const int rows = qFromLittleEndian<quint16>(bytes.constData() + mLayout.rowCount);
     const int places = mLayout.firstRow + 2 * rows;
-    const int end =
-        rows == 0 ? mLayout.pageSize : qFromLittleEndian<quint16>(bytes.constData() + places - 2);
+    const int end = rows == 0 ? mLayout.pageSize
+                              : qFromLittleEndian<quint16>(bytes.constData() + places - 2) & 0x1FFF;
     const int start = end - int(row.size());
     if (start < places + 2)
         return -1;
     bytes.replace(start, row.size(), row);
-    put(bytes, places, quint16(start));
+    put(bytes, places, quint16(start | mark));
     put(bytes, mLayout.rowCount, quint16(rows + 1));
     return rows;
 }
@@ -185,11 +185,12 @@ QByteArray Maker::rowOf(const JetTable &table, const QVariantList &values)
 std::vector<int> Maker::writeRows(int page, const JetTable &table)
 {
     std::vector<int> pages;
-    for (const QVariantList &values : table.rows) {
-        const QByteArray row = rowOf(table, values);
-        if (pages.empty() || addRow(pages.back(), row) < 0) {
+    for (size_t i = 0; i < table.rows.size(); ++i) {
+        const QByteArray row = rowOf(table, table.rows[i]);
+        const int mark = i < table.marks.size() ? table.marks[i] : 0;
+        if (pages.empty() || addRow(pages.back(), row, mark) < 0) {
             pages.push_back(addDataPage(quint32(page)));
-            addRow(pages.back(), row);
+            addRow(pages.back(), row, mark);
         }
     }
     return pages;

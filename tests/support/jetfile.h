@@ -19,6 +19,8 @@ struct JetTable {
     std::vector<JetColumn> columns;
     std::vector<QVariantList> rows;
     int statedRows = -1; // not those that are there
+    std::vector<quint16> marks =
+        {}; // of the first rows: 0xC000 deleted, 0x4000 was here, 0x8000 moved
 };
 
 struct JetHeader {
