@@ -17,18 +17,34 @@ namespace
 
 } // namespace
 
+ChangeUndo::ChangeUndo(FileJournal &journal, const FileJournal::Entries &entries, qint64 batch)
+    : mJournal(journal), mEntries(entries), mBatch(batch)
+{
+    for (const auto &[id, entry] : mEntries) {
+        if (entry.isDone)
+            mByName[{entry.change.path, id}] = &entry;
+    }
+}
+
+// The change of a name behind another one; nullptr: it was the last.
+const FileJournal::Entry *ChangeUndo::next(const QString &path, qint64 behind) const
+{
+    auto found = mByName.upper_bound({path, behind});
+    while (found != mByName.end() && mTakenBack.contains(found->first.second))
+        ++found;
+    return found != mByName.end() && found->first.first == path ? found->second : nullptr;
+}
+
 // A file that was renamed since has its new name, and one that was written anew is another one to
 // the system.
 ChangeUndo::Now ChangeUndo::now(const QString &path, const FileJournal::Entry &since) const
 {
     Now now{path, since.after};
-    for (auto entry = mEntries.upper_bound(since.change.id); entry != mEntries.end(); ++entry) {
-        const FileChange &change = entry->second.change;
-        if (!entry->second.isDone || change.path != now.name || mTakenBack.contains(change.id))
-            continue;
-        now.stamp = entry->second.after;
-        if (change.way == FileChange::Way::Move)
-            now.name = change.other;
+    for (const auto *entry = next(path, since.change.id); entry;
+         entry = next(now.name, entry->change.id)) {
+        now.stamp = entry->after;
+        if (entry->change.way == FileChange::Way::Move)
+            now.name = entry->change.other;
     }
     if (const auto touched = mTouched.find(now.name); touched != mTouched.end())
         now.stamp = touched->second;

@@ -10,10 +10,7 @@ class FileChanges;
 class ChangeUndo
 {
 public:
-    ChangeUndo(FileJournal &journal, const FileJournal::Entries &entries, qint64 batch)
-        : mJournal(journal), mEntries(entries), mBatch(batch)
-    {
-    }
+    ChangeUndo(FileJournal &journal, const FileJournal::Entries &entries, qint64 batch);
     FileJournal::Undone run(const ChangeBatch &about,
                             const std::function<bool(int done, int all)> &step);
 
@@ -22,6 +19,7 @@ private:
         QString name;
         FileStamp stamp; // as the journal knows it
     };
+    const FileJournal::Entry *next(const QString &path, qint64 behind) const;
     Now now(const QString &path, const FileJournal::Entry &since) const;
     void takeBack(FileChanges &changes, const FileJournal::Entry &entry);
     void takeBackMove(FileChanges &changes, const FileJournal::Entry &entry) const;
@@ -30,6 +28,7 @@ private:
     FileJournal &mJournal;
     const FileJournal::Entries &mEntries;
     const qint64 mBatch;
-    std::map<QString, FileStamp> mTouched; // by this undo
-    std::set<qint64> mTakenBack;           // the same
+    std::map<std::pair<QString, qint64>, const FileJournal::Entry *> mByName; // and id
+    std::map<QString, FileStamp> mTouched;                                    // by this undo
+    std::set<qint64> mTakenBack;                                              // the same
 };

@@ -114,15 +114,13 @@ FileJournal::Read FileJournal::readAll() const
 std::vector<FileJournal::Batch> FileJournal::batches() const
 {
     const Read read = readAll();
+    std::map<qint64, int> files;
+    for (const auto &[id, entry] : read.entries)
+        files[entry.change.batch] += entry.isDone ? 1 : 0;
     std::vector<Batch> all;
-    for (const ChangeBatch &each : read.batches) {
-        Batch batch;
-        static_cast<ChangeBatch &>(batch) = each;
-        batch.files = int(std::count_if(read.entries.begin(), read.entries.end(), [&](auto &entry) {
-            return entry.second.isDone && entry.second.change.batch == each.number;
-        }));
-        if (batch.files > 0)
-            all.insert(all.begin(), batch);
+    for (auto each = read.batches.rbegin(); each != read.batches.rend(); ++each) {
+        if (files[each->number] > 0)
+            all.push_back({*each, files[each->number]});
     }
     // The newest first: one that was taken back itself takes nothing back.
     for (auto batch = all.begin(); batch != all.end(); ++batch) {
