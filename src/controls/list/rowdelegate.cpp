@@ -10,6 +10,8 @@ void RowDelegate::initStyleOption(QStyleOptionViewItem *option, const QModelInde
 {
     QStyledItemDelegate::initStyleOption(option, index);
     option->state &= ~QStyle::State_HasFocus;
+    // A row has one line: of more, all but the first would be cut off, whatever the width.
+    option->text.replace(QChar::LineSeparator, u' ');
 }
 
 bool RowDelegate::helpEvent(QHelpEvent *event, QAbstractItemView *view,

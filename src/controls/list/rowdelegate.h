@@ -2,8 +2,9 @@
 
 #include <QStyledItemDelegate>
 
-/// Draws the cells of a list. The focus belongs to the whole row, so the list draws it; a text that
-/// does not fit its column shows in a tool tip, unless the list has one of its own.
+/// Draws the cells of a list. The focus belongs to the whole row, so the list draws it; a text of
+/// several lines stands in one, and what does not fit its column shows in a tool tip, unless the
+/// list has one of its own.
 class RowDelegate : public QStyledItemDelegate
 {
     Q_OBJECT

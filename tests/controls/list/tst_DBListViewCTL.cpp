@@ -522,6 +522,16 @@ private slots:
         }
     }
 
+    void aTextOfTwoLinesStandsInOne()
+    {
+        ShownList list;
+        const QModelIndex cell = list.model()->index(0, 1);
+        list.ListItems().Item(1).setSubItems(1, u"first second"_s);
+        const QSize size = list.sizeHintForIndex(cell);
+        list.ListItems().Item(1).setSubItems(1, u"first\nsecond"_s);
+        QCOMPARE(list.sizeHintForIndex(cell), size);
+    }
+
     void handlesManyRows()
     {
         QAccessible::setActive(true); // nor may assistive tools ask for each cell
