@@ -55,11 +55,13 @@ Chosen ofChosen(const QString &folder, const QStringList &files)
     Chosen chosen;
     for (const QString &file : inOrderOfAdding(files)) {
         const auto name = relativeName(folder, file);
-        if (!QFileInfo(file).fileName().contains(".MP3"_L1, Qt::CaseInsensitive)) {
+        const bool isMP3 = QFileInfo(file).fileName().contains(".MP3"_L1, Qt::CaseInsensitive);
+        // One alone is asked for its name first, several for their folder.
+        if (!name && (isMP3 || files.size() > 1)) {
+            chosen.refusal = "InvalidDirectory";
+        } else if (!isMP3) {
             chosen.refusal = "OnlyMP3Files";
             chosen.askAgain = true;
-        } else if (!name) {
-            chosen.refusal = "InvalidDirectory";
         } else if (name->size() > longestName) {
             chosen.refusal = "NumberOfCharactersExceeded";
         }

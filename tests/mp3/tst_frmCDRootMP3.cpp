@@ -168,6 +168,9 @@ private slots:
         mDesktop->expectFiles({mCatalogue->path("other.mp3")});
         mDesktop->expectBox(u"error [Songcase] Invalid directory chosen"_s);
         QTest::keyClick(list(), Qt::Key_Insert);
+        mDesktop->expectFiles({mCatalogue->path("other.txt"), mCatalogue->path("other.mp3")});
+        mDesktop->expectBox(u"error [Songcase] Invalid directory chosen"_s); // and that is all
+        press("cmdAdd");
         mDesktop->expectFiles({}); // cancelled
         press("cmdAdd");
         QCOMPARE(files(), u"1b.mp3 2c.mp3 3a.mp3"_s);
