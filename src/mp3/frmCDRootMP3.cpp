@@ -258,8 +258,10 @@ void frmCDRootMP3::RefreshAndHandleButtons()
     if (!isUnloaded()) {
         if (!reading.unreadable.isEmpty())
             tellUnreadable(reading.unreadable);
-        if (mRows.count() > 0 && !reading.allExist && isValid)
-            tellMissingFiles();
+        if (!reading.allExist && isValid)
+            warningBox(GetMessage("OneOrMoreFilesDoNotExist"));
+        if (!reading.allExist)
+            markMissingFiles();
     }
     if (RedrawLocked)
         Desktop::current().freeze(nullptr);
@@ -296,9 +298,9 @@ void frmCDRootMP3::setNoButtons()
     mUi->cmdCancel->setEnabled(true);
 }
 
-void frmCDRootMP3::tellMissingFiles()
+// Those of a folder that is not there too: a medium may have taken it along.
+void frmCDRootMP3::markMissingFiles()
 {
-    warningBox(GetMessage("OneOrMoreFilesDoNotExist"));
     for (qsizetype row = 0; row < mRows.count(); ++row) {
         if (!mRows.isMissing(row))
             continue;

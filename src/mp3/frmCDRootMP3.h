@@ -74,7 +74,7 @@ private:
     void setButtons(ButtonState state, bool isHeaderValid);
     void setNoButtons();
     void enableTagScreens(bool edit, bool wizard);
-    void tellMissingFiles();
+    void markMissingFiles();
     void tellUnreadable(const QStringList &names);
     void RestoreListPosition();
     void SyncSelection();

@@ -134,6 +134,9 @@ private slots:
         QCOMPARE(usable(), u"MP3Collection ImportAsCD Delete RefreshList Rename"_s);
         QVERIFY(item(1).Bold() && item(1).ForeColor() == QColor(255, 0, 0) && !item(2).Bold());
         QCOMPARE(item(1).SubItems(4) + item(2).SubItems(4), u"?Title of b.mp3"_s);
+        QVERIFY(QDir().rename(folder(), folder() + u'2')); // the folder goes as well
+        press("cmdRefreshList");
+        QVERIFY(item(2).Bold() && !list()->isEnabled());
     }
 
     void scanning()
