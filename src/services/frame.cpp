@@ -85,7 +85,9 @@ void placeInFrame(Form *form, double shareOfWidth, double shareOfHeight)
     const QSize frame = gFrame->size();
     const QPoint wanted(int(frame.width() * shareOfWidth), int(frame.height() * shareOfHeight));
     const QPoint origin = gFrame->window()->pos();
-    form->setPlace(onScreen(gFrame->window(), {origin + wanted, form->size()}).topLeft() - origin);
+    const QRect place = onScreen(gFrame->window(), {origin + wanted, form->size()});
+    form->resize(place.size());
+    form->setPlace(place.topLeft() - origin);
 }
 
 void makeRoomInFrame(const Form *form)

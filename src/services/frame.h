@@ -32,7 +32,8 @@ void freezeFrame();
 void releaseFrame();
 QAction *frameCommand(const QString &name);
 
-/// For the load of a form: it will stand at this share of the frame's size.
+/// For the load of a form: it will stand at this share of the frame's size, no larger than the
+/// screen.
 void placeInFrame(Form *form, double shareOfWidth, double shareOfHeight);
 
 /// For the load of a form: a frame that is smaller than the form grows beyond it, as far as the

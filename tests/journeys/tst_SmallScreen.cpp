@@ -1,4 +1,8 @@
 // Label: journey
+#include "discdata/cddbuserprofile.h"
+#include "mp3/EditMP3Tags.h"
+#include "mp3/frmMatchWithSongcase.h"
+#include "mp3/frmTagWizardPg1.h"
 #include "support/journey.h"
 #include "support/onscreen.h"
 
@@ -30,6 +34,29 @@ private slots:
         QVERIFY(mProgram->screen("CompilationReport"));
         QCOMPARE(outside(mProgram->frame()), QString());
         QVERIFY(mProgram->frame().QMainWindow::width() > 700);
+    }
+
+    // Those that stand by themselves, larger than the screen as they are drawn.
+    void modalScreens_data()
+    {
+        const DataRows<std::function<Form *()>> row("make");
+        row("EditMP3Tags", [] { return new EditMP3Tags; });
+        row("frmTagWizardPg1", [] { return new frmTagWizardPg1; });
+        row("frmMatchWithSongcase", [] { return new frmMatchWithSongcase; });
+    }
+    void modalScreens()
+    {
+        QFETCH(std::function<Form *()>, make);
+        start(languageDutch);
+        CddbUserProfile profile;
+        profile.registered = true;
+        profile.store();
+        Form *form = make();
+        mDesktop->expectModal(form->Name(), [](Form &shown) {
+            QCOMPARE(outside(shown), QString());
+            shown.Unload();
+        });
+        form->ShowModal();
     }
 
     void aMaximizedFrameStaysSo()
