@@ -206,6 +206,8 @@ void MainScreen::Timer1_Timer()
     show();
     placeOnScreen(this, pos(), QMainWindow::size()); // with what is now drawn around it
     offerConversion(mStart.conversionPending);
+    if (mUnloaded)
+        return; // the session has ended meanwhile
     openBrowser();
     if (mStart.session == 1)
         ShowHelpLinks();

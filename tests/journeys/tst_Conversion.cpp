@@ -69,6 +69,15 @@ private slots:
         QVERIFY2(run(), "a second offer would fail the test");
     }
 
+    void sessionEndsWhileItIsOffered()
+    {
+        prepare(languageEnglish);
+        writeFile(mDesktop->folder + u"/Compact3.orv"_s, "x");
+        mDesktop->expectModal(u"frmAutoUpdateUtility"_s, [&](Form &) { mProgram->end(); });
+        run();
+        QVERIFY(!mProgram->screen("frmCDList"));
+    }
+
     void fromTheMenu_data() { languages(); }
     void fromTheMenu()
     {
