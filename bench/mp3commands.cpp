@@ -86,6 +86,7 @@ void openCollection(const QStringList &arguments)
     std::printf("open_kib=%ld\n", peakMemory());
     std::printf("scroll: longest=%.4f\n", longestStep(*editor));
     editor->Unload();
+    QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
     CollectionRows rows;
     rows.load(id);
     measured("save", [&] {

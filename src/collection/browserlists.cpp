@@ -1,5 +1,6 @@
 #include "collection/browserlists.h"
 
+#include "mp3/collections.h"
 #include "services/globals.h"
 
 using namespace Qt::StringLiterals;
@@ -93,6 +94,7 @@ void deleteTitle(qint64 id)
 void deleteMP3Collection(qint64 id)
 {
     executeBoth(deleteFilesOf(id), deleteCollectionRow(id));
+    collections::tellDeleted(id);
 }
 
 } // namespace browserlists

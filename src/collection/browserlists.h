@@ -14,6 +14,6 @@ qint64 trackCount();
 
 /// Deletes a title with its discs, in one transaction; its tracks and artists are CleanOrphans'.
 void deleteTitle(qint64 id);
-void deleteMP3Collection(qint64 id);
+void deleteMP3Collection(qint64 id); // an editor that is open on it knows
 
 } // namespace browserlists

@@ -159,10 +159,11 @@ void CollectionRows::arrange(const std::vector<std::uint32_t> &order)
 
 void CollectionRows::setFileName(const QString &volgnummer, const QString &fileName)
 {
+    const ADODB::Value wanted(volgnummer.toLongLong());
     if (count() > 0)
         WorkingRecords->MoveFirst();
     for (std::size_t row = 0; !WorkingRecords->isEOF(); WorkingRecords->MoveNext(), ++row) {
-        if (WorkingRecords->Fields(volgnummerColumn).Value().toText() != volgnummer)
+        if (WorkingRecords->Fields(volgnummerColumn).Value() != wanted)
             continue;
         WorkingRecords->Fields(nameColumn).setValue(fileName);
         mFiles[row] = {};

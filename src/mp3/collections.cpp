@@ -18,6 +18,16 @@ void show(const QString &mode, qint64 collection)
     editor->Show();
 }
 
+frmCDRootMP3 *find(qint64 collection)
+{
+    for (Form *form : Form::openForms()) {
+        auto *editor = qobject_cast<frmCDRootMP3 *>(form);
+        if (editor && editor->holds(collection))
+            return editor;
+    }
+    return nullptr;
+}
+
 } // namespace
 
 void open()
@@ -27,14 +37,16 @@ void open()
 
 void edit(qint64 collection)
 {
-    for (Form *form : Form::openForms()) {
-        auto *editor = qobject_cast<frmCDRootMP3 *>(form);
-        if (editor && editor->holds(collection)) {
-            editor->Show();
-            return;
-        }
-    }
-    show(u"U"_s, collection);
+    if (frmCDRootMP3 *editor = find(collection))
+        editor->Show();
+    else
+        show(u"U"_s, collection);
+}
+
+void tellDeleted(qint64 collection)
+{
+    if (frmCDRootMP3 *editor = find(collection))
+        editor->collectionDeleted();
 }
 
 } // namespace collections

@@ -10,4 +10,7 @@ namespace collections
 void open();
 void edit(qint64 collection);
 
+/// The catalogue has this collection no longer: its editor says so.
+void tellDeleted(qint64 collection);
+
 } // namespace collections

@@ -146,6 +146,12 @@ void frmCDRootMP3::LoadCollection()
     LoadedTitle = mUi->txtTitel->text();
 }
 
+void frmCDRootMP3::collectionDeleted()
+{
+    mStored.reset();
+    setWindowTitle(windowTitle() + u" - "_s + GetMessage("xDeletedMark"));
+}
+
 // Blanks around a folder's name do not count, as DirExists has it.
 QString frmCDRootMP3::folder() const
 {
@@ -417,7 +423,7 @@ bool frmCDRootMP3::write(const collectionstore::Header &header)
     const auto isThere = [this] {
         return mStored && collectionstore::header(CollectionId) == mStored;
     };
-    if (!isNew && (headerChanged || rowsChanged) && !isThere()) {
+    if (!isNew && (headerChanged || rowsChanged || !mStored) && !isThere()) {
         transaction.RollbackTrans();
         Mode = modeNew;
         errorBox(GetMessage("xOtherCollection"));

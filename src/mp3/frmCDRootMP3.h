@@ -34,6 +34,8 @@ public:
     /// Whether this is the editor of a stored collection.
     bool holds(qint64 collection) const { return Mode != u"I" && CollectionId == collection; }
 
+    void collectionDeleted(); // by somebody else: a save will make a new one
+
     bool HasRecordSetChanged() const { return mRows.haveChanged(); }
 
     /// Shows the rows, with what is on the disk now. To be called after every change of them.

@@ -43,15 +43,17 @@ std::vector<int> frmCDRootMP3::selectedRows() const
     return rows;
 }
 
+// In one piece: there may be very many.
 void frmCDRootMP3::selectAdded()
 {
-    auto items = mUi->TheMP3Collection->ListItems();
-    const int count = items.Count();
-    if (AddedCount == 0 || AddedCount > count)
+    DBListViewCTL &list = *mUi->TheMP3Collection;
+    const int count = list.ListItems().Count(), first = count - AddedCount;
+    if (AddedCount == 0 || first < 0)
         return;
-    mUi->TheMP3Collection->setSelectedItem(items.Item(count - AddedCount + 1));
-    for (int index = count - AddedCount + 2; index <= count; ++index)
-        items.Item(index).setSelected(true);
+    const QItemSelection added(list.model()->index(first, 0),
+                               list.model()->index(count - 1, list.model()->columnCount() - 1));
+    list.setSelectedItem(list.ListItems().Item(first + 1));
+    list.selectionModel()->select(added, QItemSelectionModel::Select);
 }
 
 // All that is selected is shown as far as there is room, the row of the cursor in any case.
@@ -209,7 +211,8 @@ void frmCDRootMP3::appendNames(const QStringList &names)
     }
     const qsizetype twice = names.size() - fresh.size();
     const bool leaveOut =
-        twice > 0 && askYesNo(QString::number(twice) + GetMessage("xFilesTwice")) == vbYes;
+        twice > 0 && askYesNo(GetMessage("xFilesTwicePart1") + QString::number(twice) +
+                              GetMessage("xFilesTwicePart2")) == vbYes;
     const QStringList &added = leaveOut ? fresh : names;
     mRows.append(added);
     AddedCount += int(added.size());

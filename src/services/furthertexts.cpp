@@ -292,7 +292,8 @@ const Message furtherTexts[] = {
     {"xPreviewNames", "Pre&view", "V&oorbeeld"},
     {"xReadingTags", "Reading the tags of the files...", "De tags van de bestanden worden gelezen..."},
     {"xScanning", "Looking for MP3 files...", "Er wordt naar MP3-bestanden gezocht..."},
-    {"xFilesTwice", " of these files are in the list already. Would you like to leave them out?", " van deze bestanden staan al in de lijst. Wilt u die overslaan?"},
+    {"xFilesTwicePart1", "Files that are in the list already: ", "Bestanden die al in de lijst staan: "},
+    {"xFilesTwicePart2", ". Would you like to leave them out?", ". Wilt u die overslaan?"},
     {"xTagsUnreadable", "These files cannot be read, so that their tags are not shown:", "Deze bestanden kunnen niet worden gelezen. Hun tags worden daarom niet getoond:"},
     {"xOtherCollection", "This collection has been deleted or changed by somebody else meanwhile. Nothing was saved. Press Ready once more to save it as a new one.", "Deze collectie is intussen door iemand anders verwijderd of gewijzigd. Er is niets opgeslagen. Klik nogmaals op Gereed om haar als nieuwe collectie op te slaan."},
 };

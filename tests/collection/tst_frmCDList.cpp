@@ -245,6 +245,9 @@ private slots:
                 open.append(editor->Mode + QString::number(editor->CollectionId));
         }
         QCOMPARE(open, texts("U2", "I-999", "I-999"));
+        mDesktop->expectBox(u"delete this MP3 collection"_s, vbYes);
+        control<QPushButton>("cmdDelete")->click();
+        QVERIFY(Form::openForms()[1]->windowTitle().endsWith(u"First - deleted"_s));
     }
 
     void aLargePageIsReadWhenItIsLookedAt()

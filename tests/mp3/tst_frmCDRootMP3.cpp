@@ -147,12 +147,14 @@ private slots:
         press("cmdScan");
         QCOMPARE(files(), u"19.mp3 210.mp3 3x/y.MP3"_s);
         QCOMPARE(selected(), u"123"_s);
+        list()->setColumnWidth(1, 321);
         put(u"11.mp3"_s);
-        mDesktop->expectBox(u"3 of these files are in the list already"_s, vbYes);
+        mDesktop->expectBox(u"in the list already: 3. Would"_s, vbYes);
         press("cmdScan");
         QCOMPARE(files(), u"19.mp3 210.mp3 3x/y.MP3 411.mp3"_s);
         QCOMPARE(selected(), u"4"_s);
-        mDesktop->expectBox(u"4 of these files are in the list already"_s, vbNo);
+        QCOMPARE(list()->columnWidth(1), 321);
+        mDesktop->expectBox(u"in the list already: 4. Would"_s, vbNo);
         press("cmdScan");
         QCOMPARE(list()->ListItems().Count(), 8);
     }

@@ -65,6 +65,12 @@ qsizetype Pieces::taken() const
 
 Pieces::~Pieces()
 {
+    stop();
+}
+
+// Nothing more is begun, and nobody is told of what ends.
+void Pieces::stop()
+{
     mShared->stop.request_stop();
     const std::lock_guard lock(mShared->mutex);
     mShared->tell = nullptr;
@@ -105,6 +111,7 @@ bool Pieces::run(const std::function<void()> &takeOver)
     for (std::size_t i = 0; i < std::min<std::size_t>(threads, mShared->done.size()); ++i)
         std::thread(work, mShared).detach();
     const bool done = mWait.run();
+    stop(); // before what is told to goes
     if (done && failure)
         std::rethrow_exception(failure);
     return done;

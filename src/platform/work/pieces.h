@@ -16,7 +16,7 @@ public:
     using Make = std::function<void(qsizetype number, std::stop_token stop)>;
 
     Pieces(qsizetype count, const Make &make, Wait &wait);
-    ~Pieces(); // nothing more is begun
+    ~Pieces();
     Pieces(const Pieces &) = delete;
     Pieces &operator=(const Pieces &) = delete;
 
@@ -29,6 +29,7 @@ public:
 
 private:
     struct Shared;
+    void stop();
     static void work(const std::shared_ptr<Shared> &shared);
 
     std::shared_ptr<Shared> mShared;
