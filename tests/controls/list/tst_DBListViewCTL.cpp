@@ -35,9 +35,9 @@ RecordsetPtr recordset(const QStringList &fields, const QStringList &rows)
 
 RecordsetPtr discs()
 {
-    return recordset({u"Id"_s, u"Artiest"_s, u"Titel"_s},
-                     {u"11|Queen|Jazz"_s, u"9|abba|Arrival"_s, u"30|Édith Piaf|Milord"_s,
-                      u"4|ABBA|Waterloo"_s, u"5|Edwin Starr|War"_s});
+    return recordset(texts("Id", "Artiest", "Titel"),
+                     texts("11|Queen|Jazz", "9|abba|Arrival", "30|Édith Piaf|Milord",
+                           "4|ABBA|Waterloo", "5|Edwin Starr|War"));
 }
 
 RecordsetPtr manyDiscs(int count)
@@ -45,7 +45,7 @@ RecordsetPtr manyDiscs(int count)
     QStringList rows;
     for (int i = 1; i <= count; ++i)
         rows.append(u"%1|Artist %2|Title"_s.arg(i).arg(i % 7));
-    return recordset({u"Id"_s, u"Artiest"_s, u"Titel"_s}, rows);
+    return recordset(texts("Id", "Artiest", "Titel"), rows);
 }
 
 /// The ids of the rows as shown; those of selected ones with a "*", the current one with a "<".
@@ -74,11 +74,6 @@ struct ShownList : DBListViewCTL {
         if (!QTest::qWaitForWindowActive(this))
             QTest::qFail("The list did not become active", __FILE__, __LINE__);
     }
-    void widen(int width) // so that it can scroll sideways
-    {
-        ColumnHeaders().Item(3).setWidth(width);
-        updateGeometries();
-    }
     QPoint centreOf(int index) const
     {
         const int row = index - 1;
@@ -102,7 +97,6 @@ private slots:
     void populatesAnew()
     {
         ShownList list;
-        list.ColumnHeaders().Item(2).setText(u"Artist"_s);
         list.ListItems().Item(2).setBold(true);
         list.setSelectedItem(list.ListItems().Item(4));
         list.setSortKey(2);
@@ -112,7 +106,6 @@ private slots:
         QVERIFY(!list.Sorted() && !list.ListItems().Item(2).Bold());
         QVERIFY(!list.ListItems().Item(0) && !list.ListItems().Item(6));
         QVERIFY(list.ColumnHeaders().Item(1).Width() > 0);
-        QCOMPARE(list.ColumnHeaders().Item(2).Text(), u"Artiest"_s);
 
         list.setRecordset(manyDiscs(300));
         list.Populate();
@@ -133,10 +126,10 @@ private slots:
             list.setSorted(true);
             list.setSortKey(7);
             for (const auto key :
-                 {Qt::Key_Down, Qt::Key_End, Qt::Key_PageUp, Qt::Key_Space, Qt::Key_B})
+                 {Qt::Key_Down, Qt::Key_PageUp, Qt::Key_Space, Qt::Key_A, Qt::Key_C}) {
                 QTest::keyClick(&list, key);
-            for (const auto key : {Qt::Key_A, Qt::Key_C})
                 QTest::keyClick(&list, key, Qt::ControlModifier);
+            }
             list.grab();
             QCOMPARE(bool(list.SelectedItem()), !rows.isEmpty());
         }
@@ -154,8 +147,6 @@ private slots:
         rs->Delete();
         list.ListItems().Item(2).setSubItems(1, u"Written"_s);
         QCOMPARE(list.ListItems().Item(1).SubItems(1), u"Queen"_s);
-        list.setSorted(true);
-        QCOMPARE(shown(list), u"4 5 9 11*< 30"_s);
         list.Populate();
         QCOMPARE(list.ListItems().Count(), 4);
         QCOMPARE(list.ListItems().Item(1).SubItems(1), u"Changed"_s);
@@ -191,23 +182,14 @@ private slots:
         QCOMPARE(list.horizontalHeader()->sortIndicatorSection(), -1);
     }
 
-    void sortsOnce()
-    {
-        ShownList list;
-        list.setSortKey(2);
-        QSignalSpy ordered(list.model(), &QAbstractItemModel::layoutChanged);
-        list.sortBy(1);
-        QCOMPARE(ordered.size(), 1);
-        list.sortBy(1);
-        QCOMPARE(ordered.size(), 1);
-        QVERIFY(list.Sorted() && list.SortKey() == 1);
-    }
-
     // The order of the rows is kept if they come again; what was written over them is not.
     void sortsRowsThatComeAgain()
     {
         ShownList list;
+        QSignalSpy ordered(list.model(), &QAbstractItemModel::layoutChanged);
         list.sortBy(1);
+        list.sortBy(1);
+        QCOMPARE(ordered.size(), 1); // sorted once
         for (const QString &written : {QString(), u"Zappa"_s, QString()}) {
             if (!written.isEmpty())
                 list.ListItems().Item(1).setSubItems(1, written);
@@ -216,12 +198,10 @@ private slots:
             list.sortBy(1);
             QCOMPARE(shown(list), u"9 4 30 5 11*<"_s);
         }
-        list.setRecordset(recordset({u"Id"_s, u"Artiest"_s, u"Titel"_s},
-                                    {u"11|Abba|Jazz"_s, u"9|Zappa|Arrival"_s, u"30|Eno|Milord"_s,
-                                     u"4|Devo|Waterloo"_s, u"5|B-52's|War"_s}));
+        list.setRecordset(recordset(texts("Id", "Artiest"), texts("11|Zappa", "9|Eno", "30|Abba")));
         list.Populate();
         list.sortBy(1);
-        QCOMPARE(shown(list), u"11*< 5 4 30 9"_s);
+        QCOMPARE(shown(list), u"30 9 11*<"_s);
     }
 
     void writesFollowTheRecord()
@@ -229,17 +209,14 @@ private slots:
         ShownList list;
         const ListItem piaf = list.ListItems().Item(3);
         piaf.setSubItems(1, u"Zappa"_s);
-        piaf.setBold(true);
         piaf.setForeColor(Qt::red);
         piaf.setChecked(true);
         list.setSorted(true);
         list.setSortKey(1);
         QCOMPARE(shown(list), u"9 4 5 11*< 30"_s);
-        QCOMPARE(piaf.Index(), 5);
         const ListItem last = list.ListItems().Item(5);
-        QVERIFY(last.SubItems(1) == u"Zappa" && last.Checked());
+        QVERIFY(piaf.Index() == 5 && last.SubItems(1) == u"Zappa" && last.Checked());
         const QModelIndex cell = list.model()->index(4, 1);
-        QVERIFY(cell.data(Qt::FontRole).value<QFont>().bold());
         QCOMPARE(cell.data(Qt::ForegroundRole).value<QColor>(), QColor(Qt::red));
         last.setSubItems(1, QString());
         QCOMPARE(piaf.Index(), 5); // sorting again moves it, writing does not
@@ -266,42 +243,39 @@ private slots:
     {
         // told: key code and shift; empty: the key is not the list's
         // taken: by the list, from the screen
-        const DataRows<int, Qt::KeyboardModifiers, QVariantList, bool> row("key", "modifiers",
-                                                                           "told", "taken");
-        row("Delete", Qt::Key_Delete, {}, {46, 0}, false);
-        row("Insert", Qt::Key_Insert, {}, {45, 0}, false);
-        row("Ctrl+Insert", Qt::Key_Insert, Qt::ControlModifier, {}, false);
-        row("Enter of the number block", Qt::Key_Enter, Qt::KeypadModifier, {13, 0}, false);
-        row("Esc", Qt::Key_Escape, {}, {27, 0}, false);
-        row("F8", Qt::Key_F8, {}, {}, false);
-        row("Tab", Qt::Key_Tab, {}, {9, 0}, false);
-        row("Shift+Up", Qt::Key_Up, Qt::ShiftModifier, {38, 1}, true);
-        row("Ctrl+Alt+PgDn", Qt::Key_PageDown, Qt::ControlModifier | Qt::AltModifier, {34, 6},
-            true);
-        row("letter", Qt::Key_Q, {}, {81, 0}, true);
-        row("Ctrl+Z", Qt::Key_Z, Qt::ControlModifier, {90, 2}, false);
+        const DataRows<QString, QVariantList, bool> row("keys", "told", "taken");
+        row("Del", {46, 0}, false);
+        row("Ins", {45, 0}, false);
+        row("Ctrl+Ins", {}, false);
+        row("Num+Enter", {13, 0}, false);
+        row("Esc", {27, 0}, false);
+        row("F8", {}, false);
+        row("Tab", {9, 0}, false);
+        row("Shift+Up", {38, 1}, true);
+        row("Ctrl+Alt+PgDown", {34, 6}, true);
+        row("Q", {81, 0}, true);
+        row("Ctrl+Z", {90, 2}, false);
     }
 
     void tellsKeys()
     {
-        QFETCH(int, key);
-        QFETCH(Qt::KeyboardModifiers, modifiers);
+        QFETCH(QString, keys);
         QFETCH(QVariantList, told);
         ShownList list;
         list.setSelectedItem(list.ListItems().Item(2));
         QSignalSpy down(&list, &DBListViewCTL::KeyDown), up(&list, &DBListViewCTL::KeyUp);
-        const QString text = key == Qt::Key_Q        ? u"q"_s
-                             : key == Qt::Key_Delete ? u"\x7f"_s
-                                                     : QString();
-        QKeyEvent press(QEvent::KeyPress, key, modifiers, text);
-        QApplication::sendEvent(&list, &press);
-        QTEST(press.isAccepted(), "taken");
+        const QKeyCombination key = QKeySequence(keys)[0];
+        const QString text = keys == u"Q" ? u"q"_s : keys == u"Del" ? u"\x7f"_s : QString();
+        const auto send = [&](QEvent::Type type, bool repeated = false) {
+            QKeyEvent event(type, key.key(), key.keyboardModifiers(), text, repeated);
+            QApplication::sendEvent(&list, &event);
+            return event.isAccepted();
+        };
+        QTEST(send(QEvent::KeyPress), "taken");
         QCOMPARE(down.value(0), told);
-        QKeyEvent repeated(QEvent::KeyRelease, key, modifiers, text, true);
-        QApplication::sendEvent(&list, &repeated);
+        send(QEvent::KeyRelease, true);
         QCOMPARE(up.count(), 0);
-        QKeyEvent release(QEvent::KeyRelease, key, modifiers, text);
-        QApplication::sendEvent(&list, &release);
+        send(QEvent::KeyRelease);
         QCOMPARE(up.value(0), told);
     }
 
@@ -341,11 +315,10 @@ private slots:
         QCOMPARE(list.horizontalHeader()->sortIndicatorSection(), -1);
         list.setSorted(true);
         connect(&list, &DBListViewCTL::ColumnClick, &list, [&](int n) { list.setSortKey(n - 1); });
-        for (int i = 0; i < 2; ++i) { // ascending each time
-            clickHead(1);
-            QCOMPARE(shown(list), u"9 4 30 5 11*<"_s);
-            QCOMPARE(list.horizontalHeader()->sortIndicatorOrder(), Qt::AscendingOrder);
-        }
+        clickHead(1);
+        clickHead(1); // ascending each time
+        QCOMPARE(shown(list), u"9 4 30 5 11*<"_s);
+        QCOMPARE(list.horizontalHeader()->sortIndicatorOrder(), Qt::AscendingOrder);
         QTest::keyClick(&list, Qt::Key_2, Qt::ControlModifier); // the second column that shows
         QCOMPARE(clicks.last(), QVariantList{3});
     }
@@ -355,7 +328,6 @@ private slots:
         ShownList list;
         list.click(3);
         list.click(3, Qt::ControlModifier); // the only one stays
-        QCOMPARE(shown(list), u"11 9 30*< 4 5"_s);
         QTest::keyClick(&list, Qt::Key_Space, Qt::ControlModifier);
         QCOMPARE(shown(list), u"11 9 30*< 4 5"_s);
         list.click(5, Qt::ControlModifier);
@@ -442,16 +414,15 @@ private slots:
         QVERIFY(list.ListItems().Item(3).Checked());
         QCOMPARE(checks.value(0).value(0).value<ListItem>().Text(), u"30"_s);
         QCOMPARE(shown(list), u"11*< 9 30 4 5"_s); // the selection is not touched
-        QTest::mouseClick(list.viewport(), Qt::LeftButton, {}, list.boxOf(3));
         QTest::mouseDClick(list.viewport(), Qt::LeftButton, {}, list.boxOf(3));
-        QCOMPARE(checks.count(), 3); // each press counts
+        QCOMPARE(checks.count(), 2); // each press counts
         QCOMPARE(clicks.count(), 0);
         list.click(2); // beside the box
         QVERIFY(!list.ListItems().Item(2).Checked());
         QTest::keyClick(&list, Qt::Key_Space);
         QVERIFY(list.ListItems().Item(2).Checked());
         list.ListItems().Item(2).setChecked(false);
-        QCOMPARE(checks.count(), 4); // not for the screen itself
+        QCOMPARE(checks.count(), 3); // not for the screen itself
     }
 
     void dragsRows()
@@ -462,12 +433,10 @@ private slots:
             if (button == 2)
                 list.Drag(1);
         });
-        connect(&list, &DBListViewCTL::DragOver, &list,
-                [&](QObject *source, int x, int y, int state) {
-                    list.setDropHighlight(list.HitTest(x, y));
-                    told.append(u"over %1 %2"_s.arg(list.HitTest(x, y).Text()).arg(state));
-                    QCOMPARE(source, &list);
-                });
+        connect(&list, &DBListViewCTL::DragOver, &list, [&](QObject *, int x, int y, int state) {
+            list.setDropHighlight(list.HitTest(x, y));
+            told.append(u"over %1 %2"_s.arg(list.HitTest(x, y).Text()).arg(state));
+        });
         connect(&list, &DBListViewCTL::DragDrop, &list, [&](QObject *, int x, int y) {
             list.Drag(2);
             told.append(u"drop "_s + list.HitTest(x, y).Text());
@@ -478,9 +447,8 @@ private slots:
             QTest::mouseMove(list.viewport(), at);
         QTest::mouseRelease(list.viewport(), Qt::RightButton, {}, list.centreOf(5));
         QCOMPARE(told, texts("over 30 0", "over 4 2", "over  1", "over 5 0", "drop 5"));
-        list.click(1); // all over: an ordinary click
-        QCOMPARE(told.size(), 5);
-        QCOMPARE(shown(list), u"11*< 9 30 4 5"_s);
+        list.click(3); // all over: an ordinary click
+        QCOMPARE(shown(list), u"11 9 30*< 4 5"_s);
     }
 
     void dragEndsWithoutDrop()
@@ -549,7 +517,6 @@ private slots:
         const QString id = list.SelectedItem().Text();
         list.setSortKey(0);
         QVERIFY(list.SelectedItem().Text() == id && list.SelectedItem().Selected());
-        QCOMPARE(list.selectionModel()->selection().size(), 1);
         // Fewer stay, and go at once.
         list.setSortKey(1);
         select(10000, QItemSelectionModel::ClearAndSelect);

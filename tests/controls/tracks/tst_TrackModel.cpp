@@ -49,13 +49,11 @@ private slots:
         // cells: "|" between cells, "/" between lines
         const DataRows<QString, QString> row("clipboard", "cells");
         row("a\tb\nc\td\n", "a|b/c|d");
-        row("a\r\nb\rc", "a/b/c");
-        row("a\n\nb", "a//b");
+        row("a\r\nb\r\rc", "a/b//c");
         row("\"Heroes\"\tx", "\"Heroes\"|x");
         row("\"two\nlines\"\tx", "two\nlines|x");
         row("\"tab\tin\"\n\"a \"\"b\"\"\"", "tab\tin/a \"b\"");
         row("\"open\tx", "\"open|x");
-        row("7\" single\tx", "7\" single|x");
     }
 
     void parts()

@@ -66,11 +66,10 @@ private slots:
 
     void loads()
     {
-        mCatalogue->exec(
-            QStringLiteral("update compactdiscs set trackno = 7 where id = 10;"
-                           "insert into compactdiscs values (20,1,1,2,99,NULL);" // to no track
-                           "insert into tracks values (4,99,'Lost','',1990);"    // of no artist
-                           "insert into compactdiscs values (21,1,1,9,4,NULL)"));
+        mCatalogue->exec("update compactdiscs set trackno = 7 where id = 10;"
+                         "insert into compactdiscs values (20,1,1,2,99,NULL);" // to no track
+                         "insert into tracks values (4,99,'Lost','',1990);"    // of no artist
+                         "insert into compactdiscs values (21,1,1,9,4,NULL)");
         QStringList lines;
         for (const StoredTrack &track : TrackStore(*gConnection, 1, 1, Artists::OfTracks).load())
             lines.append(QString::number(track.linkId) + u' ' +
@@ -101,18 +100,15 @@ private slots:
         row("title to a new one", type(1, TitleField, "Chiquitita"), "+Tracks 4;CompactDiscs 11");
         row("song to one that is there", add(2, "Abba", "Waterloo"), "CompactDiscs 12");
         row("spelling of the title", type(1, TitleField, "Sos"), "Tracks 2");
-        row("artist to a new one", type(2, ArtistField, "O'Neil"),
-            "+Artiesten 3;+Tracks 4;CompactDiscs 12");
         row("artist to one that is there", type(2, ArtistField, "ABBA"),
             "+Tracks 4;CompactDiscs 12");
         row("a known song at the end", add(3, "Beck", "Loser"), "+CompactDiscs 16");
         row("two new songs of a new artist",
-            both(add(3, "Cher", "Believe"), add(4, "cher", "One by One")),
+            both(add(3, "O'Neil", "Believe"), add(4, "o'neil", "One by One")),
             "+Artiesten 3;+Tracks 4;+CompactDiscs 16;+Tracks 5;+CompactDiscs 17");
         row("a row put in", both(insert, add(1, "Beck", "Loser")),
             "+CompactDiscs 16;CompactDiscs 11;CompactDiscs 12");
         row("an empty row put in", insert, "");
-        row("the last row deleted", remove(2), "-CompactDiscs 12");
         row("the first row deleted", remove(0), "-CompactDiscs 10;CompactDiscs 11;CompactDiscs 12");
     }
 
@@ -123,13 +119,9 @@ private slots:
         const auto outcome = save(edit);
         QTEST(mCatalogue->rows("select what from seen").join(u';'), "writes");
         QVERIFY(!outcome.refused && outcome.keptValues.isEmpty());
-        QStringList numbers;
-        for (qsizetype i = 1; i <= outcome.linkIds.size(); ++i)
-            numbers.append(QString::number(i));
-        QCOMPARE(
-            mCatalogue->rows("select trackno from compactdiscs where cdtitels_id=1 and diskno=1 "
-                             "order by trackno"),
-            numbers);
+        const auto numbers = mCatalogue->rows(
+            "select trackno from compactdiscs where cdtitels_id=1 and diskno=1 order by trackno");
+        QCOMPARE(numbers, texts("1", "2", "3", "4", "5").mid(0, outcome.linkIds.size()));
     }
 
     void valuesOfAFoundTrack_data()
@@ -141,7 +133,6 @@ private slots:
         row("Abba|Waterloo|Pop|1974", "1|1|Waterloo|Pop|1974", "");
         row("Abba|Waterloo||", "1|1|Waterloo|Pop|1974", ""); // nothing said, nothing lost
         row("Abba|Waterloo|Rock|1974", "1|1|Waterloo|Pop|1974", "values");
-        row("Abba|Waterloo|Pop|1975", "1|1|Waterloo|Pop|1974", "values");
         row("Abba|WATERLOO|Pop|1974", "1|1|Waterloo|Pop|1974", "values");
         row("ABBA|Waterloo|Pop|1974", "1|1|Waterloo|Pop|1974", "artists");
         row("Abba|SOS|Rock|1e10", "2|1|SOS|Rock|10000000000", "");
@@ -192,21 +183,21 @@ private slots:
 
     void albums()
     {
-        const auto add = [](TrackModel &m) { m.setText(1, TitleField, u"sos"_s); };
-        auto outcome = save(add, 3, 1, Artists::OfTitle);
+        const auto saveTitle = [this](int row, const QString &title) {
+            return save([&](TrackModel &m) { m.setText(row, TitleField, title); }, 3, 1,
+                        Artists::OfTitle);
+        };
+        const auto outcome = saveTitle(1, u"sos"_s);
         QCOMPARE(outcome.linkIds, (QList<qint64>{15, 16}));
         QCOMPARE(mCatalogue->rows("select track_id from compactdiscs where id=16"), texts("2"));
         QCOMPARE(outcome.keptValues, QList<qsizetype>{1});
         // Two rows of that title: neither is taken.
         mCatalogue->exec("insert into tracks values (8,1,'Fernando',NULL,NULL),"
                          "(9,1,'fernando','x',NULL)");
-        save([](TrackModel &m) { m.setText(0, TitleField, u"Fernando"_s); }, 3, 1,
-             Artists::OfTitle);
+        saveTitle(0, u"Fernando"_s);
         QCOMPARE(mCatalogue->rows("select track_id from compactdiscs where id=15"), texts("10"));
         mCatalogue->exec("update cdtitels set artiest_id = NULL where id = 3");
-        outcome =
-            save([](TrackModel &m) { m.setText(0, TitleField, u"x"_s); }, 3, 1, Artists::OfTitle);
-        QVERIFY(outcome.refused);
+        QVERIFY(saveTitle(0, u"x"_s).refused);
     }
 
     // The title was deleted while it was being edited, and the screen has put it back.
@@ -231,9 +222,8 @@ private slots:
         mCatalogue->exec("insert into compactdiscs values (30,1,4,1,1,NULL)");
         TrackStore(*gConnection, 1, 1, Artists::OfTracks).remove();
         TrackStore(*gConnection, 1, 2, Artists::OfTracks).remove(); // not in the catalogue
-        QCOMPARE(mCatalogue->rows("select id, diskno from compactdiscs where cdtitels_id=1"),
-                 texts("13|1", "30|2"));
-        QCOMPARE(mCatalogue->count("select count(*) from compactdiscs"), 4);
+        QCOMPARE(mCatalogue->rows("select id, diskno from compactdiscs order by id"),
+                 texts("13|1", "14|1", "15|1", "30|2"));
     }
 
     void completes()
