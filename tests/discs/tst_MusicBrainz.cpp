@@ -8,8 +8,6 @@
 namespace
 {
 
-const QString various = u"89ad4ac3-39f7-470e-963a-56509c546377"_s;
-
 // JSON is written with ' for ".
 QByteArray json(QByteArray text)
 {
@@ -96,7 +94,6 @@ private slots:
         const DataRows<QByteArray> row("answer");
         row("empty", "");
         row("cut", whole.chopped(1));
-        row("HTML", "<html>");
         row("a list", "[" + whole + "]");
         row("an error", "{'error':'Not Found'}");
         row("releases null", "{'releases':null}");
@@ -149,14 +146,10 @@ private slots:
             found({release("First", {medium(1, {}), medium(2, {}, table)}),
                    release("Nothing", {medium(1, {})}), release("Count", {medium(1, {"{}"})})});
         QCOMPARE(namesOf(discsOf({first, second})), u"First 2/2, Second 1/1"_s);
-    }
-
-    void dataBehindDoesNotCount()
-    {
-        TableOfContents toc = three;
-        toc.tracks.push_back({1500 + 11400, true});
-        toc.leadOut = 20000;
-        QCOMPARE(namesOf(discsOf({found({release("A", {near(0)})})}, toc)), u"A 1/1"_s);
+        TableOfContents dataBehind = three;
+        dataBehind.tracks.push_back({1500 + 11400, true});
+        dataBehind.leadOut = 20000;
+        QCOMPARE(namesOf(discsOf({found({release("A", {near(0)})})}, dataBehind)), u"A 1/1"_s);
     }
 
     void pages_data()
@@ -186,36 +179,26 @@ private slots:
         QCOMPARE(disc.tracks.at(1).length, -1);
     }
 
-    void years_data()
+    void yearsAndGenres_data()
     {
-        const DataRows<QByteArray, QString> row("fields", "year");
-        row("of the music", "'date':'1984','release-group':{'first-release-date':'1977-02'}",
-            "1977");
-        row("of the issue", "'date':'1984-05-17','release-group':{'first-release-date':''}",
-            "1984");
-        row("unknown", "'date':'?-05'", "");
-        row("no date", "'date':null", "");
-    }
-    void years()
-    {
-        QFETCH(QByteArray, fields);
-        QTEST(only(release("T", {near(0)}, ',' + fields)).year, "year");
-    }
-
-    void genres_data()
-    {
+        const DataRows<QByteArray, QString> row("fields", "said");
+        row("of the music", ",'date':'1984','release-group':{'first-release-date':'1977-02'}",
+            "1977 ");
+        row("of the issue", ",'date':'1984-05-17','release-group':{'first-release-date':''}",
+            "1984 ");
+        row("unknown", ",'date':'?-05'", " ");
+        row("no date", ",'date':null", " ");
         const QByteArray group = ",'release-group':{'genres':[{'name':'folk','count':9}]}";
-        const DataRows<QByteArray, QString> row("fields", "genre");
         row("most votes", ",'genres':[{'name':'pop','count':1},{'name':'hip hop','count':3}]",
-            "Hip-Hop");
-        row("of the group", ",'genres':[]" + group, "Folk");
-        row("unusual", ",'genres':[{'name':'americana'}]" + group, "Americana");
-        row("none", "", "");
+            " Hip-Hop");
+        row("of the group", ",'genres':[]" + group, " Folk");
+        row("unusual", ",'genres':[{'name':'americana'}]" + group, " Americana");
     }
-    void genres()
+    void yearsAndGenres()
     {
         QFETCH(QByteArray, fields);
-        QTEST(only(release("T", {near(0)}, fields)).genre, "genre");
+        const DiscRecord disc = only(release("T", {near(0)}, fields));
+        QTEST(QString(disc.year + u' ' + disc.genre), "said");
     }
 
     void names_data()
@@ -248,8 +231,8 @@ private slots:
 
     void samplersAreKnownById()
     {
-        const QByteArray id = various.toUtf8();
-        const QByteArray byId = "[{'name':'Verschiedene','artist':{'id':'" + id + "'}}]";
+        const QByteArray byId = "[{'name':'Verschiedene','artist':"
+                                "{'id':'89ad4ac3-39f7-470e-963a-56509c546377'}}]";
         const QByteArray tracks = track(
             "a", 1, ",'artist-credit':[{'name':'X'}],'recording':{'first-release-date':'1965-01'}");
         const QByteArray credits = ",'artist-credit':" + byId;
@@ -284,16 +267,11 @@ private slots:
         QCOMPARE(disc.isWhole(), !disc.tracks.empty());
     }
 
-    void atMostAsManyAsADiscHas()
-    {
-        const QByteArrayList many(500, track("x", 1));
-        QCOMPARE(only(release("T", {medium(1, many)})).tracks.size(), 99u);
-    }
-
     void asksForOneMedium()
     {
-        const QByteArray answer = release("T", {medium(1, {}), medium(3, {track("x", 1)})});
-        QCOMPARE(titlesOf(only(answer, 3)), u"x"_s);
+        const QByteArrayList many(500, track("x", 1));
+        const QByteArray answer = release("T", {medium(1, {}), medium(3, many)});
+        QCOMPARE(only(answer, 3).tracks.size(), 99u); // as many as a disc has
         QVERIFY_THROWS_EXCEPTION(Error, only(answer, 2));
     }
 

@@ -15,14 +15,6 @@ DiscRecord read(const QByteArray &lines)
     return readXmcd(head + lines).disc;
 }
 
-QStringList titlesOf(const DiscRecord &disc)
-{
-    QStringList all;
-    for (const TrackRecord &track : disc.tracks)
-        all << track.title;
-    return all;
-}
-
 // "artist: title" of each track.
 QString creditsOf(const DiscRecord &disc)
 {
@@ -52,31 +44,24 @@ private slots:
     void text_data()
     {
         const DataRows<QByteArray, QString> row("lines", "title");
-        row("plain", "DTITLE=A / Title\n", "Title");
+        row("plain", "DTITLE=A / Title", "Title");
         row("line ends of Windows", "DTITLE=A / Title\r\nDYEAR=\r\n", "Title");
-        row("no line end", "DTITLE=A / Title", "Title");
         row("goes on in a word", "DTITLE=A / Ti\nDYEAR=1999\nDTITLE=tle\n", "Title");
         row("goes on in an escape", "DTITLE=A / T\\\nDTITLE=nle\n", "T le");
         row("goes on in a letter", "DTITLE=A / Caf\xC3\nDTITLE=\xA9\n", "Café");
         row("escapes", "DTITLE=A / a\\tb\\nc\\\\nd\\x\\\n", "a b c\\nd\\x\\");
         row("code page", "DTITLE=A / Caf\xE9 \x93x\x94\n", "Café “x”");
         row("code page of another line", "DTITLE=A / \xC3\xA9\nTTITLE0=\xE9\n", "Ã©");
-        row("signs of control",
-            QByteArray("DTITLE=A / a\x01\x7F"
-                       "b\0c\n",
-                       18),
-            "abc");
+        row("signs of control", QByteArray("DTITLE=A / a\x01\x7F\0c\n", 17), "ac");
         row("signs of direction", "DTITLE=A / \u202Ea\u202C \u2067b\u2069\n", "a b");
-        row("no sign", "DTITLE=Title\n", "Title");
+        row("no sign", "DTITLE=x=y\n", "x=y");
         row("a sign without blanks", "DTITLE=A/B / C / D\n", "C / D");
-        row("equal sign", "DTITLE=A / x=y\n", "x=y");
         row("byte order mark", "DTITLE=A / \xEF\xBB\xBFTitle\n", "Title");
     }
     void text()
     {
         QFETCH(QByteArray, lines);
-        QFETCH(QString, title);
-        QCOMPARE(read(lines).title, title);
+        QTEST(read(lines).title, "title");
     }
 
     void yearAndGenre_data()
@@ -93,9 +78,8 @@ private slots:
     void yearAndGenre()
     {
         QFETCH(QByteArray, lines);
-        QFETCH(QString, said);
         const DiscRecord disc = read("DTITLE=A / B\n" + lines);
-        QCOMPARE(disc.year + u' ' + disc.genre, said);
+        QTEST(QString(disc.year + u' ' + disc.genre), "said");
     }
 
     void comments_data()
@@ -129,7 +113,7 @@ private slots:
         const DiscRecord disc =
             read("DISCID=0200c902,, 0300c903\nDTITLE=A / B\nTTITLE01=x\nTTITLE1=b\nTTITLEx=y\n"
                  "EXTT0=note\nTTITLE=z\nPLAYORDER=2,1\n");
-        QCOMPARE(titlesOf(disc), texts("", "xb"));
+        QCOMPARE(creditsOf(disc), u"A: |A: xb"_s);
         QCOMPARE(disc.tracks[0].notes, u"note"_s);
         QCOMPARE(disc.discIds, texts("0200c902", "0300c903"));
         QCOMPARE(read("TTITLE98=last\n").tracks.size(), 99u);
@@ -141,7 +125,6 @@ private slots:
         const DataRows<QByteArray> row("record");
         row("empty", "");
         row("head alone", head);
-        row("HTML", "<html><a href=\"x\">y</a></html>\n");
         row("untitled", "DTITEL=x\nTTITLE0=\n");
         row("above 99", "DTITLE=A / B\nTTITLE99=x\n");
         row("far above", "DTITLE=A / B\nTTITLE99999999999=x\n");
@@ -176,7 +159,6 @@ private slots:
     {
         const QString thousand = QString(400, u'€') + u"\\" + QString(300, u'x');
         const DataRows<QString, QString, bool> row("artist", "title", "compilation");
-        row("plain", "A", "B", false);
         row("escapes", "A\\n", "B\\\\", false);
         row("long", thousand, thousand, false);
         row("sampler", "Various", "B / C", true);
@@ -198,8 +180,7 @@ private slots:
         disc.notes = title;
         for (TrackRecord &track : disc.tracks)
             track.artist.name = compilation ? u"X"_s : artist;
-        const TableOfContents toc = tocOf(2);
-        const QByteArray sent = writeXmcd(disc, toc, u"Songcase"_s, u"1.0"_s);
+        const QByteArray sent = writeXmcd(disc, tocOf(2), u"Songcase"_s, u"1.0"_s);
         for (const QByteArray &line : sent.split('\n'))
             QVERIFY(line.size() < 256);
         QCOMPARE(readXmcd(sent).disc, disc);
