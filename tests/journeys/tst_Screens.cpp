@@ -69,16 +69,14 @@ template <typename Screen> Make make()
     return [] { return new Screen; };
 }
 
-template <typename Editor> Make makeEditor()
+Form *makeCollectionEditor()
 {
-    return [] {
-        auto *editor = new Editor;
-        editor->Mode = u"I"_s;
-        return editor;
-    };
+    auto *editor = new frmCDRootMP3;
+    editor->Mode = u"I"_s;
+    return editor;
 }
 
-// Of a record of theCatalogue(): by design nobody leaves the empty year of a new one by Tab.
+// Of a record of Ground: by design nobody leaves the empty year of a new one by Tab.
 template <typename Editor> Make makeEditorOf(qint64 id)
 {
     return [id] {
@@ -170,13 +168,6 @@ Form *makeTagEditor()
     return editor;
 }
 
-void signUp()
-{
-    CddbUserProfile profile;
-    profile.registered = true;
-    profile.store();
-}
-
 Form *makeWhatCD()
 {
     auto *question = new frmWhatCD;
@@ -191,21 +182,11 @@ Form *makeRenamePreview()
     return new RenamePreview({{1, u"one.mp3"_s, name}});
 }
 
-Form *makePageSetupOf(const QPageLayout &paper)
+template <QPageLayout::Orientation orientation> Form *makePageSetup()
 {
     const auto rows = gConnection->Execute(AlbumReport::command());
     const auto content = std::make_shared<ReportContent>(rows, AlbumReport::caption(), QDate());
-    return new frmPageSetup(content, paper);
-}
-
-Form *makePageSetup()
-{
-    return makePageSetupOf(reportpaper::stored());
-}
-
-Form *makeLandscapeSetup()
-{
-    return makePageSetupOf(reportpaper::layout(QPageSize::A4, QPageLayout::Landscape, QMargins()));
+    return new frmPageSetup(content, reportpaper::layout(QPageSize::A4, orientation, QMargins()));
 }
 
 QString textOf(const QWidget *w)
@@ -225,10 +206,14 @@ QString textOf(const QWidget *w)
     return text;
 }
 
+template <typename... Control> bool isOneOf(const QWidget *w)
+{
+    return (qobject_cast<const Control *>(w) || ...);
+}
+
 bool needsName(const QWidget *w)
 {
-    return qobject_cast<const QAbstractButton *>(w) || qobject_cast<const QLineEdit *>(w) ||
-           qobject_cast<const QAbstractItemView *>(w) || qobject_cast<const QProgressBar *>(w);
+    return isOneOf<QAbstractButton, QLineEdit, QAbstractItemView, QProgressBar>(w);
 }
 
 bool hasName(const QWidget *w, const QWidget *screen)
@@ -244,17 +229,14 @@ bool isCut(const QWidget *w)
 {
     if (const auto *label = qobject_cast<const QLabel *>(w); label && label->wordWrap())
         return label->heightForWidth(label->width()) > label->height();
-    if (!qobject_cast<const QLabel *>(w) && !qobject_cast<const QAbstractButton *>(w))
-        return false;
-    return w->sizeHint().width() > w->width() || w->sizeHint().height() > w->height();
+    return isOneOf<QLabel, QAbstractButton>(w) &&
+           (w->sizeHint().width() > w->width() || w->sizeHint().height() > w->height());
 }
 
 bool takesInput(const QWidget *w)
 {
     const auto *label = qobject_cast<const QLabel *>(w);
-    return needsName(w) || qobject_cast<const QComboBox *>(w) ||
-           qobject_cast<const QAbstractSpinBox *>(w) || qobject_cast<const QTabBar *>(w) ||
-           qobject_cast<const ReportView *>(w) ||
+    return needsName(w) || isOneOf<QComboBox, QAbstractSpinBox, QTabBar, ReportView>(w) ||
            (label && label->textInteractionFlags() & Qt::LinksAccessibleByKeyboard);
 }
 
@@ -298,25 +280,31 @@ class tst_Screens : public QObject
 {
     Q_OBJECT
 
-    using Screens = std::vector<std::pair<const char *, Make>>;
-    static Screens screens()
+    /// How a screen is made for both tests, and what of it Shift+Tab alone reaches; "-": nobody
+    /// walks through it.
+    struct Screen {
+        const char *name;
+        Make make;
+        const char *byShiftTabAlone = "";
+    };
+    static std::vector<Screen> screens()
     {
-        return {{"frmSplash", make<frmSplash>()},
+        return {{"frmSplash", make<frmSplash>(), "-"},
                 {"frmHelp", make<frmHelp>()},
                 {"frmCDList", make<frmCDList>()},
-                {"frmCDRoot", makeEditor<frmCDRoot>()},
-                {"frmCDRootE", makeEditor<frmCDRootE>()},
-                {"frmCDRootMP3", makeEditor<frmCDRootMP3>()},
+                {"frmCDRoot", makeEditorOf<frmCDRoot>(1), "DiscsTab cmdCancel"},
+                {"frmCDRootE", makeEditorOf<frmCDRootE>(2), "DiscsTab cmdCancel"},
+                {"frmCDRootMP3", makeCollectionEditor},
                 {"frmImportWizard", make<frmImportWizard>()},
-                {"frmImportBusy", make<frmImportBusy>()},
+                {"frmImportBusy", make<frmImportBusy>(), "-"},
                 {"frmImport", make<frmImport>()},
-                {"frmImportDBBusy", make<frmImportDBBusy>()},
-                {"frmSearchArtistsTitles", make<frmSearchArtistsTitles>()},
+                {"frmImportDBBusy", make<frmImportDBBusy>(), "-"},
+                {"frmSearchArtistsTitles", makeSearch},
                 {"CompilationReport", makeReport<CompilationReport>()},
                 {"AlbumReport", makeReport<AlbumReport>()},
                 {"PlatenbakReport", makeReport<PlatenbakReport>()},
-                {"frmPageSetup", makePageSetup},
-                {"frmAutoUpdateUtility", make<frmAutoUpdateUtility>()},
+                {"frmPageSetup", makePageSetup<QPageLayout::Portrait>},
+                {"frmAutoUpdateUtility", make<frmAutoUpdateUtility>(), "-"},
                 {"frmDiscInfoCDDB", make<frmDiscInfoCDDB>()},
                 {"DiscEditor", makeDiscEditor},
                 {"Candidates", makeCandidates},
@@ -333,6 +321,23 @@ class tst_Screens : public QObject
                 {"RenamePreview", makeRenamePreview},
                 {"UndoChanges", make<UndoChanges>()}};
     }
+
+    /// Discs on every page of the browser, so that nothing is disabled; a user who has signed up.
+    struct Ground {
+        ScriptedDesktop desktop;
+        TestCatalogue catalogue;
+        Ground()
+        {
+            CddbUserProfile profile;
+            profile.registered = true;
+            profile.store();
+            catalogue.exec(uR"(insert into Artiesten values (1,'Zed');
+            insert into Tracks values (1,1,'One',null,null);
+            insert into CDTitels values (1,'Best',null,'V',null,1990),(2,'Zebra',1,'E',null,1990);
+            insert into CompactDiscs values (1,1,1,1,1,null),(2,2,1,1,1,null),(3,1,2,1,1,null);
+            insert into MP3Collections values (1,'/b','Second');)"_s);
+        }
+    };
 
     static void check(const QWidget *screen)
     {
@@ -351,11 +356,9 @@ class tst_Screens : public QObject
 private slots:
     void everyFileOfAScreenIsHere()
     {
-        ScriptedDesktop desktop;
-        TestCatalogue catalogue;
-        signUp();
+        const Ground ground;
         QSet<QString> here{u"MainScreen"_s}; // by theFrame()
-        for (const auto &[name, make] : screens()) {
+        for (const auto &[name, make, _] : screens()) {
             const std::unique_ptr<Form> screen(make());
             for (auto *type = screen->metaObject(); type; type = type->superClass())
                 here.insert(QString::fromLatin1(type->className()));
@@ -392,11 +395,10 @@ private slots:
 
     void everyScreen_data()
     {
-        QTest::addColumn<int>("language");
-        QTest::addColumn<Make>("make");
-        for (const auto &[name, make] : screens()) {
-            QTest::newRow(QByteArray(name).append(", English")) << languageEnglish << make;
-            QTest::newRow(QByteArray(name).append(", Dutch")) << languageDutch << make;
+        const DataRows<int, Make> row("language", "make");
+        for (const auto &[name, make, _] : screens()) {
+            row(QByteArray(name) + ", English", languageEnglish, make);
+            row(QByteArray(name) + ", Dutch", languageDutch, make);
         }
     }
 
@@ -405,11 +407,7 @@ private slots:
         QFETCH(int, language);
         QFETCH(Make, make);
         gLanguage = language;
-        ScriptedDesktop desktop;
-        TestCatalogue catalogue;
-        signUp();
-        if (qstrncmp(QTest::currentDataTag(), "frmWhatCD", 9) == 0)
-            desktop.expectBox(GetMessage("MsgStillNoCDOfThisType").section(u'\r', 0, 0));
+        const Ground ground;
         Form *screen = make();
         QCOMPARE(screen->Name(), QString::fromLatin1(QTest::currentDataTag()).section(u',', 0, 0));
         for (QTimer *timer : screen->findChildren<QTimer *>())
@@ -427,46 +425,19 @@ private slots:
     void tabWalksAround_data()
     {
         const DataRows<Make, QString> row("make", "by Shift+Tab alone");
-        row("frmHelp", make<frmHelp>(), "");
-        for (int page = 0; page < 4; ++page)
+        for (const auto &[name, make, byShiftTabAlone] : screens()) {
+            if (qstrcmp(byShiftTabAlone, "-") != 0)
+                row(name, make, byShiftTabAlone);
+        }
+        for (int page = 1; page < 4; ++page)
             row("frmCDList, page " + QByteArray::number(page), makeBrowser(page), "");
-        row("frmCDRoot", makeEditorOf<frmCDRoot>(1), "DiscsTab cmdCancel");
-        row("frmCDRootE", makeEditorOf<frmCDRootE>(2), "DiscsTab cmdCancel");
-        row("frmSearchArtistsTitles", makeSearch, "");
-        row("frmImportWizard", make<frmImportWizard>(), "");
-        row("frmImport", make<frmImport>(), "");
-        row("AlbumReport", makeReport<AlbumReport>(), "");
-        row("frmPageSetup", makePageSetup, "");
-        row("frmPageSetup, landscape", makeLandscapeSetup, "");
-        row("frmDiscInfoCDDB", make<frmDiscInfoCDDB>(), "");
-        row("DiscEditor", makeDiscEditor, "");
-        row("Candidates", makeCandidates, "");
-        row("SearchByWords", make<SearchByWords>(), "");
-        row("SignUp", makeSignUp, "");
-        row("Credits", make<Credits>(), "");
-        row("ProxyInfo", make<ProxyInfo>(), "");
-        row("frmWhatNow", make<frmWhatNow>(), "");
-        row("frmCDRootMP3", makeEditor<frmCDRootMP3>(), "");
-        row("frmWhatCD", makeWhatCD, "");
-        row("EditMP3Tags", makeTagEditor, "");
-        row("frmTracks", make<frmTracks>(), "");
-        row("frmMatchWithSongcase", make<frmMatchWithSongcase>(), "");
-        row("frmTagWizardPg1", makeTagWizard, "");
-        row("RenamePreview", makeRenamePreview, "");
-        row("UndoChanges", make<UndoChanges>(), "");
+        row("frmPageSetup, landscape", makePageSetup<QPageLayout::Landscape>, "");
     }
 
     void tabWalksAround()
     {
         QFETCH(Make, make);
-        ScriptedDesktop desktop;
-        TestCatalogue catalogue;
-        signUp();
-        catalogue.exec(uR"(insert into Artiesten values (1,'Zed');
-            insert into Tracks values (1,1,'One',null,null);
-            insert into CDTitels values (1,'Best',null,'V',null,1990),(2,'Zebra',1,'E',null,1990);
-            insert into CompactDiscs values (1,1,1,1,1,null),(2,2,1,1,1,null),(3,1,2,1,1,null);
-            insert into MP3Collections values (1,'/b','Second');)"_s);
+        const Ground ground;
         Form *screen = make();
         screen->Show();
         screen->activateWindow();

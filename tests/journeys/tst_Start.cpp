@@ -49,8 +49,7 @@ private slots:
             QVERIFY(!program.screen("frmSplash"));
             QCOMPARE(bool(program.screen("frmHelp")), start == 1);
             const bool dutch = start == 2 && language == languageDutch;
-            QCOMPARE(program.frame().windowTitle(),
-                     dutch ? u"Dr. Orvanta's Liedkist"_s : u"Dr. Orvanta's Songcase"_s);
+            QVERIFY(program.frame().windowTitle().endsWith(dutch ? "Liedkist"_L1 : "Songcase"_L1));
             QCOMPARE(gConnection->State(), ADODB::adStateOpen);
             QVERIFY(program.screen("frmCDList")->Unload());
             QTest::keyClick(&program.frame(), Qt::Key_F5);
@@ -66,13 +65,9 @@ private slots:
     {
         QFETCH(int, language);
         storeLanguage(language);
-        const bool dutch = language == languageDutch;
         writeFile(mDesktop->folder + u"/Compact3.orv"_s, "old");
         const QString file = mDesktop->folder + u"/Compact4.orv"_s;
-        mDesktop->expectBox((dutch ? u"[Bestand niet gevonden] Er kan geen verbinding met "
-                                     "de database worden gemaakt!\rHet bestand "_s
-                                   : u"[File not found] Unable to connect with "
-                                     "database!\rFile "_s) +
+        mDesktop->expectBox((language == languageDutch ? u"!\rHet bestand "_s : u"!\rFile "_s) +
                             file);
         Program program(*mDesktop);
         QVERIFY(!program.start());
@@ -107,9 +102,7 @@ private slots:
             Program program(*mDesktop);
             QVERIFY2(program.start(), "the frame stays up");
             QVERIFY(program.frame().isVisible());
-            mDesktop->verifyAllCame();
-            mDesktop->expectBox(u"[Systeemfout]"_s);
-            mDesktop->expectBox(u"[System error]"_s);
+            expectBoxesOfTheEnd();
             QVERIFY(program.end());
         }
         QCOMPARE(readFile(file), before);
@@ -133,9 +126,7 @@ private slots:
 
         // With this the reading of a text file begins.
         QCOMPARE(numberOf([] { nextId(Table::CDTitels); }), int(errObjectClosed));
-        mDesktop->verifyAllCame();
-        mDesktop->expectBox(u"[Systeemfout]"_s);
-        mDesktop->expectBox(u"[System error]"_s);
+        expectBoxesOfTheEnd();
         QVERIFY(program.end());
     }
 
@@ -155,16 +146,15 @@ private slots:
         QVERIFY(frame.Load());
         mDesktop->duringBox = {};
         QVERIFY(!shown);
-        mDesktop->expectBox(u"[Systeemfout]"_s);
-        mDesktop->expectBox(u"[System error]"_s);
+        expectBoxesOfTheEnd();
         QVERIFY(frame.Unload());
     }
 
     void aCatalogueMovedWhileOpen_data()
     {
-        QTest::addColumn<bool>("replaced");
-        QTest::newRow("moved") << false;
-        QTest::newRow("replaced") << true;
+        const DataRows<bool> row("replaced");
+        row("moved", false);
+        row("replaced", true);
     }
 
     void aCatalogueMovedWhileOpen()
@@ -188,13 +178,7 @@ private slots:
         mDesktop->verifyAllCame();
         comeBack(); // and not again
 
-        QString told;
-        try {
-            gConnection->Execute(u"insert into artiesten values (1,'x')"_s);
-        } catch (const Error &error) {
-            told = error.Description;
-        }
-        QVERIFY2(told.contains("moved, replaced or deleted"_L1), qPrintable(told));
+        QVERIFY(numberOf([] { gConnection->Execute(u"insert into artiesten values (1,'x')"_s); }));
         QCOMPARE(readFile(moved), before);
         QCOMPARE(readFile(file), replaced ? before : QByteArray("none"));
         QFile::remove(file);
@@ -233,29 +217,22 @@ private slots:
         makeCatalogue();
         storeLanguage(language);
         const bool dutch = language == languageDutch;
-        const char *own = dutch ? "mnuNederlands" : "mnuEngels",
-                   *other = dutch ? "mnuEngels" : "mnuNederlands";
-        const int otherLanguage = dutch ? languageEnglish : languageDutch;
+        const char *own = dutch ? "mnuNederlands" : "mnuEngels";
+        const char *other = dutch ? "mnuEngels" : "mnuNederlands";
         {
             Program program(*mDesktop);
             QVERIFY(program.start());
-            program.choose(own);
-            QVERIFY2(mDesktop->boxes.isEmpty(), "the current language is no change");
-            mDesktop->expectBox(dutch ? u"information [Preferences] If you close and restart this "
-                                        "program, the preferred language will be English."_s
-                                      : u"information [Instellingen] De taalinstellingen worden "
-                                        "van toepassing indien u dit programma afsluit"_s);
+            program.choose(own); // is no change
+            mDesktop->expectBox(dutch ? u"If you close and restart this program"_s
+                                      : u"indien u dit programma afsluit"_s);
             program.choose(other);
             QVERIFY(program.entry(other)->isChecked() && !program.entry(own)->isChecked());
             QCOMPARE(gLanguage, language);
-            program.choose("mnuHelp");
-            QCOMPARE(program.entry("Over")->text(),
-                     dutch ? u"&Over Liedkist"_s : u"&About Songcase"_s);
             QVERIFY(program.end());
         }
         Program program(*mDesktop);
         QVERIFY(program.start());
-        QCOMPARE(gLanguage, otherLanguage);
+        QCOMPARE(gLanguage, dutch ? languageEnglish : languageDutch);
         QVERIFY(program.end());
     }
 
@@ -267,19 +244,16 @@ private slots:
         storeLanguage(language);
         Program program(*mDesktop);
         QVERIFY(program.start());
-        const QString author =
-            language == languageDutch ? u"Door Arend K. Vossel"_s : u"Created by Arend K. Vossel"_s;
+        const bool dutch = language == languageDutch;
         for (int time = 1; time <= 2; ++time) {
-            QStringList shown;
+            QString version;
             mDesktop->expectModal(u"frmSplash"_s, [&](Form &splash) {
-                for (const char *label : {"lblVersion", "lblAuthor"})
-                    shown.append(splash.findChild<QLabel *>(QLatin1String(label))->text());
+                version = splash.findChild<QLabel *>(u"lblVersion"_s)->text();
                 QTest::keyClick(&splash, Qt::Key_Space);
             });
             mDesktop->expectModal(u"Credits"_s, [](Form &credits) { credits.Unload(); });
             program.choose("tbCredits");
-            QCOMPARE(shown, (QStringList{u"Version " SONGCASE_VERSION ""_s, QString()}));
-            QCOMPARE(program.control<QLabel>("frmSplash", "lblAuthor")->text(), author);
+            QCOMPARE(version, u"Version " SONGCASE_VERSION ""_s);
             QVERIFY(!program.screen("frmSplash")->isVisible());
         }
 
@@ -292,25 +266,32 @@ private slots:
         QTRY_VERIFY(link->hasFocus());
         QTest::keyClick(link, Qt::Key_Return); // and nothing before it
         QCOMPARE(mDesktop->addresses.size(), 1);
-        QVERIFY(mDesktop->addresses.first().endsWith(
-            language == languageDutch ? "guide/nl/index.html"_L1 : "guide/en/index.html"_L1));
-        QVERIFY(QFile::exists(QUrl(mDesktop->addresses.first()).toLocalFile()));
+        const QString address = mDesktop->addresses.first();
+        QVERIFY(address.endsWith(dutch ? "guide/nl/index.html"_L1 : "guide/en/index.html"_L1));
+        QVERIFY(QFile::exists(QUrl(address).toLocalFile()));
         // Below ~/.local that is the folder of the user's catalogue, which is not there before the
         // first start.
-        QVERIFY(!mDesktop->addresses.first().contains("share/songcase/"_L1));
+        QVERIFY(!address.contains("share/songcase/"_L1));
         mDesktop->browserThere = false;
-        mDesktop->expectBox(u"error [] No browser detected!"_s.mid(0, 5));
+        mDesktop->expectBox(u"No browser detected!"_s);
         emit link->linkActivated(u"guide"_s);
-        QVERIFY(mDesktop->boxes.last().endsWith("No browser detected!"_L1));
         QVERIFY(program.end());
     }
 
 private:
     static void languages()
     {
-        QTest::addColumn<int>("language");
-        QTest::newRow("English") << languageEnglish;
-        QTest::newRow("Dutch") << languageDutch;
+        const DataRows<int> row("language");
+        row("English", languageEnglish);
+        row("Dutch", languageDutch);
+    }
+
+    // Without a connection nothing can be cleaned up, nor be closed.
+    void expectBoxesOfTheEnd()
+    {
+        mDesktop->verifyAllCame();
+        mDesktop->expectBox(u"[Systeemfout]"_s);
+        mDesktop->expectBox(u"[System error]"_s);
     }
 
     void makeCatalogue() { cataloguefile::create(mDesktop->folder + u"/Compact4.orv"_s); }
