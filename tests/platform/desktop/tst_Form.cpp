@@ -103,8 +103,7 @@ private slots:
         form->Show();
         form->Show();
         form->stays = true;
-        QVERIFY(!form->close());
-        QVERIFY(form->isVisible() && !form->isUnloaded());
+        QVERIFY(!form->close() && form->isVisible() && !form->isUnloaded());
         form->stays = false;
         QVERIFY(form->Unload());
         QVERIFY(form->Unload()); // gone already, and no second time
@@ -195,9 +194,9 @@ private slots:
         form.ok.setEnabled(enabled);
         form.cancel.setEnabled(enabled);
         form.Show();
-        QWidget *at = &form.text;
-        if (focus != "text"_L1)
-            at = focus == "ok"_L1 ? &form.ok : &form.other;
+        const QMap<QString, QWidget *> fields{
+            {u"text"_s, &form.text}, {u"ok"_s, &form.ok}, {u"other"_s, &form.other}};
+        QWidget *at = fields[focus];
         at->setFocus();
         TestForm::log.clear();
         QTest::keyClick(at, Qt::Key(key));
@@ -222,7 +221,7 @@ private slots:
     void freezeStaysUnderAModalScreen()
     {
         QWidget window;
-        bool during = true, after = true;
+        bool during = true;
         inMainLoop([&] {
             const Freeze freeze(&window);
             const NestedLoop nested;
@@ -231,9 +230,7 @@ private slots:
             modal.exec();
             during = window.updatesEnabled();
         });
-        after = window.updatesEnabled();
-        QVERIFY(!during);
-        QVERIFY(after);
+        QVERIFY(!during && window.updatesEnabled());
     }
 
     void freezesAreNotCounted()
@@ -251,19 +248,6 @@ private slots:
         Desktop::current().freeze(gone.get());
         gone.reset();
         Desktop::current().freeze(nullptr);
-    }
-
-    // A comparison that fails leaves its function at once, here on purpose.
-    void aBoxEndsThoughItsTestFails()
-    {
-        inNextBox([](QMessageBox &) {
-            QEXPECT_FAIL("", "on purpose", Continue);
-            QVERIFY(false);
-            QEXPECT_FAIL("", "on purpose", Abort);
-            QVERIFY(false);
-            QFAIL("not reached");
-        });
-        QtDesktop().messageBox(BoxKind::Question, BoxButtons::YesNo, u"?"_s, u"t"_s);
     }
 
     void questionOnlyItsButtonsAnswer()
