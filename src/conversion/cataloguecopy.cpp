@@ -28,10 +28,12 @@ public:
     qsizetype count() const { return mRows->rowCount(); }
     Values values(qsizetype row) const;
 
-    /// "Tracks, ID 12"
+    /// "Tracks, ID 12", or, where it has none, "Tracks, #3".
     QString place(qsizetype row) const
     {
-        return QLatin1String(mTable.name) + u", ID "_s + mRows->text(row, mColumns[0]);
+        const QString id = mRows->text(row, mColumns[0]);
+        return QLatin1String(mTable.name) +
+               (id.isEmpty() ? u", #"_s + QString::number(row + 1) : u", ID "_s + id);
     }
 
 private:

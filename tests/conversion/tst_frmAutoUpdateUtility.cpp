@@ -192,7 +192,7 @@ private slots:
         row("no name", "Compact3.orv", with(0, {QVariant(), 8}), "xOldValue",
             "Artiesten, ID 8, Naam");
         row("no id", "Compact3.orv", with(4, {QVariant(), u"a"_s, u"b"_s}), "xOldValue",
-            "MP3Collections, ID , ID");
+            "MP3Collections, #2, ID");
         row("no artist", "Compact3.orv", with(1, {12, QVariant(), u"a"_s, u""_s, 1}), "xOldValue",
             "Tracks, ID 12, Artiest_ID");
     }
