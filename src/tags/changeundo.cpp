@@ -112,7 +112,9 @@ FileJournal::Undone ChangeUndo::run(const ChangeBatch &about,
             if (change.way == FileChange::Way::Move)
                 undone.moved.emplace_back(before, change.path);
         } catch (const Error &error) {
-            undone.left.append(now(change.path, *all[i]).name + u": "_s + error.Description);
+            const bool isMove = change.way == FileChange::Way::Move;
+            undone.left.append((isMove ? before : now(change.path, *all[i]).name) + u": "_s +
+                               error.Description);
         }
     }
     return undone;

@@ -138,6 +138,7 @@ private slots:
         const auto undone = undoLast();
         QCOMPARE(undone.files, 0);
         QCOMPARE(undone.left.size(), 1);
+        QVERIFY(undone.left.front().startsWith(now + u": "_s));
         QCOMPARE(QFile::exists(now) ? readFile(now) : QByteArray(), left);
     }
 
