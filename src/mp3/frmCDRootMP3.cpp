@@ -261,6 +261,8 @@ void frmCDRootMP3::RefreshAndHandleButtons()
                : !reading.allExist ? ButtonState::FileMissing
                                    : ButtonState::AllThere,
                isValid);
+    if (RedrawLocked)
+        Desktop::current().freeze(nullptr); // what is told is told over the list as it is now
     if (!isUnloaded()) {
         if (!reading.unreadable.isEmpty())
             tellUnreadable(reading.unreadable);
@@ -269,8 +271,6 @@ void frmCDRootMP3::RefreshAndHandleButtons()
         if (!reading.allExist)
             markMissingFiles();
     }
-    if (RedrawLocked)
-        Desktop::current().freeze(nullptr);
     RestoreListPosition();
 }
 

@@ -130,6 +130,7 @@ private slots:
         QCOMPARE(field("txtTitel")->text(), u"Mine"_s);
         QFile::remove(folder() + u"/a.mp3"_s);
         mDesktop->expectBox(u"warning [Songcase] One or more files"_s);
+        mDesktop->duringBox = [this] { QVERIFY(mEditor->updatesEnabled()); };
         press("cmdRefreshList");
         QCOMPARE(usable(), u"MP3Collection ImportAsCD Delete RefreshList Rename"_s);
         QVERIFY(item(1).Bold() && item(1).ForeColor() == QColor(255, 0, 0) && !item(2).Bold());
