@@ -22,8 +22,8 @@ namespace
 {
 
 const std::vector<ListColumn> columns = {
-    {ListColumn::Hidden},           {ListColumn::Text, "xWhen", 4},
-    {ListColumn::Text, "xWhat", 5}, {ListColumn::Text, "xFolder", 9},
+    {ListColumn::Hidden},           {ListColumn::Text, "xWhen", 5},
+    {ListColumn::Text, "xWhat", 5}, {ListColumn::Text, "xFolder", 8},
     {ListColumn::Number, "xFiles"}, {ListColumn::Text, "xRemark", 4}};
 
 QString shown(const QDateTime &when)
@@ -71,9 +71,9 @@ UndoChanges::~UndoChanges() = default;
 
 void UndoChanges::setTexts()
 {
-    applyCaptions(this, {{"UndoChanges", "xUndoChangesCaption"},
-                         {"lblLeft", "xUndoLeft"},
-                         {"cmdUndo", "xUndo"}});
+    applyCaptions(
+        this,
+        {{"UndoChanges", "xUndoChangesCaption"}, {"lblLeft", "xUndoLeft"}, {"cmdUndo", "xUndo"}});
     mUi->ChangeList->setAccessibleName(GetMessage("xUndoChangesCaption"));
     mUi->Progress->setAccessibleName(GetMessage("xProgress"));
 }

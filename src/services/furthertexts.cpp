@@ -261,7 +261,7 @@ const Message furtherTexts[] = {
     {"xRemarkGone", "The file is not found", "Het bestand is niet gevonden"},
     {"xNoRowsSelected", "No rows are selected in the list.", "Er zijn in de lijst geen regels geselecteerd."},
     {"xNoConflicts", "Nothing stands in the way of these names. Nothing has been changed yet.", "Niets staat deze namen in de weg. Er is nog niets gewijzigd."},
-    {"xConflicts", "Nothing has been changed yet. Names that something stands in the way of are bold: ", "Er is nog niets gewijzigd. Namen die iets in de weg staat, zijn vet: "},
+    {"xConflicts", "Nothing has been changed yet. Names that something stands in the way of are bold: ", "Er is nog niets gewijzigd. Namen waarbij iets in de weg staat, zijn vet: "},
     {"xUndoEntry", "&Undo changes to files…", "&Wijzigingen in bestanden ongedaan maken…"},
     {"xUndoChangesCaption", "Undo changes to files", "Wijzigingen in bestanden ongedaan maken"},
     {"xUndoWhich", "Choose what is to be taken back. A file that something else has changed since is left as it is. What you take back can be taken back in turn.", "Kies wat ongedaan moet worden gemaakt. Een bestand dat sindsdien door iets anders is gewijzigd, blijft zoals het is. Ook het ongedaan maken kan weer ongedaan worden gemaakt."},
