@@ -66,10 +66,10 @@ FileLookup::Folder FileLookup::readFolder(const QString &path, const std::stop_t
     const QFileInfo file(path);
     folder.path = path;
     folder.own = {file.fileName(), readSoundFile(path).value_or(SoundFile())};
-    folder.count = int(std::ranges::count_if(file.dir().entryList(QDir::Files), isMP3));
+    folder.count = int(std::ranges::count_if(filesIn(file.path()), isMP3));
     QString unreadable;
     if (folder.count <= mostTracks)
-        folder.files = soundFilesIn(file.dir(), isMP3, stop, unreadable);
+        folder.files = soundFilesIn(file.path(), isMP3, stop, unreadable);
     if (!unreadable.isEmpty())
         folder.files.clear();
     return folder;

@@ -206,7 +206,7 @@ FoundDisc readSoundFolder(const QString &name, const std::stop_token &stop)
             return disc;
     }
     QString unreadable;
-    std::vector<RippedFile> files = soundFilesIn(folder, isSoundFile, stop, unreadable);
+    std::vector<RippedFile> files = soundFilesIn(name, isSoundFile, stop, unreadable);
     if (!unreadable.isEmpty())
         return nothing("xDiscFileUnreadable", unreadable);
     if (files.empty())

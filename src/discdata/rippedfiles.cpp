@@ -1,7 +1,10 @@
 #include "discdata/rippedfiles.h"
 
+#include "platform/files/nativename.h"
+
 #include <QCollator>
 #include <QSet>
+#include <filesystem>
 
 namespace
 {
@@ -18,21 +21,35 @@ void sortByNames(QStringList &names)
 
 } // namespace
 
-std::vector<RippedFile> soundFilesIn(const QDir &folder,
+QStringList filesIn(const QString &folder)
+{
+    QStringList names;
+    std::error_code error;
+    const std::filesystem::path path = nativeName(folder).toStdString();
+    for (std::filesystem::directory_iterator at(path, error), end; !error && at != end;
+         at.increment(error)) {
+        QString name = nameOfNative(QByteArray::fromStdString(at->path().filename().native()));
+        if (std::error_code unknown; at->is_regular_file(unknown))
+            names.append(std::move(name));
+    }
+    sortByNames(names);
+    return names;
+}
+
+std::vector<RippedFile> soundFilesIn(const QString &folder,
                                      const std::function<bool(const QString &name)> &isWanted,
                                      const std::stop_token &stop, QString &unreadable)
 {
     std::vector<RippedFile> files;
-    QStringList names = folder.entryList(QDir::Files, QDir::Name);
-    sortByNames(names);
-    for (const QString &name : names) {
+    for (const QString &name : filesIn(folder)) {
         if (stop.stop_requested() || files.size() > mostFiles)
             break;
         if (!isWanted(name))
             continue;
-        const auto sound = readSoundFile(folder.filePath(name));
+        const QString path = folder + u'/' + name;
+        const auto sound = readSoundFile(path);
         if (!sound && unreadable.isEmpty())
-            unreadable = folder.filePath(name);
+            unreadable = path;
         files.push_back({name, sound.value_or(SoundFile())});
     }
     return files;

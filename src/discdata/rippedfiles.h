@@ -3,7 +3,7 @@
 #include "discs/toc.h"
 #include "tags/playingtime.h"
 
-#include <QDir>
+#include <QStringList>
 #include <functional>
 #include <stop_token>
 
@@ -13,10 +13,14 @@ struct RippedFile {
     SoundFile sound;
 };
 
-/// Those of a folder whose names are wanted, in the order of their names: "2 Second" stands before
-/// "10 Tenth". Of the first that cannot be read `unreadable` is the full name: without it the
-/// others would be another disc. More than a thousand are no disc either and are left out.
-std::vector<RippedFile> soundFilesIn(const QDir &folder,
+/// The names of all files in a folder, also of those that are no UTF-8, which the toolkit leaves
+/// out: "2 Second" stands before "10 Tenth".
+QStringList filesIn(const QString &folder);
+
+/// Those of a folder whose names are wanted, in this order. Of the first that cannot be read
+/// `unreadable` is the full name: without it the others would be another disc. More than a thousand
+/// are no disc either and are left out.
+std::vector<RippedFile> soundFilesIn(const QString &folder,
                                      const std::function<bool(const QString &name)> &isWanted,
                                      const std::stop_token &stop, QString &unreadable);
 

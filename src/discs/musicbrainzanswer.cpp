@@ -161,7 +161,9 @@ void addMediaWith(std::vector<DiscRecord> &records, QJsonObject release,
         const int offset = medium.medium.value("track-offset"_L1).toInt(-1);
         medium.medium.remove("tracks"_L1);
         records.push_back(recordOf(medium));
-        records.back().soughtTrack = offset + 1;
+        constexpr int mostTracks = 99;
+        if (offset >= 0 && offset < mostTracks)
+            records.back().soughtTrack = offset + 1;
     }
 }
 

@@ -1,6 +1,7 @@
 // Label: unit
 #include "discdata/filelookup.h"
 #include "discdata/filelookupid.h"
+#include "platform/files/nativename.h"
 #include "platform/work/longwork.h"
 #include "support/datarows.h"
 #include "support/madesound.h"
@@ -174,6 +175,16 @@ private slots:
         mServer->answer("release/" + release, whole);
         QTEST(foundByFile(u"02 b.MP3"_s), "found");
         QTEST(int(mServer->requests.size()), "requests");
+    }
+
+    // As an older system wrote them. The toolkit does not list them.
+    void namesThatAreNoUtf8()
+    {
+        makeFiles({u"1.mp3"_s, u"2.mp3"_s, u"3.mp3"_s});
+        const QByteArray name = nativeName(folder()) + "/2 \xC9t\xE9.mp3";
+        QCOMPARE(std::rename(nativeName(folder() + u"/2.mp3"_s), name), 0);
+        mServer->answer("discid/", listOf("releases", {whole}));
+        QCOMPARE(foundByFile(nameOfNative("2 \xC9t\xE9.mp3")), u"Harbour #2"_s);
     }
 
     // The disc comes out to the frame where encoders tell what they have added; where they do not,

@@ -135,6 +135,7 @@ fuzz::Target musicBrainz(
         allowed([&] { return musicBrainzDiscs({input}, toc); });
         allowed([&, a = first, b = second] { return musicBrainzDiscs({a, b}, toc); });
         allowed([&] { return musicBrainzSearch(input); });
+        allowed([&] { return musicBrainzRecordings(input); });
         allowed([&] { return std::vector{musicBrainzRelease(input, 2)}; });
     });
 
