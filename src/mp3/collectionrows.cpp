@@ -4,6 +4,7 @@
 #include "services/fileutilities.h"
 #include "services/globals.h"
 
+#include <QDir>
 #include <QHash>
 #include <algorithm>
 #include <numeric>
@@ -78,8 +79,11 @@ QString CollectionRows::fileName(qsizetype row) const
 QSet<QString> CollectionRows::fileNames() const
 {
     QSet<QString> names;
-    for (qsizetype row = 0; row < count(); ++row)
-        names.insert(fileName(row));
+    for (qsizetype row = 0; row < count(); ++row) {
+        const QString name = fileName(row);
+        names.insert(name);
+        names.insert(QString(name).replace(u'\\', QDir::separator()));
+    }
     return names;
 }
 

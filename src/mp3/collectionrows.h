@@ -21,7 +21,7 @@ public:
 
     qsizetype count() const { return WorkingRecords->RecordCount(); }
     QString fileName(qsizetype row) const;
-    QSet<QString> fileNames() const;
+    QSet<QString> fileNames() const; // those with "\" as the separator both ways
     bool isMissing(qsizetype row) const;
 
     /// Whether rows were added, deleted, moved or given another name since the load.

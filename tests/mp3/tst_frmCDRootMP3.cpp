@@ -160,6 +160,16 @@ private slots:
         QCOMPARE(list()->ListItems().Count(), 8);
     }
 
+    void scanningWhatAnOlderCatalogueHas()
+    {
+        store({u"x/y.mp3"_s});
+        mCatalogue->exec(u"update MP3Files set FileName = 'x\\y.mp3'"_s);
+        show(u"U"_s);
+        mDesktop->expectBox(u"in the list already: 1"_s, vbYes);
+        press("cmdScan");
+        QCOMPARE(files(), u"1x\\y.mp3"_s);
+    }
+
     void adding()
     {
         for (const char *name : {"a.mp3", "b.mp3", "c.mp3", "d.txt"})
