@@ -4,7 +4,6 @@
 #include "mp3/matchchoice.h"
 #include "mp3/matchtags.h"
 #include "mp3/matchtree.h"
-#include "platform/error/error.h"
 #include "support/screentest.h"
 
 #include <QCheckBox>
@@ -147,27 +146,6 @@ private slots:
         QCOMPARE(chosen(), u"3 1 7"_s);
     }
 
-    void endings_data()
-    {
-        const DataRows<QString, QString> row("ending", "chosen");
-        row("choose", "2 1 0");
-        row("cancel", "none");
-        row("close", "none");
-    }
-    void endings()
-    {
-        QFETCH(QString, ending);
-        open(-99, false);
-        press("cmdSearch");
-        if (ending == "choose"_L1)
-            press("cmdChoose");
-        else if (ending == "cancel"_L1)
-            press("cmdCancel");
-        else
-            mForm->close();
-        QTEST(chosen(), "chosen");
-    }
-
     void tracksThatAreGone()
     {
         open(-99, true);
@@ -180,19 +158,6 @@ private slots:
         mDesktop->expectBox(u"no such table"_s);
         press("cmdSearch");
         QVERIFY(numberOf([] { tagOfTrack(1, 1, 9); }) != 0);
-    }
-
-    void tagsOfTheCatalogue()
-    {
-        const std::vector<CddbID3Tag> tags = tagsOfDisc(1, 2);
-        QCOMPARE(tags.size(), 2U);
-        const CddbID3Tag &tag = tags[1];
-        QCOMPARE((QStringList{tag.Album(), tag.LeadArtist(), tag.Title(), tag.TrackPosition(),
-                              tag.PartOfSet(), tag.Year(), tag.Genre(), tag.Comments()}
-                      .join(u'|')),
-                 u"Harbour|Zoë|Two|2|2/2|?|?|"_s);
-        QCOMPARE(tagOfTrack(1, 2, 1).Genre(), u"Rock"_s);
-        QCOMPARE(numberOf([] { tagOfTrack(1, 2, 9); }), int(errNoCurrentRecord));
     }
 
     void trackOfADisc()
