@@ -2,7 +2,7 @@
 #include "mp3/importascd.h"
 #include "platform/ado/connection.h"
 #include "support/countingbrowser.h"
-#include "support/screentest.h"
+#include "support/rowstest.h"
 
 namespace
 {
@@ -14,50 +14,25 @@ const auto links =
     "from CompactDiscs, Tracks, Artiesten where Track_ID = Tracks.ID and "
     "Tracks.Artiest_ID = Artiesten.ID order by CompactDiscs.ID"_s;
 
-// "album|artist|title|part of set|year|genre" of each row; the fourth row of a list comes first.
-std::vector<CollectionRow> rowsOf(const QString &lines)
-{
-    using enum CollectionField;
-    std::vector<CollectionRow> rows;
-    for (const QString &line : lines.split(u'\n', Qt::SkipEmptyParts)) {
-        CollectionRow &row = rows.emplace_back();
-        row.index = int(rows.size()) + 3;
-        const QStringList cells = line.split(u'|');
-        for (int cell = 0;
-             const auto field : {Album, LeadArtist, Title, PartOfSet, TrackYear, Genre})
-            row[field] = cells.value(cell++);
-    }
-    return rows;
-}
-
 } // namespace
 
 /// Rows of a collection into the catalogue, with all questions and refusals.
-class tst_ImportAsCD : public ScreenTest
+class tst_ImportAsCD : public RowsTest
 {
     Q_OBJECT
 
 private:
-    // Boxes that come, ";" between them: a part of the text, with "=Yes", "=No" or nothing.
+    // Rows "album|artist|title|part of set|year|genre", from the fourth of the list on; boxes
+    // parted by ";".
     void import(const QString &rows, const QString &boxes)
     {
-        for (const QString &box : boxes.split(u';', Qt::SkipEmptyParts))
-            mDesktop->expectBox(box.section(u'=', 0, 0), box.endsWith(u"=Yes"_s)  ? vbYes
-                                                         : box.endsWith(u"=No"_s) ? vbNo
-                                                                                  : vbOK);
-        importAsCD(*mScreen, u"My collection"_s, rowsOf(rows));
+        using enum CollectionField;
+        expect(boxes.split(u';', Qt::SkipEmptyParts));
+        importAsCD(*mScreen, u"My collection"_s,
+                   rowsOf(rows, {Album, LeadArtist, Title, PartOfSet, TrackYear, Genre}, 4));
     }
-
-    QPointer<Form> mScreen;
 
 private slots:
-    void init()
-    {
-        ScreenTest::init();
-        mScreen = new Form(u"frmCDRootMP3"_s);
-        mScreen->Load();
-    }
-
     void whatRowsBecome_data()
     {
         const auto album = "add this album=Yes;CD imported."_L1;

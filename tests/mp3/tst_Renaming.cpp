@@ -1,39 +1,25 @@
 // Label: screen
 #include "controls/list/DBListViewCTL.h"
 #include "mp3/renaming.h"
-#include "support/screentest.h"
+#include "support/rowstest.h"
 
 #include <QDir>
 #include <QPushButton>
 #include <QStorageInfo>
 #include <unistd.h>
 
-namespace
-{
-
-// "file|artist|title|track position" of each row.
-std::vector<CollectionRow> rowsOf(const QString &lines)
-{
-    using enum CollectionField;
-    std::vector<CollectionRow> rows;
-    for (const QString &line : lines.split(u'\n')) {
-        CollectionRow &row = rows.emplace_back();
-        row.index = int(rows.size());
-        const QStringList cells = line.split(u'|');
-        for (int cell = 0; const auto field : {FileName, LeadArtist, Title, TrackPosition})
-            row[field] = cells.value(cell++);
-    }
-    return rows;
-}
-
-} // namespace
-
 /// Files get the names that their tags make; each file holds the name that it began with.
-class tst_Renaming : public ScreenTest
+class tst_Renaming : public RowsTest
 {
     Q_OBJECT
 
 private:
+    // "file|artist|title|track position" of each row.
+    static std::vector<CollectionRow> rowsOf(const QString &lines)
+    {
+        using enum CollectionField;
+        return RowsTest::rowsOf(lines, {FileName, LeadArtist, Title, TrackPosition}, 1);
+    }
     QString folder() const { return mCatalogue->path("music"); }
     QByteArray contentOf(const QString &name) const { return readFile(folder() + u'/' + name); }
 
@@ -46,13 +32,10 @@ private:
         }
     }
 
-    // The rows' names behind it. Boxes as lines, "=Yes" or "=No" behind a question.
+    // The rows' names behind it.
     QStringList rename(const std::vector<CollectionRow> &rows, const QStringList &boxes)
     {
-        for (const QString &box : boxes)
-            mDesktop->expectBox(box.section(u'=', 0, 0), box.endsWith(u"=Yes"_s)  ? vbYes
-                                                         : box.endsWith(u"=No"_s) ? vbNo
-                                                                                  : vbOK);
+        expect(boxes);
         QStringList names;
         for (const CollectionRow &row : rows)
             names.append(row[CollectionField::FileName]);
@@ -63,15 +46,11 @@ private:
         return names;
     }
 
-    QPointer<Form> mScreen;
-
 private slots:
     void init()
     {
-        ScreenTest::init();
+        RowsTest::init();
         qputenv("XDG_DATA_HOME", mCatalogue->path("data").toUtf8()); // wastebasket
-        mScreen = new Form(u"frmCDRootMP3"_s);
-        mScreen->Load();
     }
 
     void names_data()
