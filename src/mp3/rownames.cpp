@@ -30,7 +30,7 @@ std::optional<QString> nameIn(const QString &folder, const QString &file)
 // A folder can be typed in more than one way, and be reached through a link.
 std::optional<QString> relativeName(const QString &folder, const QString &file)
 {
-    if (const auto plain = nameIn(QDir::cleanPath(folder), QDir::cleanPath(file)))
+    if (auto plain = nameIn(QDir::cleanPath(folder), QDir::cleanPath(file)))
         return plain;
     const QFileInfo info(file);
     const QString here = QFileInfo(folder).canonicalFilePath(); // empty if there is none
