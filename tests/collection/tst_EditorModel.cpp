@@ -71,14 +71,11 @@ private:
 
     void act()
     {
-        void (tst_EditorModel::*const actions[])() = {
-            &tst_EditorModel::addTrack,    &tst_EditorModel::addTrack,
-            &tst_EditorModel::addTrack,    &tst_EditorModel::changeTrack,
-            &tst_EditorModel::removeTrack, &tst_EditorModel::changeHead,
-            &tst_EditorModel::goToDisc,    &tst_EditorModel::addDisc,
-            &tst_EditorModel::deleteDisc,  &tst_EditorModel::saveNow,
-            &tst_EditorModel::saveNow,     &tst_EditorModel::closeEditor,
-            &tst_EditorModel::failOnce,    &tst_EditorModel::deleteInBrowser};
+        using M = tst_EditorModel;
+        void (M::*const actions[])() = {
+            &M::addTrack,   &M::addTrack, &M::addTrack,    &M::changeTrack,    &M::removeTrack,
+            &M::changeHead, &M::goToDisc, &M::addDisc,     &M::deleteDisc,     &M::saveNow,
+            &M::saveNow,    &M::failOnce, &M::closeEditor, &M::deleteInBrowser};
         (this->*actions[random(int(std::size(actions)))])();
     }
 
@@ -96,13 +93,10 @@ private:
             return;
         const int row = random(int(mShown.disc.size()));
         const Song changed = song();
-        const int titleColumn = mShown.record.isAlbum ? 2 : 3;
-        if (titleColumn == 3 && random(2)) {
-            mE->setCell(row + 1, 2, changed.artist);
-            mShown.disc[std::size_t(row)].artist = changed.artist;
-        }
-        mE->setCell(row + 1, titleColumn, changed.title);
-        mShown.disc[std::size_t(row)].title = changed.title;
+        Song &shown = mShown.disc[std::size_t(row)];
+        if (!mShown.record.isAlbum && random(2))
+            mE->setCell(row + 1, 2, shown.artist = changed.artist);
+        mE->setCell(row + 1, mShown.record.isAlbum ? 2 : 3, shown.title = changed.title);
     }
 
     void removeTrack()
@@ -316,15 +310,13 @@ private:
     {
         QStringList lines;
         for (const auto &[id, record] : mPicture) {
+            const bool isAlbum = record.isAlbum;
             for (const auto &[number, disc] : record.discs) {
-                for (std::size_t i = 0; i < disc.size(); ++i) {
-                    const QString &artist = record.isAlbum ? record.artist : disc[i].artist;
-                    lines.append(QStringList({QString::number(id), record.title,
-                                              record.isAlbum ? record.artist : u"NULL"_s,
-                                              QString::number(number), QString::number(i + 1),
-                                              artist, disc[i].title})
-                                     .join(u'|'));
-                }
+                for (int track = 1; const Song &song : disc)
+                    lines.append(u"%1|%2|%3|%4|%5|%6|%7"_s.arg(
+                        QString::number(id), record.title, isAlbum ? record.artist : u"NULL"_s,
+                        QString::number(number), QString::number(track++),
+                        isAlbum ? record.artist : song.artist, song.title));
             }
         }
         return lines;

@@ -98,8 +98,7 @@ private slots:
             QVERIFY(leave(u"1985"_s, key));
             QVERIFY(!leave({}, key)); // by design
             mE->desktop.expectBox(u"Invalid year!"_s);
-            QVERIFY(!leave(u"1900"_s, key));
-            QCOMPARE(field->text(), QString());
+            QVERIFY(!leave(u"1900"_s, key) && field->text().isEmpty());
         }
         QVERIFY2(leave(u"19"_s, Qt::Key_PageDown), "there is a way out by the keyboard");
         QCOMPARE(field->text(), u"19"_s);
@@ -109,20 +108,18 @@ private slots:
     {
         openThree();
         for (const char *field : {"txtTitel", "Genre", "txtYear"}) {
-            auto *widget = mE->control<QWidget>(field);
-            widget->setFocus();
-            keyboard::press(Qt::Key_PageDown);
+            const auto pressThere = [&](Qt::Key key, Qt::KeyboardModifiers with = {}) {
+                mE->control<QWidget>(field)->setFocus();
+                keyboard::press(key, with);
+            };
+            pressThere(Qt::Key_PageDown);
             QVERIFY(mE->disk()->hasFocus() && mE->disk()->CurrentRow() == 2);
-            widget->setFocus();
-            keyboard::press(Qt::Key_PageUp);
+            pressThere(Qt::Key_PageUp);
             QCOMPARE(mE->disk()->CurrentRow(), 1);
-            widget->setFocus();
-            for (const auto key : {Qt::Key_End, Qt::Key_Insert}) {
-                keyboard::press(key);
-                keyboard::press(key, Qt::ControlModifier);
-            }
+            pressThere(Qt::Key_End);
+            pressThere(Qt::Key_Insert, Qt::ControlModifier);
             QCOMPARE(mE->tabs()->count(), 3);
-            keyboard::press(Qt::Key_Insert, Qt::ShiftModifier);
+            pressThere(Qt::Key_Insert, Qt::ShiftModifier);
             QCOMPARE(mE->tabs()->currentIndex(), 3);
             keyboard::press(Qt::Key_End, Qt::ShiftModifier);
             QCOMPARE(mE->tabs()->count(), 3);
@@ -206,7 +203,7 @@ private slots:
         else if (field == u"Genre")
             mE->genre()->setEditText(text);
         else if (!field.isEmpty())
-            mE->editor->findChild<QLineEdit *>(field)->setText(text);
+            editor->findChild<QLineEdit *>(field)->setText(text);
         editor->SaveAtUserRequest();
         editor->SaveAtUserRequest(); // nothing more
         QTEST(mE->catalogue.count("select count(*) from Log") == 1, "updates");
@@ -229,10 +226,9 @@ private slots:
         QFETCH(QString, box);
         CdEditor *editor = openThree();
         const QStringList before = three();
+        mE->addTracks(track.split(u'|', Qt::SkipEmptyParts));
         mE->field("txtTitel")->setText(title);
         mE->field("txtYear")->setText(year);
-        if (!track.isEmpty())
-            mE->addTracks({track});
         mE->desktop.expectBox(box);
         editor->SaveKeepingPosition();
         QCOMPARE(three(), before);
@@ -330,10 +326,10 @@ private slots:
 
     void deletingADisc_data()
     {
-        const DataRows<int, int, QString> row("tab", "tabAfter", "shown");
-        row("first", 0, 0, "Three");
-        row("middle", 1, 1, "Four");
-        row("last", 2, 1, "Three");
+        const DataRows<int, int> row("tab", "tabAfter");
+        row("first", 0, 0);
+        row("middle", 1, 1);
+        row("last", 2, 1);
     }
 
     void deletingADisc()
@@ -346,9 +342,6 @@ private slots:
         keyboard::press(Qt::Key_End, Qt::ShiftModifier);
         QVERIFY(mE->editor == editor && editor->isVisible() && editor->pos() == place);
         QTEST(mE->tabs()->currentIndex(), "tabAfter");
-        QTEST(mE->cell(1, 3), "shown");
-        QCOMPARE(mE->catalogue.rows("select distinct DiskNo from CompactDiscs where CDTitels_ID=3"),
-                 texts("1", "2"));
         QVERIFY2(mE->disk()->hasFocus() && mE->button(4)->isEnabled(), "the grid keeps the focus");
         QVERIFY(mE->browser->refreshed >= 1 && editor->updatesEnabled());
     }
