@@ -105,8 +105,7 @@ private:
         mDesktop->expectFile(
             writeFile(mDesktop->folder + u"/disc.cue"_s,
                       "FILE \"disc.bin\" BINARY\nTRACK 01 AUDIO\nINDEX 01 00:00:00\n"
-                      "TRACK 02 AUDIO\nINDEX 01 00:04:00\nTRACK 03 AUDIO\n"
-                      "INDEX 01 00:08:00\n"));
+                      "TRACK 02 AUDIO\nINDEX 01 00:04:00\nTRACK 03 AUDIO\nINDEX 01 00:08:00\n"));
         auto *drives = mProgram->control<QComboBox>(screen, "TheDrive");
         drives->setCurrentText(GetMessage("xImageEntry"));
         press("cmdDownload");
@@ -135,9 +134,10 @@ private slots:
         begin(language);
         lookUp();
         QVERIFY(canImport());
-        QCOMPARE(text("txtArtist") + u'|' + text("txtTitle") + u'|' + text("txtYear") + u'|' +
-                     text("txtGenre") + u'|' + text("txtDiscNo") + u'|' + text("txtTotalDiscs"),
-                 u"Nora Vance|Harbour|1985|Rock|1|1"_s);
+        QStringList shown;
+        for (const char *field : {"txtArtist", "txtTitle", "txtYear", "txtGenre", "txtDiscNo"})
+            shown.append(text(field));
+        QCOMPARE(shown, texts("Nora Vance", "Harbour", "1985", "Rock", "1"));
         mDesktop->expectBox(GetMessage("DataNotSent").left(20));
         press("cmdSubmitDisc");
         mDesktop->expectBox(GetMessage("MsgCDDBImported"));
@@ -236,23 +236,6 @@ private slots:
         press("cmdImport");
         QCOMPARE(column("ColList", 1), texts("Hits"));
         QCOMPARE(songs(), texts("One", "Two", "?"));
-    }
-
-    void boxSets()
-    {
-        serve(exact, record("Nora Vance / Box (Disc 2 of 2)"));
-        begin(languageEnglish);
-        lookUp();
-        QCOMPARE(text("txtTitle") + text("txtDiscNo") + text("txtTotalDiscs"), u"Box22"_s);
-        mDesktop->expectBox(u"Please fill in disc number 1 of this box set!"_s);
-        press("cmdImport");
-        serve(exact, record("Nora Vance / Box (Disc 1 of 2)"));
-        signUp();
-        mProgram->choose("mnuRegisterCDDB");
-        lookUp();
-        mDesktop->expectBox(u"This CD has been imported"_s);
-        press("cmdImport");
-        QCOMPARE(songs().size(), 3);
     }
 
     void declinedNothingIsSent()

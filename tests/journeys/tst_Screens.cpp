@@ -51,22 +51,20 @@
 #include <QPushButton>
 #include <QRadioButton>
 #include <QStatusBar>
-#include <QStyle>
 #include <QTabBar>
 #include <QTabWidget>
 #include <QTest>
 #include <QTimer>
 #include <QToolBar>
-#include <functional>
 
 namespace
 {
 
-using Make = std::function<Form *()>;
+using Make = Form *(*)();
 
-template <typename Screen> Make make()
+template <typename Screen> Form *make()
 {
-    return [] { return new Screen; };
+    return new Screen;
 }
 
 Form *makeCollectionEditor()
@@ -77,25 +75,21 @@ Form *makeCollectionEditor()
 }
 
 // Of a record of Ground: by design nobody leaves the empty year of a new one by Tab.
-template <typename Editor> Make makeEditorOf(qint64 id)
+template <typename Editor, qint64 id> Form *makeEditor()
 {
-    return [id] {
-        auto *editor = new Editor;
-        editor->Mode = u"U"_s;
-        editor->CdId = id;
-        return editor;
-    };
+    auto *editor = new Editor;
+    editor->Mode = u"U"_s;
+    editor->CdId = id;
+    return editor;
 }
 
 // The browser on one of its pages.
-Make makeBrowser(int page)
+template <int page> Form *makeBrowser()
 {
-    return [page] {
-        auto *browser = new frmCDList;
-        browser->Load();
-        browser->findChild<QTabWidget *>(u"CDTab"_s)->setCurrentIndex(page);
-        return browser;
-    };
+    auto *browser = new frmCDList;
+    browser->Load();
+    browser->findChild<QTabWidget *>(u"CDTab"_s)->setCurrentIndex(page);
+    return browser;
 }
 
 // With all that was found, so that nothing is disabled.
@@ -108,14 +102,12 @@ Form *makeSearch()
 }
 
 // With the rows that its command gives.
-template <typename PrintedReport> Make makeReport()
+template <typename PrintedReport> Form *makeReport()
 {
-    return [] {
-        auto *report = new PrintedReport;
-        report->setDataSource(gConnection->Execute(PrintedReport::command()));
-        report->setCaption(PrintedReport::caption());
-        return report;
-    };
+    auto *report = new PrintedReport;
+    report->setDataSource(gConnection->Execute(PrintedReport::command()));
+    report->setCaption(PrintedReport::caption());
+    return report;
 }
 
 DiscRecord aDisc()
@@ -275,13 +267,12 @@ QString missedBy(Qt::Key key, Form *screen)
 } // namespace
 
 /// What holds for every screen in both languages: each text comes from the table, is shown whole,
-/// and each control has a name that a screen reader can say.
+/// each control has a name that a screen reader can say, and is reached by Tab and by Shift+Tab.
 class tst_Screens : public QObject
 {
     Q_OBJECT
 
-    /// How a screen is made for both tests, and what of it Shift+Tab alone reaches; "-": nobody
-    /// walks through it.
+    /// How a screen is made, and what of it Shift+Tab alone reaches; "-": nobody walks through it.
     struct Screen {
         const char *name;
         Make make;
@@ -289,37 +280,41 @@ class tst_Screens : public QObject
     };
     static std::vector<Screen> screens()
     {
-        return {{"frmSplash", make<frmSplash>(), "-"},
-                {"frmHelp", make<frmHelp>()},
-                {"frmCDList", make<frmCDList>()},
-                {"frmCDRoot", makeEditorOf<frmCDRoot>(1), "DiscsTab cmdCancel"},
-                {"frmCDRootE", makeEditorOf<frmCDRootE>(2), "DiscsTab cmdCancel"},
+        return {{"frmSplash", make<frmSplash>, "-"},
+                {"frmHelp", make<frmHelp>},
+                {"frmCDList", makeBrowser<0>},
+                {"frmCDList, albums", makeBrowser<1>},
+                {"frmCDList, records", makeBrowser<2>},
+                {"frmCDList, MP3", makeBrowser<3>},
+                {"frmCDRoot", makeEditor<frmCDRoot, 1>, "DiscsTab cmdCancel"},
+                {"frmCDRootE", makeEditor<frmCDRootE, 2>, "DiscsTab cmdCancel"},
                 {"frmCDRootMP3", makeCollectionEditor},
-                {"frmImportWizard", make<frmImportWizard>()},
-                {"frmImportBusy", make<frmImportBusy>(), "-"},
-                {"frmImport", make<frmImport>()},
-                {"frmImportDBBusy", make<frmImportDBBusy>(), "-"},
+                {"frmImportWizard", make<frmImportWizard>},
+                {"frmImportBusy", make<frmImportBusy>, "-"},
+                {"frmImport", make<frmImport>},
+                {"frmImportDBBusy", make<frmImportDBBusy>, "-"},
                 {"frmSearchArtistsTitles", makeSearch},
-                {"CompilationReport", makeReport<CompilationReport>()},
-                {"AlbumReport", makeReport<AlbumReport>()},
-                {"PlatenbakReport", makeReport<PlatenbakReport>()},
+                {"CompilationReport", makeReport<CompilationReport>},
+                {"AlbumReport", makeReport<AlbumReport>},
+                {"PlatenbakReport", makeReport<PlatenbakReport>},
                 {"frmPageSetup", makePageSetup<QPageLayout::Portrait>},
-                {"frmAutoUpdateUtility", make<frmAutoUpdateUtility>(), "-"},
-                {"frmDiscInfoCDDB", make<frmDiscInfoCDDB>()},
+                {"frmPageSetup, landscape", makePageSetup<QPageLayout::Landscape>},
+                {"frmAutoUpdateUtility", make<frmAutoUpdateUtility>, "-"},
+                {"frmDiscInfoCDDB", make<frmDiscInfoCDDB>},
                 {"DiscEditor", makeDiscEditor},
                 {"Candidates", makeCandidates},
-                {"SearchByWords", make<SearchByWords>()},
+                {"SearchByWords", make<SearchByWords>},
                 {"SignUp", makeSignUp},
-                {"Credits", make<Credits>()},
-                {"ProxyInfo", make<ProxyInfo>()},
-                {"frmWhatNow", make<frmWhatNow>()},
+                {"Credits", make<Credits>},
+                {"ProxyInfo", make<ProxyInfo>},
+                {"frmWhatNow", make<frmWhatNow>},
                 {"frmWhatCD", makeWhatCD},
                 {"EditMP3Tags", makeTagEditor},
-                {"frmTracks", make<frmTracks>()},
-                {"frmMatchWithSongcase", make<frmMatchWithSongcase>()},
+                {"frmTracks", make<frmTracks>},
+                {"frmMatchWithSongcase", make<frmMatchWithSongcase>},
                 {"frmTagWizardPg1", makeTagWizard},
                 {"RenamePreview", makeRenamePreview},
-                {"UndoChanges", make<UndoChanges>()}};
+                {"UndoChanges", make<UndoChanges>}};
     }
 
     /// Discs on every page of the browser, so that nothing is disabled; a user who has signed up.
@@ -393,12 +388,14 @@ private slots:
         QVERIFY(program.end());
     }
 
+    // By design the last track of an editor leads to the first field: what stands below is reached
+    // from there, by Shift+Tab.
     void everyScreen_data()
     {
-        const DataRows<int, Make> row("language", "make");
-        for (const auto &[name, make, _] : screens()) {
-            row(QByteArray(name) + ", English", languageEnglish, make);
-            row(QByteArray(name) + ", Dutch", languageDutch, make);
+        const DataRows<int, Make, QString> row("language", "make", "byShiftTabAlone");
+        for (const auto &[name, make, byShiftTabAlone] : screens()) {
+            row(QByteArray(name) + ", English", languageEnglish, make, byShiftTabAlone);
+            row(QByteArray(name) + ", Dutch", languageDutch, make, byShiftTabAlone);
         }
     }
 
@@ -413,37 +410,15 @@ private slots:
         for (QTimer *timer : screen->findChildren<QTimer *>())
             timer->stop();
         screen->Show();
-        QVERIFY(QTest::qWaitForWindowExposed(screen));
-        QVERIFY2(!screen->windowTitle().isEmpty(), "a window without a title");
-        check(screen);
-        screen->Unload();
-        QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
-    }
-
-    // Each control is reached by Tab, and by Shift+Tab. By design the last track of an editor
-    // leads to the first field: what stands below is reached from there, by Shift+Tab.
-    void tabWalksAround_data()
-    {
-        const DataRows<Make, QString> row("make", "by Shift+Tab alone");
-        for (const auto &[name, make, byShiftTabAlone] : screens()) {
-            if (qstrcmp(byShiftTabAlone, "-") != 0)
-                row(name, make, byShiftTabAlone);
-        }
-        for (int page = 1; page < 4; ++page)
-            row("frmCDList, page " + QByteArray::number(page), makeBrowser(page), "");
-        row("frmPageSetup, landscape", makePageSetup<QPageLayout::Landscape>, "");
-    }
-
-    void tabWalksAround()
-    {
-        QFETCH(Make, make);
-        const Ground ground;
-        Form *screen = make();
-        screen->Show();
         screen->activateWindow();
         QVERIFY(QTest::qWaitForWindowActive(screen));
-        QTEST(missedBy(Qt::Key_Tab, screen), "by Shift+Tab alone");
-        QCOMPARE(missedBy(Qt::Key_Backtab, screen), QString());
+        QVERIFY2(!screen->windowTitle().isEmpty(), "a window without a title");
+        check(screen);
+        QFETCH(QString, byShiftTabAlone);
+        if (byShiftTabAlone != "-"_L1) {
+            QCOMPARE(missedBy(Qt::Key_Tab, screen), byShiftTabAlone);
+            QCOMPARE(missedBy(Qt::Key_Backtab, screen), QString());
+        }
         screen->Unload();
         QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
     }
