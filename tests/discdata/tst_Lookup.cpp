@@ -79,7 +79,8 @@ private:
         for (const DiscRecord &disc : found.candidates)
             titles.append(disc.title + (disc.isWhole() ? QString() : u" (to read)"_s));
         const QString day = found.keptOn ? u" of "_s + found.keptOn->toString(Qt::ISODate) : u""_s;
-        return titles.isEmpty() ? u"none"_s : titles.join(u'|') + day;
+        const QString sure = found.isDoubtful ? u" (doubtful)"_s : u""_s;
+        return titles.isEmpty() ? u"none"_s : titles.join(u'|') + sure + day;
     }
 
     // Both services are gone.
@@ -126,6 +127,15 @@ private slots:
         row("the first is off", "off", exact, "Of CDDB", 2);
         row("the first talks nonsense", "<html>", exact, "Of CDDB", 2);
         row("several", nothing, several, "Of CDDB (to read)|Another (to read)", 1);
+        row("close, as many tracks", nothing, "211 list\r\nrock 1b03cc03 A / B\r\n.\r\n", "Of CDDB",
+            2);
+        row("close, fewer tracks", nothing, "211 list\r\nrock 1b03cc02 A / B\r\n.\r\n",
+            "Of CDDB (doubtful)", 2);
+        // They look the same in the list, so the user could not choose: two pressings of one
+        // record.
+        row("repeats", nothing,
+            "210 list\r\nrock 1b03cb03 A / Don't\r\nrock 1b03cb03 A / Don’t\r\n.\r\n", "Of CDDB",
+            2);
         row("neither", nothing, noMatch, "none", 1);
         row("off, and not known", "off", noMatch, "none", 1);
         row("not known, and off", nothing, "off", "8", 0);
@@ -142,6 +152,8 @@ private slots:
         QFETCH(QByteArray, cddb);
         lay(*mMusicBrainz, "discid", musicBrainz);
         lay(*mCddb, "cddb query", cddb);
+        mCddb->answer("1b03cc03", record);
+        mCddb->answer("1b03cc02", QByteArray(record).replace("TTITLE2=Three\r\n", ""));
         QTEST(found(), "found");
         QTEST(int(mCddb->requests.size()), "askedCddb");
     }
@@ -176,36 +188,6 @@ private slots:
         mOptions.mail = u"jane@my.host.example"_s; // another may be let in
         QCOMPARE(found(), u"1003"_s);
         QCOMPARE(mCddb->requests.size(), 2);
-    }
-
-    // They look the same in the list, so the user could not choose; two pressings of one record.
-    void repeatsAreOne()
-    {
-        mMusicBrainz->answer("discid", nothing);
-        mCddb->answer("cddb query", "210 list\r\nrock 1b03cb03 The Band / Don't\r\n"
-                                    "rock 1b03cb03 The Band / Don’t\r\n.\r\n");
-        QCOMPARE(found(), u"Of CDDB"_s);
-        QCOMPARE(mCddb->requests.size(), 2);
-    }
-
-    void aCloseOneMayBeAnother_data()
-    {
-        const DataRows<QByteArray, bool> row("query", "doubtful");
-        row("as many tracks", "211 list\r\nrock 1b03cc03 A / B\r\n.\r\n", false);
-        row("fewer tracks", "211 list\r\nrock 1b03cc02 A / B\r\n.\r\n", true);
-    }
-
-    void aCloseOneMayBeAnother()
-    {
-        QFETCH(QByteArray, query);
-        mMusicBrainz->answer("discid", nothing);
-        mCddb->answer("cddb query", query);
-        mCddb->answer("1b03cc03", record);
-        mCddb->answer("1b03cc02", QByteArray(record).replace("TTITLE2=Three\r\n", ""));
-        const Lookup::Found found = session()->find(mToc, *mWork);
-        QCOMPARE(found.candidates.size(), 1U);
-        QVERIFY(found.candidates[0].isWhole());
-        QTEST(found.isDoubtful, "doubtful");
     }
 
     void answersAreKept()

@@ -3,8 +3,6 @@
 #include "platform/error/error.h"
 #include "support/datarows.h"
 
-#include <QJsonDocument>
-
 namespace
 {
 
@@ -150,23 +148,6 @@ private slots:
         dataBehind.tracks.push_back({1500 + 11400, true});
         dataBehind.leadOut = 20000;
         QCOMPARE(namesOf(discsOf({found({release("A", {near(0)})})}, dataBehind)), u"A 1/1"_s);
-    }
-
-    void pages_data()
-    {
-        const DataRows<QByteArray, int, int, QString> row("answer", "listed", "all", "first");
-        row("by id", "{'id':'x','releases':[{'id':'a'},{'id':'b'}]}", 2, -1, "a");
-        row("by lengths", "{'release-count':7,'releases':[{'id':'a'}]}", 1, 7, "a");
-        row("none", "{'release-count':0,'releases':[]}", 0, 0, "");
-        row("other types", "{'release-count':'7','releases':[7]}", 1, -1, "");
-    }
-    void pages()
-    {
-        QFETCH(QByteArray, answer);
-        const MusicBrainzPage page = musicBrainzPage(json(answer));
-        QTEST(page.listed, "listed");
-        QTEST(page.all, "all");
-        QTEST(page.first, "first");
     }
 
     void aStub()

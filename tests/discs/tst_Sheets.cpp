@@ -50,44 +50,40 @@ private slots:
         const DataRows<QByteArray, QString> row("sheet", "table");
         row("one image", image + first + "TRACK 02 AUDIO\nINDEX 00 00:03:00\nINDEX 01 00:04:00",
             "150 450 | 1150");
-        row("hidden sound", image + "TRACK 01 AUDIO\nINDEX 00 00:00:00\nINDEX 01 00:02:25",
+        row("hidden sound", image + "TRACK 01 AUDIO\nINDEX 00 0:0:0\nINDEX 01 00:02:25",
             "325 | 1150");
         row("old line ends, tabs, small letters",
             "file long.bin binary\r\ttrack 1 audio\r\n\tindex 01\t00:00:00\r", "150 | 1150");
         row("no type, a blank in the name", "FILE \"a b.bin\"\n" + first, "missing a b.bin");
         row("files of sound",
-            "FILE \"a.wav\" WAVE\n" + first +
-                "FILE \"b.wav\" WAVE\nTRACK 02 AUDIO\nINDEX 01 00:00:00",
+            "FILE \"a.wav\" WAVE\n" + first + "FILE \"b.wav\" WAVE\nTRACK 02 AUDIO\nINDEX 01 0:0:0",
             "150 450 | 750");
         row("gap in the file before",
             "FILE a.wav WAVE\n" + first +
-                "TRACK 02 AUDIO\nINDEX 00 00:03:00\nFILE b.wav WAVE\n"
-                "INDEX 01 00:00:00",
+                "TRACK 02 AUDIO\nINDEX 00 0:3:0\nFILE b.wav WAVE\nINDEX 01 0:0:0",
             "150 450 | 750");
         row("silence that stands in no file",
-            image + "TRACK 01 AUDIO\nPREGAP 00:00:32\nINDEX 01 00:00:00\nPOSTGAP 00:01:00\n"
-                    "TRACK 02 AUDIO\nPREGAP 00:02:00\nINDEX 01 00:04:00\n",
+            image + "TRACK 01 AUDIO\nPREGAP 00:00:32\nINDEX 01 0:0:0\nPOSTGAP 0:1:0\n"
+                    "TRACK 02 AUDIO\nPREGAP 0:2:0\nINDEX 01 0:4:0\n",
             "182 707 | 1407");
         row("data of 2048 bytes before sound",
-            "FILE odd.bin BINARY\nTRACK 01 MODE1/2048\nINDEX 01 00:00:00\n"
-            "TRACK 02 AUDIO\nINDEX 00 00:02:00\nINDEX 01 00:04:00",
+            "FILE odd.bin BINARY\nTRACK 01 MODE1/2048\nINDEX 01 0:0:0\n"
+            "TRACK 02 AUDIO\nINDEX 00 0:2:0\nINDEX 01 0:4:0",
             "150D 450 | 1040");
         row("second session",
             "FILE a.wav WAVE\n" + first + "REM SESSION 02\n" + image +
-                "TRACK 02 MODE2/2352\nINDEX 01 00:00:00",
+                "TRACK 02 MODE2/2352\nINDEX 01 0:0:0",
             "150 11850D | 12850");
-        row("first track has another number", image + "TRACK 05 AUDIO\nINDEX 01 00:00:00\n",
+        row("first track has another number", image + "TRACK 05 AUDIO\nINDEX 01 0:0:0\n",
             "150 | 1150");
         row("image shorter than the tracks", image + first + "TRACK 02 AUDIO\nINDEX 01 00:20:00",
             "-");
-        row("no sound", image + "TRACK 01 MODE1/2352\nINDEX 01 00:00:00", "-");
-        row("track left out", image + first + "TRACK 03 AUDIO\nINDEX 01 00:04:00", "-");
-        row("track without a start", image + first + "TRACK 02 AUDIO\nINDEX 00 00:04:00", "-");
+        row("no sound", image + "TRACK 01 MODE1/2352\nINDEX 01 0:0:0", "-");
+        row("track left out", image + first + "TRACK 03 AUDIO\nINDEX 01 0:4:0", "-");
+        row("track without a start", image + first + "TRACK 02 AUDIO\nINDEX 00 0:4:0", "-");
         row("no such time", image + "TRACK 01 AUDIO\nINDEX 01 00:60:00", "-");
-        row("sectors of no size", image + "TRACK 01 MODE1/0000\nINDEX 01 00:00:00\n" + first, "-");
-        row("backwards",
-            image + "TRACK 01 AUDIO\nINDEX 01 00:05:00\nTRACK 02 AUDIO\n"
-                    "INDEX 01 00:04:00",
+        row("sectors of no size", image + "TRACK 01 MODE1/0000\nINDEX 01 0:0:0\n" + first, "-");
+        row("backwards", image + "TRACK 01 AUDIO\nINDEX 01 0:5:0\nTRACK 02 AUDIO\nINDEX 01 0:4:0",
             "-");
         row("empty", "", "-");
     }

@@ -7,8 +7,7 @@ namespace
 {
 
 const QByteArray head =
-    "# xmcd\n# Track frame offsets:\n#\t150\n#   7650 \n#\n# Disc length: 202 s\n"
-    "# Revision: 4\n";
+    "# xmcd\n# Track frame offsets:\n#\t150\n#   7650 \n#\n# Disc length: 202 s\n# Revision: 4\n";
 
 DiscRecord read(const QByteArray &lines)
 {
