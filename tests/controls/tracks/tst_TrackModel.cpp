@@ -162,19 +162,15 @@ private slots:
             QStringList states{textOf(model)};
             for (int step = 0; step < 12; ++step) {
                 const int row = below(model.rowCount());
-                switch (below(4)) {
-                case 0:
+                const int edit = below(4);
+                if (edit == 0)
                     model.insertTrack(row);
-                    break;
-                case 1:
+                else if (edit == 1)
                     model.removeTrack(row);
-                    break;
-                case 2:
+                else if (edit == 2)
                     model.paste(row, below(4), {{u"p"_s, u"q"_s}, {}});
-                    break;
-                default:
+                else
                     model.setText(row, TrackField(1 + below(3)), QString::number(below(3)));
-                }
                 if (textOf(model) != states.last())
                     states.append(textOf(model));
             }

@@ -54,8 +54,7 @@ private slots:
         mCatalogue->exec(
             "insert into artiesten values (1,'Abba'),(2,'Beck');"
             "insert into tracks values (1,1,'Waterloo','Pop',1974),(2,1,'SOS','Pop',1975),"
-            "(3,2,'Loser',NULL,NULL);"
-            "insert into cdtitels values "
+            "(3,2,'Loser',NULL,NULL);insert into cdtitels values "
             "(1,'Hits',NULL,'V',NULL,NULL),(2,'More',NULL,'V',NULL,NULL),"
             "(3,'Gold',1,'E',NULL,NULL);"
             "insert into compactdiscs values (10,1,1,1,1,NULL),(11,1,1,2,2,NULL),(12,1,1,3,3,NULL),"
@@ -91,10 +90,7 @@ private slots:
         const auto insert = [](TrackModel &m) { m.insertTrack(1); };
         const auto remove = [](int row) { return [=](TrackModel &m) { m.removeTrack(row); }; };
         const auto both = [](const Edit &first, const Edit &second) {
-            return [=](TrackModel &m) {
-                first(m);
-                second(m);
-            };
+            return [=](TrackModel &m) { first(m), second(m); };
         };
         row("genre of a track of this disc's", type(1, GenreField, "Rock"), "Tracks 2");
         row("title to a new one", type(1, TitleField, "Chiquitita"), "+Tracks 4;CompactDiscs 11");
