@@ -71,6 +71,7 @@ void sortByNumbers(std::vector<RippedFile> &files)
 std::optional<TableOfContents> tocOf(const std::vector<RippedFile> &files)
 {
     std::vector<int> lengths;
+    lengths.reserve(files.size());
     for (const RippedFile &file : files)
         lengths.push_back(file.sound.length);
     return tocOfLengths(lengths);

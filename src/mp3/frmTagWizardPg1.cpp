@@ -199,6 +199,8 @@ void frmTagWizardPg1::OKButton_Click()
         }
         if (AnyTagPresent() && askYesNo(GetMessage("AllTagsWillBeOverwritten")) != vbYes)
             return;
+        if (isUnloaded()) // behind the box
+            return;
         mCancelled = false;
         if (!match() && !mCancelled && !isUnloaded())
             errorBox(GetMessage("MP3TagsProcNoMatchFound"));
