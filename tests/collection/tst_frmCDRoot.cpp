@@ -453,19 +453,6 @@ private slots:
         QVERIFY(second->Unload());
     }
 
-    void anIdGivenToAnotherMeanwhile()
-    {
-        CdEditor *editor = openThree();
-        mE->catalogue.exec("update CDTitels set Titel='Another' where ID=3;"
-                           "update CompactDiscs set Track_ID=4 where CDTitels_ID=3");
-        const QStringList before = three();
-        mE->addTracks(texts("Dora|Five"));
-        mE->desktop.expectBox(u"Nothing was saved"_s);
-        editor->SaveKeepingPosition();
-        QCOMPARE(three(), before);
-        QVERIFY(mE->disk()->IsChanged());
-    }
-
     // While events are handled in the middle of a save, no other command begins.
     void nobodyClosesABusyForm()
     {
