@@ -276,13 +276,14 @@ private slots:
             return [=, this](const QString &) { exec(sql); };
         };
         const auto gone = [](const QString &f) { QFile::remove(f); };
+        const auto folder = [](const QString &f) { return QFile::remove(f) && QDir().mkpath(f); };
+        const auto foreign = [this](const QString &f) {
+            QFile::remove(f);
+            exec("create table artiesten(id)");
+        };
         row("empty", resized(0), "not a catalogue");
-        row(
-            "folder", [=](const QString &f) { gone(f), QDir().mkpath(f); }, "not a catalogue");
-        row(
-            "database of another program",
-            [=, this](const QString &f) { gone(f), exec("create table artiesten(id)"); },
-            "not a catalogue");
+        row("folder", folder, "not a catalogue");
+        row("database of another program", foreign, "not a catalogue");
         row("not there", gone, "cannot be opened");
         row("no rights", rights(0), "cannot be opened");
         row("newer", changed("pragma user_version=83886080"), "newer version"); // 5 << 24

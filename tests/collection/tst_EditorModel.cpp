@@ -94,9 +94,12 @@ private:
         const int row = random(int(mShown.disc.size()));
         const Song changed = song();
         Song &shown = mShown.disc[std::size_t(row)];
-        if (!mShown.record.isAlbum && random(2))
-            mE->setCell(row + 1, 2, shown.artist = changed.artist);
-        mE->setCell(row + 1, mShown.record.isAlbum ? 2 : 3, shown.title = changed.title);
+        shown.title = changed.title;
+        if (!mShown.record.isAlbum && random(2)) {
+            shown.artist = changed.artist;
+            mE->setCell(row + 1, 2, changed.artist);
+        }
+        mE->setCell(row + 1, mShown.record.isAlbum ? 2 : 3, changed.title);
     }
 
     void removeTrack()

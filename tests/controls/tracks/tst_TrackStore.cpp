@@ -90,7 +90,10 @@ private slots:
         const auto insert = [](TrackModel &m) { m.insertTrack(1); };
         const auto remove = [](int row) { return [=](TrackModel &m) { m.removeTrack(row); }; };
         const auto both = [](const Edit &first, const Edit &second) {
-            return [=](TrackModel &m) { first(m), second(m); };
+            return [=](TrackModel &m) {
+                first(m);
+                second(m);
+            };
         };
         row("genre of a track of this disc's", type(1, GenreField, "Rock"), "Tracks 2");
         row("title to a new one", type(1, TitleField, "Chiquitita"), "+Tracks 4;CompactDiscs 11");
