@@ -340,8 +340,19 @@ void frmCDRootMP3::RestoreListPosition()
 }
 
 // The box of an earlier press may still stand open.
+// A refresh handles events, and within the toolkit's own activation the window before may go away.
 void frmCDRootMP3::Form_Activate()
 {
+    if (gTagsChanged || mFilesChanged)
+        QMetaObject::invokeMethod(this, &frmCDRootMP3::activate, Qt::QueuedConnection);
+    else
+        activate();
+}
+
+void frmCDRootMP3::activate()
+{
+    if (isUnloaded())
+        return;
     DragActive = false;
     if (!FormReady || isBusy() || !mUi->TheMP3Collection->isEnabled())
         return;

@@ -51,6 +51,7 @@ public:
 protected:
     void Form_Load() override;
     void Form_Activate() override;
+    void activate(); // also when a screen that it has opened has closed
     bool eventFilter(QObject *watched, QEvent *event) override;
 
 private:

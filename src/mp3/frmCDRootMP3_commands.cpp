@@ -120,7 +120,7 @@ void frmCDRootMP3::cmdUpdateID3_Click()
         backFromTagScreen();
     } else {
         RefreshAndHandleButtons();
-        Form_Activate();
+        activate();
     }
 }
 
@@ -130,7 +130,7 @@ void frmCDRootMP3::backFromTagScreen()
     if (isUnloaded())
         return;
     RedrawLocked = true;
-    Form_Activate();
+    activate();
     RedrawLocked = false;
 }
 
@@ -144,7 +144,7 @@ void frmCDRootMP3::cmdTagWizard_Click()
         if (FileExists(pathInFolder(folder(), row[CollectionField::FileName])))
             continue;
         RefreshAndHandleButtons();
-        Form_Activate();
+        activate();
         return;
     }
     try {
