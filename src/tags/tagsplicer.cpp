@@ -200,10 +200,16 @@ SplicedTag splicedTag(const QByteArray &tag, const CddbID3Tag &current, const Cd
         return {tag, false};
     const TagLayout layout = tag.isEmpty() ? TagLayout() : layoutOf(tag);
     Splicer splicer(tag, layout);
+    // Blanks are read as nothing, yet their frame is not taken away: they say so to other programs.
+    const auto toWrite = [&](TagField field) {
+        const QString &text = target.field(field);
+        const bool isBlank = text.isEmpty() && !wanted.field(field).isEmpty();
+        return isBlank && field != TagField::FileId ? u" "_s : text;
+    };
     for (int i = 0; i < tagFields; ++i) {
         const auto field = TagField(i);
         if (target.field(field) != current.field(field))
-            splicer.replace(field, target.field(field));
+            splicer.replace(field, toWrite(field));
     }
     return {composed(tag, layout, splicer.frames()), true};
 }

@@ -85,6 +85,8 @@ private slots:
             textFrame("TIT2", "New") + other);
         row("behind the others", 3, other, title, u"New"_s, other + textFrame("TIT2", "New"));
         row("taken away", 3, textFrame("TIT2", "Old") + other, title, u""_s, other);
+        row("a blank", 3, textFrame("TIT2", "Old") + other, title, u" "_s,
+            textFrame("TIT2", " ") + other);
         row("Latin-1", 3, textFrame("TIT2", "x"), title, u"é"_s, textFrame("TIT2", "\xE9"));
         row("UTF-16", 3, textFrame("TIT2", "x"), title, u"€"_s,
             frame("TIT2", "\1\xFF\xFE\xAC\x20"_ba));
