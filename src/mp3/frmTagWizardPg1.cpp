@@ -161,9 +161,12 @@ QString frmTagWizardPg1::pathOf(int row) const
 
 void frmTagWizardPg1::followChecks()
 {
-    auto items = mUi->TheFileList->ListItems();
+    DBListViewCTL &list = *mUi->TheFileList;
+    const QModelIndex current = list.currentIndex(); // where the keys go on
+    auto items = list.ListItems();
     for (int row = 1; row <= items.Count(); ++row)
         items.Item(row).setSelected(items.Item(row).Checked());
+    list.selectionModel()->setCurrentIndex(current, QItemSelectionModel::NoUpdate);
 }
 
 bool frmTagWizardPg1::AnyFileChecked() const

@@ -90,7 +90,9 @@ private slots:
         open(mFiles);
         QVERIFY(list()->ListItems().Item(1).Checked() && list()->ListItems().Item(1).Selected());
         checkRow(3, true);
-        checkRow(1, false);
+        for (const Qt::Key key : {Qt::Key_Down, Qt::Key_Up, Qt::Key_Space})
+            QTest::keyClick(list(), key);
+        QCOMPARE(list()->currentIndex().row(), 0); // where the keys go on
         QVERIFY(!list()->ListItems().Item(1).Selected() && list()->ListItems().Item(3).Selected());
         checkRow(3, false);
         expectOfKey("MP3TagsProcCheckFiles");
