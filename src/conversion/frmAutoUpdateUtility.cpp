@@ -80,10 +80,15 @@ void frmAutoUpdateUtility::Form_Load()
     placeInFrame(this, 0.15, 0.2);
     setCaptions();
     setHeight(smallHeight);
-    if (isCatalogueEmpty())
-        offerOldFile();
-    else
-        showNotEmpty();
+    try {
+        if (isCatalogueEmpty())
+            offerOldFile();
+        else
+            showNotEmpty();
+    } catch (const Error &error) { // another program may keep the catalogue locked
+        errorBox(error.numbered(), GetMessage("MsgSysErr"));
+        Unload();
+    }
 }
 
 void frmAutoUpdateUtility::setCaptions()

@@ -293,6 +293,13 @@ private slots:
             QVERIFY(!button(screen, name)->isVisible());
     }
 
+    void catalogueThatCannotBeRead()
+    {
+        mCatalogue->exec("drop table Artiesten");
+        mDesktop->expectBox(u"artiesten"_s);
+        QVERIFY(show()->isUnloaded());
+    }
+
     void choosingTheFile()
     {
         const QString folder = mCatalogue->path("old");
