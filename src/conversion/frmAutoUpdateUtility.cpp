@@ -133,7 +133,11 @@ void frmAutoUpdateUtility::setHeight(int pixels)
     layout()->activate();
     const int need = layout()->hasHeightForWidth() ? layout()->totalHeightForWidth(width())
                                                    : layout()->totalMinimumSize().height();
-    resize(width(), std::max(pixels, need));
+    const QSize size(width(), std::max(pixels, need));
+    if (isWindow() && isVisible())
+        placeOnScreen(this, pos(), size); // the log would end below the edge of a small screen
+    else
+        resize(size);
 }
 
 void frmAutoUpdateUtility::cmdBrowse_Click()

@@ -7,6 +7,7 @@
 #include "support/onscreen.h"
 
 #include <QAbstractButton>
+#include <QLineEdit>
 #include <QScreen>
 
 /// A screen of 960 by 540: one of 1920 by 1080 whose owner wants all twice as large.
@@ -57,6 +58,21 @@ private slots:
             shown.Unload();
         });
         form->ShowModal();
+    }
+
+    // Begins low on the screen, and has a log to show then.
+    void conversionGrowsWithinTheScreen()
+    {
+        start(languageEnglish);
+        mProgram->frame().move(0, 300);
+        mDesktop->expectModal(u"frmAutoUpdateUtility"_s, [this](Form &shown) {
+            shown.findChild<QLineEdit *>(u"txtOldDatabaseFileName"_s)->setText(mDesktop->folder);
+            shown.findChild<QAbstractButton *>(u"cmdStartConversion"_s)->click();
+            QCOMPARE(outside(shown), QString());
+            shown.Unload();
+        });
+        mProgram->choose("mnuConvertDatabase");
+        mDesktop->verifyAllCame();
     }
 
     void aMaximizedFrameStaysSo()
