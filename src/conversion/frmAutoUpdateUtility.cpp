@@ -189,12 +189,14 @@ void frmAutoUpdateUtility::run()
 {
     LongWork work(*this);
     work.showPercent = [](int) {}; // each row moves the bar by itself
+    mWork = &work;
     try {
         convert(work);
     } catch (const Error &error) {
         tellFailure(error);
     }
     mTransaction.reset();
+    mWork = nullptr;
 }
 
 void frmAutoUpdateUtility::convert(LongWork &work)
@@ -263,12 +265,14 @@ void frmAutoUpdateUtility::cmdCancel_Click()
 {
     mCancelRequested = true;
     Desktop::current().pump();
-    if (mConverting)
+    if (mConverting) {
         CancelConversion();
-    else if (isBusy())
+    } else if (mWork) {
         mUnloadAtEnd = true;
-    else
+        mWork->cancel(); // it may wait for a file that brings nothing
+    } else {
         Unload();
+    }
 }
 
 void frmAutoUpdateUtility::CancelConversion()

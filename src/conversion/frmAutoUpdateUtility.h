@@ -65,6 +65,7 @@ private:
     std::unique_ptr<ADODB::Connection> mOldConnection;
     std::unique_ptr<ADODB::Transaction> mTransaction; // of the copying routine
     bool mCancelRequested = false, mConverting = false;
+    LongWork *mWork = nullptr;
     bool mUnloadAtEnd = false; // of the routine that runs
 
     float mProgress = 0;

@@ -5,12 +5,14 @@
 #include "support/jetfile.h"
 #include "support/screentest.h"
 
+#include <QElapsedTimer>
 #include <QLabel>
 #include <QLineEdit>
 #include <QPlainTextEdit>
 #include <QProgressBar>
 #include <QPushButton>
 #include <QTimer>
+#include <csignal>
 
 /// Catalogues of the older program, and what is none: taken over whole or not at all.
 class tst_frmAutoUpdateUtility : public ScreenTest
@@ -280,6 +282,28 @@ private slots:
                  texts("Conversion cancelled.", "Stopped at 11/22/26 12:00:00"));
         button(screen, "cmdCancel")->click();
         QVERIFY(screen->isUnloaded());
+    }
+
+    // On a dying medium, or where the library does not come to an end.
+    void cancelWhileTheFileHangs()
+    {
+        const QString file = writeFile(mCatalogue->path("Compact3.orv"), jetFile(oldCatalogue()));
+        const QPointer<Form> screen = show();
+        QTimer timer;
+        connect(&timer, &QTimer::timeout, screen, [&] {
+            const int helper = readFile(u"/proc/thread-self/children"_s).trimmed().toInt();
+            if (helper <= 0)
+                return;
+            timer.stop();
+            kill(helper, SIGSTOP);
+            button(screen, "cmdCancel")->click();
+        });
+        timer.start(0);
+        QElapsedTimer time;
+        time.start();
+        convert(screen, file);
+        QVERIFY(time.elapsed() < 10'000);
+        QVERIFY(!timer.isActive() && screen->isUnloaded());
     }
 
     void notIntoACatalogueWithArtists()
