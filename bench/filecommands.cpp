@@ -1,10 +1,10 @@
+#include "measure.h"
 #include "platform/error/error.h"
 #include "services/fileutilities.h"
 #include "tags/filechanges.h"
 #include "workcommands.h"
 
 #include <QFileInfo>
-#include <cstdio>
 #include <map>
 
 using namespace Qt::StringLiterals;
@@ -48,9 +48,15 @@ void saveTag(const QStringList &arguments)
         tags.emplace_back(file, tag);
     }
     FileJournal journal(u"./Changes"_s);
-    FileChanges changes(journal, {});
-    changes.announce(tags);
-    for (const auto &[file, tag] : tags)
-        changes.saveTag(tag, file);
-    std::printf("files=%zu\n", tags.size());
+    measured("open", [&] {
+        journal.mend();
+        return std::string();
+    });
+    measured("save", [&] {
+        FileChanges changes(journal, {});
+        changes.announce(tags);
+        for (const auto &[file, tag] : tags)
+            changes.saveTag(tag, file);
+        return count("files", qint64(tags.size()));
+    });
 }

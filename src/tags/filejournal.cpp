@@ -84,7 +84,7 @@ void FileJournal::open()
     if (mIsOpen)
         return;
     Read read;
-    mStore.readLast([&](const QByteArray &entry, const JournalStore::Place &place) {
+    mStore.openLast([&](const QByteArray &entry, const JournalStore::Place &place) {
         QDataStream in(entry);
         in.setVersion(QDataStream::Qt_6_0);
         quint8 word = 0;
@@ -92,8 +92,8 @@ void FileJournal::open()
         if (Word(word) == Word::Numbers)
             in >> mLastId >> mLastBatch;
         take(read, entry, place);
-        for (const auto &[id, each] : read.entries)
-            mLastId = std::max(mLastId, id);
+        if (!read.entries.empty())
+            mLastId = std::max(mLastId, read.entries.rbegin()->first);
     });
     for (const ChangeBatch &batch : read.batches)
         mLastBatch = std::max(mLastBatch, batch.number);

@@ -58,6 +58,28 @@ std::optional<Head> headIn(const QByteArray &bytes)
     return found == mark && head.words <= longestWords ? std::optional(head) : std::nullopt;
 }
 
+// Reads small pieces one behind the other with few calls.
+class Ahead
+{
+public:
+    explicit Ahead(const SystemFile &file) : mFile(file) {}
+
+    QByteArray read(qint64 from, qint64 count)
+    {
+        constexpr qint64 atOnce = 256 * 1024;
+        if (from < mFrom || from + count > mFrom + mBytes.size()) {
+            mBytes = mFile.read(from, std::max(atOnce, count));
+            mFrom = from;
+        }
+        return mBytes.mid(from - mFrom, count);
+    }
+
+private:
+    const SystemFile &mFile;
+    QByteArray mBytes;
+    qint64 mFrom = 0;
+};
+
 } // namespace
 
 JournalStore::JournalStore(QString folder, JournalSizes sizes)
@@ -85,12 +107,13 @@ qint64 JournalStore::readPart(int part, const Reader &reader) const
 {
     const SystemFile file(nameOf(part), SystemFile::Mode::Read);
     const qint64 size = file.size();
+    Ahead ahead(file);
     qint64 at = 0;
-    while (const auto head = headIn(file.read(at, headSize))) {
+    while (const auto head = headIn(ahead.read(at, headSize))) {
         const qint64 bytesAt = at + headSize + head->words;
         if (bytesAt > size || qint64(head->bytes) > size - bytesAt)
             break;
-        const QByteArray words = file.read(at + headSize, head->words);
+        const QByteArray words = ahead.read(at + headSize, head->words);
         if (checksumOfWords(head->words, head->bytes, words) != head->ofWords)
             break;
         reader(words, {part, at, qint64(head->bytes)});
@@ -105,22 +128,22 @@ void JournalStore::readAll(const Reader &reader) const
         readPart(part, reader);
 }
 
-void JournalStore::readLast(const Reader &reader) const
+void JournalStore::openLast(const Reader &reader)
 {
-    if (const auto all = parts(); !all.empty())
-        readPart(all.rbegin()->first, reader);
+    const auto all = parts();
+    if (all.empty())
+        return;
+    mPart = all.rbegin()->first;
+    mEnd = readPart(mPart, reader);
 }
 
 // What was cut off at the end is written over.
-void JournalStore::openLast()
+void JournalStore::openForWriting()
 {
-    const auto all = parts();
-    if (all.empty() || mIsDoubtful) {
+    if (mPart == 0 || mIsDoubtful) {
         beginPart();
         return;
     }
-    mPart = all.rbegin()->first;
-    mEnd = readPart(mPart, [](const QByteArray &, const Place &) {});
     mFile.emplace(nameOf(mPart), SystemFile::Mode::Write);
     mFile->resize(mEnd);
 }
@@ -152,7 +175,7 @@ void JournalStore::beginPart()
 JournalStore::Place JournalStore::append(const QByteArray &words, const QByteArray &bytes)
 {
     if (!mFile)
-        openLast();
+        openForWriting();
     const QByteArray entry = written(words, bytes);
     const Place place{mPart, mEnd, bytes.size()};
     mFile->write(mEnd, entry);

@@ -27,10 +27,12 @@ public:
 
     QString folder() const { return mFolder; }
 
-    /// Reads what all entries say, or those of the last file alone, oldest first.
+    /// Tells what the entries of the last file say, oldest first. To be called before an append.
     using Reader = std::function<void(const QByteArray &words, const Place &place)>;
+    void openLast(const Reader &reader);
+
+    /// The same of all files.
     void readAll(const Reader &reader) const;
-    void readLast(const Reader &reader) const;
 
     Place append(const QByteArray &words, const QByteArray &bytes = {});
     void sync();
@@ -46,7 +48,7 @@ private:
     QString nameOf(int part) const;
     std::map<int, qint64> parts() const; // sizes by number
     qint64 readPart(int part, const Reader &reader) const;
-    void openLast();
+    void openForWriting();
 
     const QString mFolder;
     const JournalSizes mSizes;
