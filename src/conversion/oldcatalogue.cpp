@@ -55,8 +55,10 @@ bool read(ADODB::Connection &connection, const QString &file, bool withMP3, Long
 {
     const QString program = HelperProgram::placeOf(u"songcase-jet"_s);
     QStringList arguments = {QString::fromLatin1(nativeName(file).toPercentEncoding("/"))};
-    for (const OldTable &table : oldTables())
-        arguments.append(QLatin1String(table.name));
+    for (const OldTable &table : oldTables()) {
+        if (withMP3 || !table.ofMP3) // what is not taken over may be damaged
+            arguments.append(QLatin1String(table.name));
+    }
     HelperProgram helper(work, program, arguments, limits);
     StreamedTables tables(connection);
     while (const auto line = helper.line()) {

@@ -74,6 +74,7 @@ private slots:
         row("Jet 4, of the newest program", 4, "Compact4 100%41.orv");
         row("Jet 3", 3, "Compact3.orv");
         row("Jet 3, without MP3", 3, "Compact.orv");
+        row("Jet 4, with MP3 tables that are damaged", 4, "Compact.orv");
     }
     void wholeCatalogue()
     {
@@ -81,7 +82,10 @@ private slots:
         QFETCH(QString, name);
         const bool withMP3 = name != "Compact.orv"_L1;
         auto tables = oldCatalogue();
-        tables.resize(withMP3 ? 6 : 4);
+        if (generation == 3 && !withMP3)
+            tables.resize(4);
+        else if (!withMP3)
+            tables[4].statedRows = 9;
         const QStringList lines = convert(name, jetFile(tables, {generation, 0, {}}));
         QStringList wanted = texts("3|Guns N' Roses", "7|Édith Piaf", "5|3|November Rain|Rock|1992",
                                    "6|7|Milord|NULL|NULL", "9|7|No \"1\"\\\t%_||0",
