@@ -120,6 +120,16 @@ void EditMP3Tags::offerGenres()
     mUi->txtGenre->setCompleter(exact);
     mUi->txtGenre->addItems(genres(gLanguage));
     mUi->txtGenre->setCurrentIndex(-1);
+    mUi->txtGenre->installEventFilter(this);
+}
+
+// A wheel that passes over the list must not change the tag.
+bool EditMP3Tags::eventFilter(QObject *watched, QEvent *event)
+{
+    if (event->type() != QEvent::Wheel || watched != mUi->txtGenre || mUi->txtGenre->hasFocus())
+        return Form::eventFilter(watched, event);
+    event->ignore();
+    return true;
 }
 
 // The last one is always disabled.

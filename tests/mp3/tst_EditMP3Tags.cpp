@@ -13,6 +13,7 @@
 #include <QPlainTextEdit>
 #include <QPushButton>
 #include <QTreeView>
+#include <QWheelEvent>
 
 /// The tag of one file: typed, matched, saved, and what stands in the way.
 class tst_EditMP3Tags : public TagScreenTest
@@ -107,6 +108,16 @@ private slots:
         field("txtTitle")->setText(u"x"_s);
         field("txtTitle")->clear();
         QCOMPARE(text("txtTitle"), QString());
+    }
+
+    void aWheelThatPasses()
+    {
+        open(path(1));
+        auto *genre = mEditor->findChild<QComboBox *>(u"txtGenre"_s);
+        QWheelEvent wheel({5, 5}, genre->mapToGlobal(QPointF(5, 5)), {}, {0, -120}, Qt::NoButton,
+                          Qt::NoModifier, Qt::NoScrollPhase, false);
+        QCoreApplication::sendEvent(genre, &wheel);
+        QCOMPARE(genre->currentText(), QString());
     }
 
     void endings_data()
