@@ -188,6 +188,8 @@ CddbID3Tag asRead(const CddbID3Tag &wanted, const CddbID3Tag &current)
         if (wanted.field(field) != current.field(field))
             fields.setField(field, asRead(field, wanted.field(field)));
     }
+    // By design: what is no identifier of ours is not written, the "y" of the Tags Processor
+    // neither.
     if (!isOwn(fields.FileId()) && !(fields.FileId().isEmpty() && isOwn(current.FileId())))
         fields.setFileId(current.FileId());
     return fields;
