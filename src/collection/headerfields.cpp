@@ -5,6 +5,7 @@
 #include "catalogue/typedtext.h"
 #include "controls/list/keycodes.h"
 #include "platform/desktop/desktop.h"
+#include "platform/desktop/passingwheel.h"
 #include "services/globals.h"
 #include "services/messages.h"
 
@@ -62,6 +63,7 @@ HeaderFields::HeaderFields(const Fields &fields, QWidget *screen)
     watch(mFields.genre, mFields.genre->lineEdit());
     watch(mFields.year, mFields.year);
     setUpGenre();
+    ignorePassingWheel(mFields.genre);
     connect(qApp, &QApplication::focusChanged, this, &HeaderFields::focusMoved);
 }
 
@@ -132,9 +134,6 @@ bool HeaderFields::eventFilter(QObject *field, QEvent *event)
     case QEvent::ShortcutOverride: // the menu has Shift+Insert too
     case QEvent::KeyPress:
         return HandleFieldKey(static_cast<QKeyEvent *>(event));
-    case QEvent::Wheel: // a wheel that passes over the list must not change the record
-        event->ignore();
-        return field == mFields.genre && !mFields.genre->hasFocus();
     default:
         break;
     }

@@ -9,6 +9,7 @@
 #include "platform/desktop/desktop.h"
 #include "platform/desktop/modalloop.h"
 #include "platform/desktop/options.h"
+#include "platform/desktop/passingwheel.h"
 #include "services/captions.h"
 #include "services/frame.h"
 #include "services/globals.h"
@@ -58,6 +59,8 @@ DiscEditor::DiscEditor(const DiscRecord &disc, const std::optional<TableOfConten
     setCancelButton(mUi->CancelButton);
     setCaptions();
     mUi->cboGenre->addItems(genres);
+    ignorePassingWheel(mUi->cboGenre);
+    ignorePassingWheel(mUi->cboCategory);
     show();
     connectControls();
     OptCmp_Change();

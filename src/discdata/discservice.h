@@ -17,8 +17,8 @@ enum DiscDataError : int {
         int(0x82FA1003), // in the server's own words: no use to ask again in this run
     errServiceFailed = int(0x82FA1004), // an answer that is none, an error of the server, too busy
     errNotAccepted = int(0x82FA1005),   // a record that was to be sent
-    errNothingFound = int(0x82FA1006), // by words: no disc that could be entered as a new one; by
-                                       // its keys: the record is not there any more
+    errNothingFound = int(0x82FA1006),  // by words: no disc that could be entered as a new one; by
+                                        // its keys: the record is not there any more
 };
 
 /// A service that knows discs. To the caller each call is synchronous; the work shows itself, lets

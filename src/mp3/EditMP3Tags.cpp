@@ -5,6 +5,7 @@
 #include "discdata/cddbtagmanager.h"
 #include "mp3/ui_EditMP3Tags.h"
 #include "platform/desktop/desktop.h"
+#include "platform/desktop/passingwheel.h"
 #include "services/captions.h"
 #include "services/fileutilities.h"
 #include "services/frame.h"
@@ -120,16 +121,7 @@ void EditMP3Tags::offerGenres()
     mUi->txtGenre->setCompleter(exact);
     mUi->txtGenre->addItems(genres(gLanguage));
     mUi->txtGenre->setCurrentIndex(-1);
-    mUi->txtGenre->installEventFilter(this);
-}
-
-// A wheel that passes over the list must not change the tag.
-bool EditMP3Tags::eventFilter(QObject *watched, QEvent *event)
-{
-    if (event->type() != QEvent::Wheel || watched != mUi->txtGenre || mUi->txtGenre->hasFocus())
-        return Form::eventFilter(watched, event);
-    event->ignore();
-    return true;
+    ignorePassingWheel(mUi->txtGenre);
 }
 
 // The last one is always disabled.

@@ -40,7 +40,6 @@ protected:
     bool QueryUnload() override;
     void Form_Unload() override;
     void keyPressEvent(QKeyEvent *event) override;
-    bool eventFilter(QObject *watched, QEvent *event) override;
 
 private:
     // A field is a line, or the larger box of the comments.

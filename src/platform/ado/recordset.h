@@ -54,8 +54,8 @@ public:
 
     // Changes of the table in memory; nothing reaches a catalogue.
     void AddNew();
-    void Update() {} // every value counts at once
-    void Delete();   // the position stays until the next move
+    void Update() {}                                       // every value counts at once
+    void Delete();                                         // the position stays until the next move
     void arrange(const std::vector<std::uint32_t> &order); // keeps these rows, in this order
 
     /// The rows as they are now; they never change, whatever happens to the recordset.

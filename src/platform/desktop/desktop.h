@@ -40,9 +40,9 @@ public:
     virtual BoxAnswer messageBox(BoxKind kind, BoxButtons buttons, const QString &text,
                                  const QString &title) = 0;
     virtual void showModal(Form &form) = 0; // returns when the form is unloaded or hidden
-    virtual QString openFileName(const FileQuestion &question) = 0; // empty: cancelled
+    virtual QString openFileName(const FileQuestion &question) = 0;      // empty: cancelled
     virtual QStringList openFileNames(const FileQuestion &question) = 0; // of one folder
-    virtual QString saveFileName(const FileQuestion &question) = 0; // one that exists, too
+    virtual QString saveFileName(const FileQuestion &question) = 0;      // one that exists, too
     virtual QString folderName(const FileQuestion &question) = 0;
 
     /// Lets the user choose printer, pages and copies for a document of this many pages. The

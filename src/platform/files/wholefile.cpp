@@ -52,8 +52,7 @@ bool WholeFile::commit()
 
 bool syncFolder(const QString &folder)
 {
-    const int handle =
-        ::open(nativeName(folder).constData(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+    const int handle = ::open(nativeName(folder).constData(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
     if (handle < 0)
         return errno == EACCES; // a folder may be written and not read
     const bool synced = ::fsync(handle) == 0 || errno == EINVAL || errno == EROFS;
