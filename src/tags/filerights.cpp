@@ -1,6 +1,6 @@
 #include "tags/filerights.h"
 
-#include <QByteArray>
+#include <QByteArrayList>
 #include <sys/stat.h>
 #include <sys/xattr.h>
 #include <unistd.h>

@@ -19,8 +19,8 @@ using namespace Qt::StringLiterals;
 namespace
 {
 
-constexpr qint64 piece = 64 * 1024; // bytes that are compared or copied at once
-constexpr qint64 sector = 512;      // bytes that a disk writes whole
+constexpr qint64 piece = qint64(64) << 10; // bytes that are compared or copied at once
+constexpr qint64 sector = 512;             // bytes that a disk writes whole
 
 // The bytes between the first and the last that differ.
 HeadChange inPlace(FileChange change, const QByteArray &oldHead, const QByteArray &newHead)

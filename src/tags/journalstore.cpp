@@ -66,7 +66,7 @@ public:
 
     QByteArray read(qint64 from, qint64 count)
     {
-        constexpr qint64 atOnce = 256 * 1024;
+        constexpr qint64 atOnce = qint64(256) << 10;
         if (from < mFrom || from + count > mFrom + mBytes.size()) {
             mBytes = mFile.read(from, std::max(atOnce, count));
             mFrom = from;

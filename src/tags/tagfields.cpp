@@ -190,7 +190,7 @@ QString asRead(TagField field, const QString &text)
 {
     constexpr qsizetype digits = 4;
     // A zero would end the text, a byte order mark would be taken for one.
-    const QString plain =
+    QString plain =
         withoutFilling(QString(text).remove(QChar(0)).remove(QChar(QChar::ByteOrderMark)));
     switch (field) {
     case TagField::Year:

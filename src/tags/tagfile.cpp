@@ -8,7 +8,7 @@
 namespace
 {
 
-constexpr qsizetype firstRead = 16 * 1024; // bytes; most tags without a picture fit
+constexpr qsizetype firstRead = qsizetype(16) << 10; // bytes; most tags without a picture fit
 
 // The frames of sound begin with eleven bits that are set.
 bool isSound(const QByteArray &start)

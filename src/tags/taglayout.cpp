@@ -186,7 +186,7 @@ TagLayout layoutOf(const QByteArray &tag)
     TagLayout layout;
     if (tagSize(tag) != tag.size())
         damaged();
-    layout.version = tag[3];
+    layout.version = uchar(tag[3]);
     const char flags = tag[5];
     layout.isUnsynchronised = layout.version < 4 && (flags & flagUnsynchronised);
     layout.hasFooter = layout.version == 4 && (flags & flagFooter);

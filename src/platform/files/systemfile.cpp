@@ -79,7 +79,7 @@ SystemFile::SystemFile(const QString &path, Mode mode)
 }
 
 SystemFile::SystemFile(SystemFile &&other) noexcept
-    : mPath(other.mPath), mHandle(std::exchange(other.mHandle, -1))
+    : mPath(std::move(other.mPath)), mHandle(std::exchange(other.mHandle, -1))
 {
 }
 
@@ -157,7 +157,7 @@ void SystemFile::sync()
 
 void SystemFile::append(const SystemFile &other, qint64 from, qint64 count)
 {
-    constexpr qint64 piece = 256 * 1024; // bytes
+    constexpr qint64 piece = qint64(256) << 10; // bytes
     off64_t source = from, target = size();
     bool byKernel = true;
     while (count > 0) {
