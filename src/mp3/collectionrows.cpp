@@ -152,6 +152,7 @@ void CollectionRows::move(qsizetype from, qsizetype to)
 void CollectionRows::arrange(const std::vector<std::uint32_t> &order)
 {
     std::vector<FileMemory> files;
+    files.reserve(order.size());
     for (const auto row : order)
         files.push_back(mFiles[row]);
     mFiles = std::move(files);

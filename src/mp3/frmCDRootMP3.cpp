@@ -22,7 +22,7 @@ using namespace Qt::StringLiterals;
 namespace
 {
 
-constexpr QLatin1String modeNew("I"), modeExisting("U");
+constexpr QLatin1String modeNew("I");
 constexpr qint64 noCollection = -999;
 constexpr qsizetype longestFolder = 255;
 

@@ -245,7 +245,7 @@ QStringList FindFilesInTree(const QString &path, const QString &pattern, int)
     return gFoundFiles;
 }
 
-double ScanFolderTree(QString path, const QString &pattern, int, int)
+double ScanFolderTree(const QString &path, const QString &pattern, int, int)
 {
     TreeWalk walk{wildcards(pattern), {}, {}};
     walk.enter(withSeparator(path));

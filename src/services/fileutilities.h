@@ -37,7 +37,7 @@ QStringList FindFilesInTree(const QString &path, const QString &pattern, int mod
 QStringList filesInTree(const QString &path, const QString &pattern, const std::stop_token &stop);
 
 /// The same into gFoundFiles; gives the sum of the sizes of the files in bytes.
-double ScanFolderTree(QString path, const QString &pattern, int fileCount, int folderCount);
+double ScanFolderTree(const QString &path, const QString &pattern, int fileCount, int folderCount);
 
 /// True when the move failed, as between two disks. An existing file of the new name is replaced.
 /// After false the new name is on the disk and outlives a power cut.

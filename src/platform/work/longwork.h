@@ -67,7 +67,7 @@ public:
     {
         using Batch = std::vector<Value>;
         const auto made = std::make_shared<std::vector<Batch>>((count + batch - 1) / batch);
-        const auto makeBatch = [made, make, count](qsizetype number, std::stop_token stop) {
+        const auto makeBatch = [made, make, count](qsizetype number, const std::stop_token &stop) {
             Batch values;
             const qsizetype end = std::min(count, (number + 1) * batch);
             for (qsizetype i = number * batch; i < end && !stop.stop_requested(); ++i)
