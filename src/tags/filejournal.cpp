@@ -17,7 +17,7 @@ namespace
 {
 
 enum class Word : quint8 {
-    Numbers = 1, // at the beginning of a part: the last id and batch that were given
+    Numbers = 1, // behind what a part begins with: the last id and batch that were given
     Batch,
     Change, // before it happens
     Done,
@@ -78,23 +78,30 @@ void FileJournal::take(Read &into, const QByteArray &entry, const JournalStore::
     }
 }
 
-// The last part alone is read: what is not done is told again where a part begins.
+// The last part alone is read: what is not done is told again where a part begins. Unless that was
+// cut off.
 void FileJournal::open()
 {
     if (mIsOpen)
         return;
     Read read;
-    mStore.openLast([&](const QByteArray &entry, const JournalStore::Place &place) {
+    bool isWhole = false;
+    const auto take = [&](const QByteArray &entry, const JournalStore::Place &place) {
         QDataStream in(entry);
         in.setVersion(QDataStream::Qt_6_0);
         quint8 word = 0;
         in >> word;
-        if (Word(word) == Word::Numbers)
+        if (Word(word) == Word::Numbers) {
             in >> mLastId >> mLastBatch;
-        take(read, entry, place);
+            isWhole = true;
+        }
+        FileJournal::take(read, entry, place);
         if (!read.entries.empty())
             mLastId = std::max(mLastId, read.entries.rbegin()->first);
-    });
+    };
+    mStore.openLast(take);
+    if (!isWhole)
+        mStore.readAll(take);
     for (const ChangeBatch &batch : read.batches)
         mLastBatch = std::max(mLastBatch, batch.number);
     std::erase_if(read.entries, [](const auto &entry) { return entry.second.isDone; });
@@ -130,21 +137,21 @@ std::vector<FileJournal::Batch> FileJournal::batches() const
     return all;
 }
 
-// Where a part is full: the next one begins with what is not done, so that it is found there.
+// Where a part is full: the next one begins with what is not done, so that it is found there. The
+// numbers come last: a part that has them is whole in that.
 void FileJournal::makeRoom()
 {
     if (!mStore.isPartFull())
         return;
-    Entries carried;
     std::vector<std::pair<qint64, QByteArray>> kept;
     for (const auto &[id, entry] : mPending)
         kept.emplace_back(id, mStore.bytes(entry.place).value_or(QByteArray()));
     mStore.beginPart();
-    mStore.append(words(Word::Numbers, mLastId, mLastBatch));
     if (mBatch.number > 0)
         mStore.append(words(Word::Batch, mBatch));
     for (const auto &[id, bytes] : kept)
         mPending[id].place = mStore.append(words(Word::Change, mPending[id].change), bytes);
+    mStore.append(words(Word::Numbers, mLastId, mLastBatch));
     mStore.sync();
 }
 
@@ -171,6 +178,7 @@ void FileJournal::announce(FileChange &change, const QByteArray &kept)
 void FileJournal::done(qint64 id, const FileStamp &after)
 {
     try {
+        makeRoom();
         mStore.append(words(Word::Done, id, after));
         mPending.erase(id);
     } catch (const Error &) {
@@ -180,6 +188,7 @@ void FileJournal::done(qint64 id, const FileStamp &after)
 void FileJournal::drop(qint64 id)
 {
     try {
+        makeRoom();
         mStore.append(words(Word::Dropped, id));
         mPending.erase(id);
     } catch (const Error &) {

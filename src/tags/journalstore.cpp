@@ -140,10 +140,6 @@ void JournalStore::openLast(const Reader &reader)
 // What was cut off at the end is written over.
 void JournalStore::openForWriting()
 {
-    if (mPart == 0 || mIsDoubtful) {
-        beginPart();
-        return;
-    }
     mFile.emplace(nameOf(mPart), SystemFile::Mode::Write);
     mFile->resize(mEnd);
 }
@@ -213,5 +209,5 @@ std::optional<QByteArray> JournalStore::bytes(const Place &place) const
 
 bool JournalStore::isPartFull() const
 {
-    return mEnd >= mSizes.part;
+    return mEnd == 0 || mIsDoubtful || mEnd >= mSizes.part;
 }

@@ -40,7 +40,8 @@ public:
     /// Nothing where they are gone, or are not those that were written.
     std::optional<QByteArray> bytes(const Place &place) const;
 
-    /// Whether so much was written that the next entry had better begin a file, and that.
+    /// Whether the next entry has to begin a file: there is none, or so much is in it, or it is not
+    /// to be trusted any more. And that.
     bool isPartFull() const;
     void beginPart();
 

@@ -174,6 +174,21 @@ private slots:
         QVERIFY(mJournal->batches().front().number > all.front().number);
     }
 
+    // As a process leaves it that ends between making a file of the journal and writing to it.
+    void aPartThatWasJustBegun()
+    {
+        make(u"a"_s);
+        save(u"a"_s, u"One"_s);
+        writeFile(path(u"Changes/changes-2"_s), "");
+        reopen();
+        save(u"a"_s, u"Two"_s);
+        QCOMPARE(mJournal->batches().size(), 2U);
+        QCOMPARE(undoLast().files, 1);
+        QCOMPARE(title(u"a"_s), u"One"_s);
+        QCOMPARE(mJournal->undo(1, {}, {}, always).files, 1);
+        QCOMPARE(readFile(path(u"a"_s)), before);
+    }
+
     void aMoveReplacesThroughTheWastebasket()
     {
         make(u"a"_s);
