@@ -27,12 +27,26 @@ constexpr qint64 bytesAtOnce = 32 << 20;
     throw tagError(errTagNotWritten, "xTagNotWritten", error.Description);
 }
 
-FileLock lockOf(const QString &path)
+// The file, without links in its name. To root too one is read-only that nobody may write.
+SystemFile openedToChange(const QString &path)
 {
-    FileLock lock;
-    if (lock.take(path) != FileLock::Outcome::Taken)
+    try {
+        SystemFile file(path, SystemFile::Mode::Write);
+        if (isForWriting(file))
+            return file;
+    } catch (const Error &) { // told with the one number below
+    }
+    notAccessible(path);
+}
+
+// Nobody else of this program changes it until it is closed; where the file system knows no locks
+// there is none.
+SystemFile lockedToChange(const QString &path)
+{
+    SystemFile file = openedToChange(path);
+    if (FileLock::takeFor(file.handle()) == FileLock::Outcome::Held)
         notAccessible(path);
-    return lock;
+    return file;
 }
 
 } // namespace
@@ -45,6 +59,7 @@ FileChanges::FileChanges(FileJournal &journal, About about)
 FileChanges::~FileChanges()
 {
     forgetAnnounced();
+    mJournal.tellDone();
 }
 
 // A command that changes nothing leaves no batch.
@@ -55,23 +70,19 @@ void FileChanges::begin()
     mBegun = true;
 }
 
-std::optional<HeadChange> FileChanges::planned(const CddbID3Tag &tag, const QString &path) const
+std::optional<HeadChange> FileChanges::planned(const CddbID3Tag &tag, const SystemFile &file)
 {
-    if (!isWritable(path))
-        notAccessible(path);
-    const SystemFile file(path, SystemFile::Mode::Read);
     const FileTag there = readTag(file);
     if (asRead(tag, there.fields) == there.fields)
         return {};
     if (!there.isWhole)
-        throw tagError(errTagDamaged, "xTagDamaged", path);
+        throw tagError(errTagDamaged, "xTagDamaged", file.path());
     const SplicedTag spliced = splicedTag(there.bytes, there.fields, tag);
-    HeadChange head = plannedHead(file, there.bytes, spliced.bytes);
-    return head;
+    return plannedHead(file, there.bytes, spliced.bytes);
 }
 
 // The names of the files beside and of the copies are told before they are made.
-void FileChanges::tell(HeadChange &head)
+void FileChanges::tell(HeadChange &head, const SystemFile &file)
 {
     FileChange &change = head.change;
     if (change.way == FileChange::Way::Beside)
@@ -79,7 +90,7 @@ void FileChanges::tell(HeadChange &head)
                        mJournal.copyName().section(u'-', -2) + ".tmp"_L1;
     if (change.way == FileChange::Way::Through) {
         change.other = mJournal.copyName();
-        prepareHead(head, SystemFile(change.path, SystemFile::Mode::Read));
+        prepareHead(head, file);
     }
     mJournal.announce(change, head.kept());
 }
@@ -88,19 +99,25 @@ void FileChanges::announce(const Tags &tags)
 {
     mToCome = tags;
     mNext = 0;
-    announceSome();
+    if (mToCome.size() > 1)
+        announceSome();
 }
 
-void FileChanges::announceOne(const CddbID3Tag &tag, const QString &path)
+// Gives the bytes that the journal keeps for it.
+qint64 FileChanges::announceOne(const CddbID3Tag &tag, const QString &path)
 {
     const QString real = realPath(path);
-    auto head = planned(tag, real);
+    if (mAnnounced.contains(real))
+        return 0;
+    const SystemFile file = openedToChange(real);
+    auto head = planned(tag, file);
     // A copy of a whole file is not made before its turn.
-    if (!head || head->change.way == FileChange::Way::Through || mAnnounced.contains(real))
-        return;
+    if (!head || head->change.way == FileChange::Way::Through)
+        return 0;
     begin();
-    tell(*head);
+    tell(*head, file);
     mAnnounced.insert_or_assign(real, Prepared{*head, tag});
+    return head->kept().size();
 }
 
 void FileChanges::announceSome()
@@ -110,11 +127,9 @@ void FileChanges::announceSome()
     for (; mNext < end && bytes < bytesAtOnce; ++mNext) {
         const auto &[path, tag] = mToCome[mNext];
         try {
-            announceOne(tag, path);
+            bytes += announceOne(tag, path);
         } catch (const Error &) { // told at its turn
         }
-        if (const auto found = mAnnounced.find(realPath(path)); found != mAnnounced.end())
-            bytes += found->second.head.kept().size();
     }
     try {
         mJournal.sync();
@@ -130,32 +145,32 @@ void FileChanges::forgetAnnounced()
     mAnnounced.clear();
 }
 
-std::optional<HeadChange> FileChanges::takeAnnounced(const CddbID3Tag &tag, const QString &path)
+std::optional<HeadChange> FileChanges::takeAnnounced(const CddbID3Tag &tag, const SystemFile &file)
 {
-    const auto found = mAnnounced.find(path);
+    const auto found = mAnnounced.find(file.path());
     if (found == mAnnounced.end())
         return {};
     const Prepared prepared = std::move(found->second);
     mAnnounced.erase(found);
-    if (prepared.tag == tag && isWritable(path) && stampOf(path) == prepared.head.change.before)
+    if (prepared.tag == tag && file.stamp() == prepared.head.change.before)
         return prepared.head;
     mJournal.drop(prepared.head.change.id);
     return {};
 }
 
-std::optional<HeadChange> FileChanges::findAnnounced(const CddbID3Tag &tag, const QString &path)
+// One for itself has nobody to share its sync with.
+std::optional<HeadChange> FileChanges::findAnnounced(const CddbID3Tag &tag, const SystemFile &file)
 {
-    if (!mAnnounced.contains(path) && mNext < mToCome.size())
+    if (mToCome.size() > 1 && !mAnnounced.contains(file.path()) && mNext < mToCome.size())
         announceSome();
-    return takeAnnounced(tag, path);
+    return takeAnnounced(tag, file);
 }
 
-void FileChanges::performOrMend(const HeadChange &head)
+void FileChanges::performOrMend(const HeadChange &head, SystemFile &file)
 {
     const FileChange &change = head.change;
     try {
-        SystemFile file(change.path, SystemFile::Mode::Write);
-        if (file.stamp() != change.before)
+        if (stampOf(change.path) != change.before)
             notAccessible(change.path);
         performHead(head, file);
     } catch (...) {
@@ -169,34 +184,33 @@ void FileChanges::performOrMend(const HeadChange &head)
         QFile::remove(change.other);
 }
 
-void FileChanges::perform(const HeadChange &head)
+void FileChanges::perform(const HeadChange &head, SystemFile &file)
 {
     try {
-        performOrMend(head);
+        performOrMend(head, file);
     } catch (const NoWayBeside &) {
         HeadChange other = head;
         other.change.way = FileChange::Way::Through;
-        tell(other);
+        tell(other, file);
         mJournal.sync();
-        performOrMend(other);
+        performOrMend(other, file);
     }
 }
 
 void FileChanges::saveTag(const CddbID3Tag &tag, const QString &path)
 {
-    const QString real = realPath(path);
     try {
-        const FileLock lock = lockOf(real);
-        auto head = findAnnounced(tag, real);
+        SystemFile file = lockedToChange(realPath(path));
+        auto head = findAnnounced(tag, file);
         if (!head) {
-            head = planned(tag, real);
+            head = planned(tag, file);
             if (!head)
                 return;
             begin();
-            tell(*head);
+            tell(*head, file);
             mJournal.sync();
         }
-        perform(*head);
+        perform(*head, file);
     } catch (const Error &error) {
         if (error.Number == errFileFailed)
             notWritten(error);
@@ -206,14 +220,12 @@ void FileChanges::saveTag(const CddbID3Tag &tag, const QString &path)
 
 void FileChanges::replaceHead(const QString &path, const QByteArray &before, const QByteArray &head)
 {
-    if (!isWritable(path))
-        notAccessible(path);
-    const FileLock lock = lockOf(path);
-    HeadChange change = plannedHead(SystemFile(path, SystemFile::Mode::Read), before, head);
+    SystemFile file = lockedToChange(path);
+    HeadChange change = plannedHead(file, before, head);
     begin();
-    tell(change);
+    tell(change, file);
     mJournal.sync();
-    perform(change);
+    perform(change, file);
 }
 
 void FileChanges::move(const QString &from, const QString &to)

@@ -44,15 +44,15 @@ private:
     };
 
     void begin();
-    std::optional<HeadChange> planned(const CddbID3Tag &tag, const QString &path) const;
-    void tell(HeadChange &head);
-    void perform(const HeadChange &head);
-    void performOrMend(const HeadChange &head);
+    static std::optional<HeadChange> planned(const CddbID3Tag &tag, const SystemFile &file);
+    void tell(HeadChange &head, const SystemFile &file);
+    void perform(const HeadChange &head, SystemFile &file);
+    void performOrMend(const HeadChange &head, SystemFile &file);
     void announceSome();
     void forgetAnnounced();
-    void announceOne(const CddbID3Tag &tag, const QString &path);
-    std::optional<HeadChange> takeAnnounced(const CddbID3Tag &tag, const QString &path);
-    std::optional<HeadChange> findAnnounced(const CddbID3Tag &tag, const QString &path);
+    qint64 announceOne(const CddbID3Tag &tag, const QString &path);
+    std::optional<HeadChange> takeAnnounced(const CddbID3Tag &tag, const SystemFile &file);
+    std::optional<HeadChange> findAnnounced(const CddbID3Tag &tag, const SystemFile &file);
 
     FileJournal &mJournal;
     const About mAbout;

@@ -24,6 +24,8 @@ enum class Word : quint8 {
     Dropped // it did not happen, or is nothing of ours any more
 };
 
+constexpr int toldAtOnce = 100;
+
 template <typename... Values> QByteArray words(Word word, const Values &...values)
 {
     QByteArray bytes;
@@ -107,6 +109,7 @@ void FileJournal::open()
     std::erase_if(read.entries, [](const auto &entry) { return entry.second.isDone; });
     mPending = std::move(read.entries);
     mIsOpen = true;
+    removeForgottenCopies();
 }
 
 FileJournal::Read FileJournal::readAll() const
@@ -143,6 +146,7 @@ void FileJournal::makeRoom()
 {
     if (!mStore.isPartFull())
         return;
+    tellDone();
     std::vector<std::pair<qint64, QByteArray>> kept;
     for (const auto &[id, entry] : mPending)
         kept.emplace_back(id, mStore.bytes(entry.place).value_or(QByteArray()));
@@ -174,13 +178,29 @@ void FileJournal::announce(FileChange &change, const QByteArray &kept)
     mPending[change.id] = {change, mStore.append(words(Word::Change, change), kept), false, {}};
 }
 
-// Nothing is lost where the journal cannot be told: the file itself tells at the next look.
 void FileJournal::done(qint64 id, const FileStamp &after)
 {
+    Entry &entry = mPending[id];
+    entry.isDone = true;
+    entry.after = after;
+    if (++mUntold >= toldAtOnce)
+        tellDone();
+}
+
+// Nothing is lost where the journal cannot be told: the files themselves tell at the next look.
+void FileJournal::tellDone()
+{
+    std::vector<QByteArray> told;
+    for (const auto &[id, entry] : mPending) {
+        if (entry.isDone)
+            told.push_back(words(Word::Done, id, entry.after));
+    }
+    mUntold = 0;
+    if (told.empty())
+        return;
     try {
-        makeRoom();
-        mStore.append(words(Word::Done, id, after));
-        mPending.erase(id);
+        mStore.append(told);
+        std::erase_if(mPending, [](const auto &entry) { return entry.second.isDone; });
     } catch (const Error &) {
     }
 }
@@ -226,7 +246,7 @@ Mended FileJournal::mendOne(qint64 id, bool back)
     return end;
 }
 
-// Made before the journal was told of them.
+// A program that ended had made them, and not told the journal yet.
 void FileJournal::removeForgottenCopies() const
 {
     QDir folder(mStore.folder());
@@ -242,8 +262,10 @@ void FileJournal::mend()
 {
     open();
     std::vector<qint64> ids;
-    for (const auto &[id, entry] : mPending)
-        ids.push_back(id);
+    for (const auto &[id, entry] : mPending) {
+        if (!entry.isDone)
+            ids.push_back(id);
+    }
     std::reverse(ids.begin(), ids.end());
     for (const qint64 id : ids) {
         try {
@@ -251,7 +273,7 @@ void FileJournal::mend()
         } catch (const Error &) { // at the next look
         }
     }
-    removeForgottenCopies();
+    tellDone();
 }
 
 FileJournal::Undone FileJournal::undo(qint64 batch, const QDateTime &when, const QString &what,

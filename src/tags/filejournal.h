@@ -60,6 +60,7 @@ private:
     void announce(FileChange &change, const QByteArray &kept); // gives it its id
     void sync() { mStore.sync(); }
     void done(qint64 id, const FileStamp &after);
+    void tellDone(); // the journal; after a crash before that mend() finds it out
     void drop(qint64 id);
     Mended mendOne(qint64 id, bool back);
     void removeForgottenCopies() const;
@@ -67,7 +68,8 @@ private:
     void makeRoom();
 
     JournalStore mStore;
-    Entries mPending; // announced, neither done nor dropped
+    Entries mPending; // announced, neither dropped nor told to be done
+    int mUntold = 0;
     ChangeBatch mBatch;
     qint64 mLastId = 0, mLastBatch = 0;
     bool mIsOpen = false;

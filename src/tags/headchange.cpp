@@ -44,10 +44,12 @@ bool isThere(const QString &path)
     return ::access(nativeName(path).constData(), F_OK) == 0;
 }
 
-int namesOf(const SystemFile &file)
+struct stat aboutFile(const SystemFile &file)
 {
     struct stat about = {};
-    return ::fstat(file.handle(), &about) == 0 ? int(about.st_nlink) : 0;
+    if (::fstat(file.handle(), &about) != 0)
+        file.fail();
+    return about;
 }
 
 QString folderOf(const QString &path)
@@ -211,14 +213,10 @@ Mended mendThrough(const FileChange &change, bool back)
 
 } // namespace
 
-bool isWritable(const QString &path)
+bool isForWriting(const SystemFile &file)
 {
-    const QByteArray name = nativeName(path);
-    struct stat about = {};
     constexpr mode_t anybody = S_IWUSR | S_IWGRP | S_IWOTH;
-    return ::stat(name.constData(), &about) == 0 && S_ISREG(about.st_mode) &&
-           (about.st_mode & anybody) != 0 &&
-           ::faccessat(AT_FDCWD, name.constData(), R_OK | W_OK, AT_EACCESS) == 0;
+    return (aboutFile(file).st_mode & anybody) != 0;
 }
 
 QByteArray HeadChange::kept() const
@@ -236,7 +234,8 @@ HeadChange plannedHead(const SystemFile &file, const QByteArray &oldHead, const 
     change.newHeadIs = headChecksum(newHead);
     if (oldHead.size() == newHead.size())
         return inPlace(change, oldHead, newHead);
-    const bool hasRoomBeside = namesOf(file) == 1 && mayMakeFilesIn(folderOf(file.path()));
+    const bool hasRoomBeside =
+        aboutFile(file).st_nlink == 1 && mayMakeFilesIn(folderOf(file.path()));
     change.way = hasRoomBeside ? FileChange::Way::Beside : FileChange::Way::Through;
     return {change, oldHead, newHead};
 }

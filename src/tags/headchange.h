@@ -2,9 +2,8 @@
 
 #include "tags/filechange.h"
 
-/// Whether the program may write a file: it is there, ordinary, and somebody may write it. To root
-/// too a file is read-only that nobody may write.
-bool isWritable(const QString &path);
+/// Whether somebody may write a file: what root, who may write all, has to ask.
+bool isForWriting(const SystemFile &file);
 
 /// A change of the bytes at the beginning of a file for others, in four steps: it is planned, told
 /// to the journal, prepared and performed. At any moment the file is the old one or the new one, or

@@ -168,15 +168,27 @@ void JournalStore::beginPart()
     }
 }
 
-JournalStore::Place JournalStore::append(const QByteArray &words, const QByteArray &bytes)
+void JournalStore::write(const QByteArray &entries)
 {
     if (!mFile)
         openForWriting();
-    const QByteArray entry = written(words, bytes);
+    mFile->write(mEnd, entries);
+    mEnd += entries.size();
+}
+
+JournalStore::Place JournalStore::append(const QByteArray &words, const QByteArray &bytes)
+{
     const Place place{mPart, mEnd, bytes.size()};
-    mFile->write(mEnd, entry);
-    mEnd += entry.size();
+    write(written(words, bytes));
     return place;
+}
+
+void JournalStore::append(const std::vector<QByteArray> &words)
+{
+    QByteArray entries;
+    for (const QByteArray &each : words)
+        entries += written(each, {});
+    write(entries);
 }
 
 void JournalStore::sync()

@@ -5,6 +5,7 @@
 #include <functional>
 #include <map>
 #include <optional>
+#include <vector>
 
 struct JournalSizes {
     qint64 part = 4 << 20;  // bytes of a file before the next one begins
@@ -35,6 +36,7 @@ public:
     void readAll(const Reader &reader) const;
 
     Place append(const QByteArray &words, const QByteArray &bytes = {});
+    void append(const std::vector<QByteArray> &words); // with one write
     void sync();
 
     /// Nothing where they are gone, or are not those that were written.
@@ -50,6 +52,7 @@ private:
     std::map<int, qint64> parts() const; // sizes by number
     qint64 readPart(int part, const Reader &reader) const;
     void openForWriting();
+    void write(const QByteArray &entries);
 
     const QString mFolder;
     const JournalSizes mSizes;

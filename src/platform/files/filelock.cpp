@@ -1,6 +1,7 @@
 #include "platform/files/filelock.h"
 
-#include <QFile>
+#include "platform/files/nativename.h"
+
 #include <cerrno>
 #include <fcntl.h>
 #include <sys/stat.h>
@@ -19,17 +20,6 @@ bool isPlainFile(int handle)
     return ::fstat(handle, &about) == 0 && S_ISREG(about.st_mode);
 }
 
-// Of the open file, not of the process: two in one process exclude each other as well.
-bool lock(int handle)
-{
-    struct flock byte = {};
-    byte.l_type = F_WRLCK;
-    byte.l_whence = SEEK_SET;
-    byte.l_start = lockedByte;
-    byte.l_len = 1;
-    return ::fcntl(handle, F_OFD_SETLK, &byte) == 0;
-}
-
 } // namespace
 
 FileLock::~FileLock()
@@ -46,20 +36,31 @@ FileLock &FileLock::operator=(FileLock &&other) noexcept
     return *this;
 }
 
+// Of the open file, not of the process: two in one process exclude each other as well.
+FileLock::Outcome FileLock::takeFor(int handle)
+{
+    struct flock byte = {};
+    byte.l_type = F_WRLCK;
+    byte.l_whence = SEEK_SET;
+    byte.l_start = lockedByte;
+    byte.l_len = 1;
+    if (::fcntl(handle, F_OFD_SETLK, &byte) == 0)
+        return Outcome::Taken;
+    return errno == EAGAIN || errno == EACCES ? Outcome::Held : Outcome::Unusable;
+}
+
 FileLock::Outcome FileLock::take(const QString &file, int flags)
 {
     const int handle =
-        ::open(QFile::encodeName(file).constData(), O_RDWR | O_CLOEXEC | O_NONBLOCK | flags, 0600);
+        ::open(nativeName(file).constData(), O_RDWR | O_CLOEXEC | O_NONBLOCK | flags, 0600);
     if (handle < 0)
         return Outcome::Unusable;
-    const bool plain = isPlainFile(handle);
-    if (plain && lock(handle)) {
+    const Outcome outcome = isPlainFile(handle) ? takeFor(handle) : Outcome::Unusable;
+    if (outcome == Outcome::Taken)
         mHandle = handle;
-        return Outcome::Taken;
-    }
-    const bool held = plain && (errno == EAGAIN || errno == EACCES);
-    ::close(handle);
-    return held ? Outcome::Held : Outcome::Unusable;
+    else
+        ::close(handle);
+    return outcome;
 }
 
 FileLock::Outcome FileLock::take(const QString &file)
