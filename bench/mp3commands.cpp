@@ -12,6 +12,7 @@
 #include "services/globals.h"
 #include "workcommands.h"
 
+#include <QAbstractButton>
 #include <QApplication>
 #include <QScrollBar>
 #include <QTemporaryDir>
@@ -111,4 +112,20 @@ void addCollection(const QStringList &arguments)
         transaction.CommitTrans();
         return count("files", rows.count());
     });
+}
+
+void renameCollection(const QStringList &arguments)
+{
+    openForWork(arguments[0]);
+    auto *editor = new frmCDRootMP3;
+    editor->Mode = u"U"_s;
+    editor->CollectionId = arguments[1].toLongLong();
+    editor->Show();
+    QApplication::processEvents();
+    editor->findChild<DBListViewCTL *>()->selectAll();
+    measured("rename", [&] {
+        editor->findChild<QAbstractButton *>(u"cmdRename"_s)->click();
+        return std::string();
+    });
+    delete editor;
 }

@@ -31,6 +31,7 @@ constexpr Command commands[] = {
     {"importdisc", "CATALOGUE FILE", importDisc},
     {"tags", "FOLDER", readTags},
     {"collection", "CATALOGUE ID", openCollection},
+    {"renamefiles", "CATALOGUE ID", renameCollection},
     {"savetag", "FILE FIELD VALUE", saveTag},
     {"addcollection", "CATALOGUE FOLDER TITLE", addCollection},
     {"convert", "CATALOGUE OLDFILE", convertOld},
@@ -56,7 +57,7 @@ const Command *find(const QStringList &words)
 // A command that is the long work of a screen needs one to be there, if out of sight.
 std::unique_ptr<QCoreApplication> makeApplication(int &argc, char **argv)
 {
-    constexpr const char *ofScreens[] = {"lookup", "convert", "tags", "collection"};
+    constexpr const char *ofScreens[] = {"lookup", "convert", "tags", "collection", "renamefiles"};
     const bool needsScreen =
         argc > 1 && std::any_of(std::begin(ofScreens), std::end(ofScreens),
                                 [&](const char *name) { return qstrcmp(argv[1], name) == 0; });

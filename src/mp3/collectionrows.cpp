@@ -162,15 +162,15 @@ void CollectionRows::arrange(const std::vector<std::uint32_t> &order)
         WorkingRecords->Fields(volgnummerColumn).setValue(++number);
 }
 
-void CollectionRows::setFileName(const QString &volgnummer, const QString &fileName)
+void CollectionRows::setFileNames(const QHash<QString, QString> &names)
 {
-    const ADODB::Value wanted(volgnummer.toLongLong());
     if (count() > 0)
         WorkingRecords->MoveFirst();
     for (std::size_t row = 0; !WorkingRecords->isEOF(); WorkingRecords->MoveNext(), ++row) {
-        if (WorkingRecords->Fields(volgnummerColumn).Value() != wanted)
+        const auto name = names.find(WorkingRecords->Fields(volgnummerColumn).Value().toText());
+        if (name == names.end())
             continue;
-        WorkingRecords->Fields(nameColumn).setValue(fileName);
+        WorkingRecords->Fields(nameColumn).setValue(*name);
         mFiles[row] = {};
     }
 }

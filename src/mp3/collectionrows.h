@@ -37,8 +37,8 @@ public:
     /// The row ends at this place; all others keep their order.
     void move(qsizetype from, qsizetype to);
 
-    /// In all rows with this number.
-    void setFileName(const QString &volgnummer, const QString &fileName);
+    /// By Volgnummer, in all rows with it.
+    void setFileNames(const QHash<QString, QString> &names);
 
     /// Files were renamed from outside, in the catalogue too.
     void followNames(const RenamedFiles &renamed, const QString &folder);

@@ -89,12 +89,14 @@ std::vector<CollectionRow> frmCDRootMP3::allRows() const
 // The list is not read again: the new names show at once, and what has failed at the next refresh.
 void frmCDRootMP3::cmdRename_Click()
 {
-    const auto renamed = [this](const CollectionRow &row, const QString &newName) {
+    QHash<QString, QString> names;
+    const auto renamed = [&](const CollectionRow &row, const QString &newName) {
         const ListItem item = mUi->TheMP3Collection->ListItems().Item(row.index);
         item.setSubItems(int(CollectionField::FileName), newName);
-        mRows.setFileName(row[CollectionField::Volgnummer], newName);
+        names.insert(row[CollectionField::Volgnummer], newName);
     };
     renameFiles(*this, folder(), rowsAt(selectedRows()), renamed, allRows());
+    mRows.setFileNames(names);
 }
 
 void frmCDRootMP3::cmdPreview_Click()

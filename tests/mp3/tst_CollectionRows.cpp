@@ -84,7 +84,7 @@ private slots:
             else if (words[0] == u"move")
                 mRows->move(rest[0].toInt(), rest[1].toInt());
             else if (words[0] == u"name")
-                mRows->setFileName(rest[0], rest[1]);
+                mRows->setFileNames({{rest[0], rest[1]}});
             else
                 mRows->removeAll();
         }
@@ -135,7 +135,7 @@ private slots:
         put("a.mp3", "Three");
         QCOMPARE(titleAfterReading(), u"Three"_s);
         put("b.mp3", "Other");
-        mRows->setFileName(u"1"_s, u"b.mp3"_s);
+        mRows->setFileNames({{u"1"_s, u"b.mp3"_s}});
         QCOMPARE(titleAfterReading(), u"Other"_s);
     }
 
@@ -171,7 +171,7 @@ private slots:
                  0);
         const QString music = mCatalogue->path("music");
         mRows->append(rownames::ofFound(music, FindFilesInTree(music, u"*.mp3"_s, 1)));
-        mRows->setFileName(u"4"_s, u"x\\Café.mp3"_s);
+        mRows->setFileNames({{u"4"_s, u"x\\Café.mp3"_s}});
         QCOMPARE(mRows->count(), 4);
         const qint64 id = collectionstore::insertHeader({music, u"It's"_s});
         collectionstore::replaceFiles(id, *mRows->WorkingRecords->rows());
