@@ -1,6 +1,7 @@
 #include "tags/filechanges.h"
 
 #include "platform/files/filelock.h"
+#include "platform/files/ordinaryfile.h"
 #include "tags/movedfile.h"
 #include "tags/tagerrors.h"
 #include "tags/tagfile.h"
@@ -27,10 +28,12 @@ constexpr qint64 bytesAtOnce = 32 << 20;
     throw tagError(errTagNotWritten, "xTagNotWritten", error.Description);
 }
 
-// The file, without links in its name. To root too one is read-only that nobody may write.
+// To root too a file is read-only that nobody may write.
 SystemFile openedToChange(const QString &path)
 {
     try {
+        if (!isOrdinaryFile(path)) // a device may not even be opened
+            notAccessible(path);
         SystemFile file(path, SystemFile::Mode::Write);
         if (isForWriting(file))
             return file;

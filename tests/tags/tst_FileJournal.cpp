@@ -145,14 +145,39 @@ private slots:
     void aFileWrittenSinceItWasAnnounced()
     {
         make(u"a"_s);
+        make(u"b"_s);
         FileChanges changes(*mJournal, {});
-        changes.announce({{path(u"a"_s), tagWith(u"New"_s)}});
+        changes.announce({{path(u"a"_s), tagWith(u"New"_s)}, {path(u"b"_s), tagWith(u"New"_s)}});
         const QByteArray other =
             tagOf(textFrame("TALB", "Album") + frame("XYZW", "kept"), 3, 50) + sound;
         writeFile(path(u"a"_s), other);
         changes.saveTag(tagWith(u"New"_s), path(u"a"_s));
         QVERIFY(readFile(path(u"a"_s)).contains("kept"));
         QCOMPARE(title(u"a"_s), u"New"_s);
+    }
+
+    // Of three that were announced one was not come to.
+    void anEndWithinABatch()
+    {
+        const auto change = [&] {
+            FileChanges changes(*mJournal, {});
+            const QString longTitle(3000, u'x');
+            changes.announce({{path(u"a"_s), tagWith(u"New"_s)},
+                              {path(u"b"_s), tagWith(longTitle)},
+                              {path(u"c"_s), tagWith(u"New"_s)}});
+            changes.saveTag(tagWith(u"New"_s), path(u"a"_s));
+            changes.saveTag(tagWith(longTitle), path(u"b"_s));
+            _exit(diskfaults::killed);
+        };
+        for (const QString &name : {u"a"_s, u"b"_s, u"c"_s})
+            make(name);
+        QVERIFY(killedIn(change, std::numeric_limits<int>::max()));
+        reopen();
+        mJournal->mend();
+        QCOMPARE(mJournal->batches().front().files, 2);
+        QCOMPARE(undoLast().left, QStringList());
+        for (const QString &name : {u"a"_s, u"b"_s, u"c"_s})
+            QCOMPARE(readFile(path(name)), before);
     }
 
     void theOldestGo()

@@ -239,6 +239,16 @@ private slots:
         QCOMPARE(QDir(mFolder.filePath(u"Changes"_s)).entryList({u"copy*"_s}), QStringList());
     }
 
+    void aNameThatIsNoUnicode()
+    {
+        const QByteArray name = nativeName(file(tagOf(textFrame("TIT2", "Old")) + sound)),
+                         other = name + '\xE9';
+        QCOMPARE(::rename(name.constData(), other.constData()), 0);
+        save(nameOfNative(other), TagField::Title, QString(5000, u'x'));
+        QCOMPARE(::rename(other.constData(), name.constData()), 0);
+        QVERIFY(read(nameOfNative(name)).contains(QByteArray(5000, 'x')));
+    }
+
     void notAccessible()
     {
         const QString path = file(sound);
