@@ -2,6 +2,7 @@
 
 #include "controls/list/DBListViewCTL.h"
 #include "controls/list/listcolumns.h"
+#include "mp3/collectionfolder.h"
 #include "mp3/ui_frmCDRootMP3.h"
 #include "platform/ado/connection.h"
 #include "platform/desktop/desktop.h"
@@ -165,14 +166,9 @@ void frmCDRootMP3::setFolder(const QString &folder)
     mUi->txtFolder->setText(folder);
 }
 
-bool frmCDRootMP3::isHeaderValid() const
-{
-    return !mUi->txtTitel->text().isEmpty() && DirExists(folder());
-}
-
 void frmCDRootMP3::txtFolder_Validate()
 {
-    if (mUi->txtFolder->text() != LastGoodFolder && DirExists(folder()))
+    if (mUi->txtFolder->text() != LastGoodFolder && isFolderThere(*this, folder()).value_or(false))
         LastGoodFolder = mUi->txtFolder->text();
 }
 
@@ -185,18 +181,23 @@ void frmCDRootMP3::ValidateFolderAndTitle()
 {
     if (!FormReady)
         return;
-    const bool hasRows = mRows.count() > 0;
-    if (hasRows && !DirExists(folder())) {
+    const bool hasRows = mRows.count() > 0, hasTitle = !mUi->txtTitel->text().isEmpty();
+    const auto isThere = isFolderThere(*this, folder());
+    if (!isThere) { // nobody waited for the answer
+        if (hasRows)
+            setFolder(LastGoodFolder);
+        setButtons(hasRows ? ButtonState::InvalidHeader : ButtonState::NoRows, false);
+    } else if (hasRows && !*isThere) {
         if (asksToClear())
             mRows.removeAll();
         else
             setFolder(LastGoodFolder);
         RefreshAndHandleButtons();
-    } else if (hasRows && mUi->txtTitel->text().isEmpty()) {
+    } else if (hasRows && !hasTitle) {
         errorBox(GetMessage("NameTitleNotOptional"));
         setNoButtons();
     } else {
-        setButtons(hasRows ? ButtonState::AllThere : ButtonState::NoRows, isHeaderValid());
+        setButtons(hasRows ? ButtonState::AllThere : ButtonState::NoRows, hasTitle && *isThere);
     }
 }
 

@@ -65,7 +65,6 @@ private:
     // The head.
     QString folder() const;
     void setFolder(const QString &folder);
-    bool isHeaderValid() const;
     void txtFolder_Validate();
     void ValidateFolderAndTitle();
     bool asksToClear() const;

@@ -291,6 +291,7 @@ const Message furtherTexts[] = {
     {"xMP3Files", "MP3 files", "MP3-bestanden"},
     {"xPreviewNames", "Pre&view", "V&oorbeeld"},
     {"xReadingTags", "Reading the tags of the files...", "De tags van de bestanden worden gelezen..."},
+    {"xLookingForFolder", "Looking for the folder...", "De map wordt gezocht..."},
     {"xScanning", "Looking for MP3 files...", "Er wordt naar MP3-bestanden gezocht..."},
     {"xFilesTwicePart1", "Files that are in the list already: ", "Bestanden die al in de lijst staan: "},
     {"xFilesTwicePart2", ". Would you like to leave them out?", ". Wilt u die overslaan?"},

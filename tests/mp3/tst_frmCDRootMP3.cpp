@@ -1,6 +1,7 @@
 // Label: screen
 #include "controls/list/DBListViewCTL.h"
 #include "mp3/frmCDRootMP3.h"
+#include "platform/work/longwork.h"
 #include "services/clsRegistry.h"
 #include "support/countingbrowser.h"
 #include "support/madesound.h"
@@ -9,6 +10,27 @@
 #include <QDir>
 #include <QLineEdit>
 #include <QPushButton>
+#include <QTimer>
+#include <atomic>
+#include <fcntl.h>
+#include <mutex>
+#include <sys/stat.h>
+
+namespace
+{
+
+std::mutex gMedium; // while it is held nothing tells what is on the medium
+std::atomic<bool> gIsDead;
+
+} // namespace
+
+// Before that of the system.
+extern "C" int stat(const char *path, struct stat *about) noexcept
+{
+    if (gIsDead)
+        const std::lock_guard wait(gMedium);
+    return ::fstatat(AT_FDCWD, path, about, 0);
+}
 
 /// The editor of a collection on a real catalogue and real files.
 class tst_frmCDRootMP3 : public ScreenTest
@@ -138,6 +160,27 @@ private slots:
         QVERIFY(QDir().rename(folder(), folder() + u'2')); // the folder goes as well
         press("cmdRefreshList");
         QVERIFY(item(2).Bold() && !list()->isEnabled());
+    }
+
+    void aMediumThatGivesNoAnswer()
+    {
+        store({u"a.mp3"_s});
+        show(u"U"_s);
+        std::unique_lock dead(gMedium);
+        gIsDead = true;
+        QTimer cancel;
+        connect(&cancel, &QTimer::timeout, &LongWork::cancelAll);
+        cancel.start(20);
+        field("txtTitel")->setText(u"Other"_s);
+        QCOMPARE(usable(), u"Delete RefreshList"_s);
+        field("txtFolder")->setText(u"/other"_s);
+        QCOMPARE(field("txtFolder")->text(), folder());
+        cancel.stop();
+        gIsDead = false;
+        dead.unlock();
+        press("cmdRefreshList");
+        QCOMPARE(field("txtTitel")->text() + files(), u"Other1a.mp3"_s);
+        QVERIFY(control<QPushButton>("cmdOK")->isEnabled());
     }
 
     void scanning()
