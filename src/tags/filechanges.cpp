@@ -110,7 +110,8 @@ void FileChanges::announce(const Tags &tags)
 qint64 FileChanges::announceOne(const CddbID3Tag &tag, const QString &path)
 {
     const QString real = realPath(path);
-    if (mAnnounced.contains(real))
+    const auto [place, isNew] = mAnnounced.try_emplace(real);
+    if (!isNew)
         return 0;
     const SystemFile file = openedToChange(real);
     auto head = planned(tag, file);
@@ -119,7 +120,7 @@ qint64 FileChanges::announceOne(const CddbID3Tag &tag, const QString &path)
         return 0;
     begin();
     tell(*head, file);
-    mAnnounced.insert_or_assign(real, Prepared{*head, tag});
+    place->second = Prepared{*head, tag};
     return head->kept().size();
 }
 
@@ -143,8 +144,10 @@ void FileChanges::announceSome()
 
 void FileChanges::forgetAnnounced()
 {
-    for (const auto &[path, prepared] : mAnnounced)
-        mJournal.drop(prepared.head.change.id);
+    for (const auto &[path, prepared] : mAnnounced) {
+        if (prepared)
+            mJournal.drop(prepared->head.change.id);
+    }
     mAnnounced.clear();
 }
 
@@ -153,11 +156,13 @@ std::optional<HeadChange> FileChanges::takeAnnounced(const CddbID3Tag &tag, cons
     const auto found = mAnnounced.find(file.path());
     if (found == mAnnounced.end())
         return {};
-    const Prepared prepared = std::move(found->second);
+    const auto prepared = std::move(found->second);
     mAnnounced.erase(found);
-    if (prepared.tag == tag && file.stamp() == prepared.head.change.before)
-        return prepared.head;
-    mJournal.drop(prepared.head.change.id);
+    if (!prepared)
+        return {};
+    if (prepared->tag == tag && file.stamp() == prepared->head.change.before)
+        return prepared->head;
+    mJournal.drop(prepared->head.change.id);
     return {};
 }
 

@@ -57,7 +57,8 @@ private:
     FileJournal &mJournal;
     const About mAbout;
     bool mBegun = false;
-    std::map<QString, Prepared> mAnnounced; // by path without links
-    Tags mToCome;                           // those from mNext on are not announced yet
+    // By path without links; nothing: looked at, and not told to the journal.
+    std::map<QString, std::optional<Prepared>> mAnnounced;
+    Tags mToCome; // those from mNext on are not looked at yet
     size_t mNext = 0;
 };

@@ -156,6 +156,25 @@ private slots:
         QCOMPARE(title(u"a"_s), u"New"_s);
     }
 
+    // So that no more than a hundred stand in memory.
+    void theNextAreAnnouncedAtTheirTurn()
+    {
+        FileChanges::Tags tags;
+        for (int i = 0; i < 102; ++i) {
+            const QString name = QString::number(i);
+            tags.emplace_back(make(name), tagWith(i == 0 ? u"Old"_s : u"New"_s));
+        }
+        FileChanges changes(*mJournal, {});
+        changes.announce(tags);
+        const auto journal = [&] { return QFileInfo(path(u"Changes/changes-1"_s)).size(); };
+        const qint64 size = journal();
+        changes.saveTag(tags[0].second, tags[0].first); // says so already
+        changes.saveTag(tags[1].second, tags[1].first);
+        QCOMPARE(journal(), size);
+        changes.saveTag(tags[101].second, tags[101].first);
+        QVERIFY(journal() > size);
+    }
+
     // Of three that were announced one was not come to.
     void anEndWithinABatch()
     {
