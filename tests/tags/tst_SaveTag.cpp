@@ -262,6 +262,22 @@ private slots:
         QCOMPARE(number(mFolder.path()), int(errTagNotAccessible));
         QVERIFY(!QFile::exists(mFolder.filePath(u"Changes"_s)));
     }
+
+    void aFolderThatLetsOthersIn()
+    {
+        // The owner, one of the others by name, the group, the mask, all others.
+        const QByteArray list = "\2\0\0\0\1\0\7\0\xFF\xFF\xFF\xFF\2\0\7\0\xFE\xFF\0\0"
+                                "\4\0\5\0\xFF\xFF\xFF\xFF\x10\0\7\0\xFF\xFF\xFF\xFF"
+                                "\x20\0\5\0\xFF\xFF\xFF\xFF"_ba;
+        const QByteArray name = nativeName(file(tagOf(textFrame("TIT2", "Old")) + sound));
+        QCOMPARE(chmod(name.constData(), 0660), 0);
+        if (setxattr(nativeName(mFolder.path()).constData(), "system.posix_acl_default",
+                     list.constData(), size_t(list.size()), 0) != 0)
+            QSKIP("no access lists here");
+        save(nameOfNative(name), TagField::Title, QString(5000, u'x'));
+        QCOMPARE(getxattr(name.constData(), "system.posix_acl_access", nullptr, 0), -1);
+        removexattr(nativeName(mFolder.path()).constData(), "system.posix_acl_default");
+    }
 };
 
 QTEST_APPLESS_MAIN(tst_SaveTag)
