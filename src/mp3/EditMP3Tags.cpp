@@ -6,6 +6,7 @@
 #include "mp3/ui_EditMP3Tags.h"
 #include "platform/desktop/desktop.h"
 #include "platform/desktop/passingwheel.h"
+#include "platform/work/longwork.h"
 #include "services/captions.h"
 #include "services/fileutilities.h"
 #include "services/frame.h"
@@ -286,7 +287,7 @@ bool EditMP3Tags::TagInfoChanged() const
 
 void EditMP3Tags::cmdSaveTag_Click()
 {
-    if (isBusy())
+    if (!LongWork::mayBegin(*this))
         return;
     if (!TagInfoChanged()) {
         if (ShowSaveMessages)
@@ -331,7 +332,7 @@ void EditMP3Tags::takeBoxes()
 // asked for once more.
 void EditMP3Tags::cmdOK_Click()
 {
-    if (isBusy())
+    if (!LongWork::mayBegin(*this))
         return;
     ShowSaveMessages = false;
     if (TagInfoChanged())
@@ -358,11 +359,14 @@ void EditMP3Tags::keyPressEvent(QKeyEvent *event)
         Form::keyPressEvent(event);
 }
 
-// By design: there is no way to stay.
+// By design: the user has no way to stay. It stays while nothing can be saved.
 bool EditMP3Tags::QueryUnload()
 {
-    if (!SkipUnsavedCheck && !mSaveTried && TagInfoChanged() &&
-        askYesNo(GetMessage("MP3UnsavedChanges")) == vbYes)
+    if (SkipUnsavedCheck || mSaveTried || !TagInfoChanged())
+        return true;
+    if (!LongWork::mayBegin(*this))
+        return false;
+    if (askYesNo(GetMessage("MP3UnsavedChanges")) == vbYes)
         cmdSaveTag_Click();
     return true;
 }

@@ -2,6 +2,7 @@
 #include "discdata/changedfiles.h"
 #include "mp3/EditMP3Tags.h"
 #include "mp3/frmMatchWithSongcase.h"
+#include "platform/work/longwork.h"
 #include "support/tagscreentest.h"
 #include "tags/filejournal.h"
 
@@ -255,6 +256,30 @@ private slots:
         changedFiles().undo(changedFiles().batches().front().number, mDesktop->now(), {},
                             [](int, int) { return true; });
         QCOMPARE(tagIn(2), u"||||||||"_s);
+    }
+
+    void nothingIsSavedBesideALongWork_data()
+    {
+        const DataRows<QString> row("way");
+        row("cmdSaveTag");
+        row("cmdOK");
+        row("Esc");
+    }
+    void nothingIsSavedBesideALongWork()
+    {
+        QFETCH(QString, way);
+        open(path(1));
+        const QString before = tagIn(1);
+        field("txtArtist")->setText(u"Zoë"_s);
+        Form other(u"other"_s);
+        const LongWork work(other);
+        expectOfKey("xBusy");
+        if (way == "Esc"_L1)
+            QTest::keyClick(field("txtArtist"), Qt::Key_Escape);
+        else
+            press(way.toLatin1());
+        QCOMPARE(tagIn(1), before);
+        QVERIFY(!mEditor->isUnloaded());
     }
 };
 
