@@ -26,6 +26,16 @@ ChangeUndo::ChangeUndo(FileJournal &journal, const FileJournal::Entries &entries
     }
 }
 
+std::optional<int> ChangeUndo::firstPart() const
+{
+    std::optional<int> first;
+    for (const auto &[id, entry] : mEntries) {
+        if (entry.change.batch == mBatch && entry.isDone)
+            first = std::min(first.value_or(entry.place.part), entry.place.part);
+    }
+    return first;
+}
+
 // The change of a name behind another one; nullptr: it was the last.
 const FileJournal::Entry *ChangeUndo::next(const QString &path, qint64 behind) const
 {
@@ -73,14 +83,15 @@ void ChangeUndo::takeBackHead(FileChanges &changes, const FileJournal::Entry &en
     if (!kept)
         leave("xUndoForgotten");
     const SystemFile file(name, SystemFile::Mode::Read);
-    QByteArray head = file.read(0, change.newHead);
-    if (file.size() != change.newSize() || headChecksum(head) != change.newHeadIs)
+    const FileStamp stamp = file.stamp();
+    const QByteArray head = file.read(0, change.newHead);
+    if (stamp.size != change.newSize() || headChecksum(head) != change.newHeadIs)
         leave("xUndoChanged");
     QByteArray before = *kept;
     if (change.way == FileChange::Way::InPlace)
         before =
             QByteArray(head).replace(change.from, kept->size() / 2, kept->first(kept->size() / 2));
-    changes.replaceHead(name, head, before);
+    changes.replaceHead(name, stamp, head, before);
     mTouched[name] = stampOf(name);
 }
 

@@ -13,6 +13,7 @@ public:
     ChangeUndo(FileJournal &journal, const FileJournal::Entries &entries, qint64 batch);
     FileJournal::Undone run(const ChangeBatch &about,
                             const std::function<bool(int done, int all)> &step);
+    std::optional<int> firstPart() const; // of the journal, with what it needs
 
 private:
     struct Now {

@@ -15,7 +15,7 @@ namespace
 {
 
 constexpr size_t announcedAtOnce = 100;
-constexpr qint64 bytesAtOnce = 32 << 20;
+constexpr qint64 bytesAtOnce = 8 << 20;
 
 [[noreturn]] void notAccessible(const QString &path)
 {
@@ -62,32 +62,34 @@ FileChanges::FileChanges(FileJournal &journal, About about)
 FileChanges::~FileChanges()
 {
     forgetAnnounced();
-    mJournal.tellDone();
+    if (mBatch != 0)
+        mJournal.endBatch(mBatch);
 }
 
 // A command that changes nothing leaves no batch.
 void FileChanges::begin()
 {
-    if (!mBegun)
-        mJournal.beginBatch({0, mAbout.when, mAbout.what, mAbout.where, mAbout.undoes});
-    mBegun = true;
+    if (mBatch == 0)
+        mBatch = mJournal.beginBatch({0, mAbout.when, mAbout.what, mAbout.where, mAbout.undoes});
 }
 
 std::optional<HeadChange> FileChanges::planned(const CddbID3Tag &tag, const SystemFile &file)
 {
+    const FileStamp before = file.stamp(); // what is written from now on is noticed
     const FileTag there = readTag(file);
     if (asRead(tag, there.fields) == there.fields)
         return {};
     if (!there.isWhole)
         throw tagError(errTagDamaged, "xTagDamaged", file.path());
     const SplicedTag spliced = splicedTag(there.bytes, there.fields, tag);
-    return plannedHead(file, there.bytes, spliced.bytes);
+    return plannedHead(file, before, there.bytes, spliced.bytes);
 }
 
 // The names of the files beside and of the copies are told before they are made.
 void FileChanges::tell(HeadChange &head, const SystemFile &file)
 {
     FileChange &change = head.change;
+    change.batch = mBatch;
     if (change.way == FileChange::Way::Beside)
         change.other = QFileInfo(change.path).path() + "/.songcase-"_L1 +
                        mJournal.copyName().section(u'-', -2) + ".tmp"_L1;
@@ -126,6 +128,7 @@ qint64 FileChanges::announceOne(const CddbID3Tag &tag, const QString &path)
 
 void FileChanges::announceSome()
 {
+    mJournal.tellDone();
     qint64 bytes = 0;
     const size_t end = std::min(mToCome.size(), mNext + announcedAtOnce);
     for (; mNext < end && bytes < bytesAtOnce; ++mNext) {
@@ -160,9 +163,10 @@ std::optional<HeadChange> FileChanges::takeAnnounced(const CddbID3Tag &tag, cons
     mAnnounced.erase(found);
     if (!prepared)
         return {};
-    if (prepared->tag == tag && file.stamp() == prepared->head.change.before)
+    const FileChange &change = prepared->head.change;
+    if (prepared->tag == tag && file.stamp() == change.before && mJournal.holds(change.id))
         return prepared->head;
-    mJournal.drop(prepared->head.change.id);
+    mJournal.drop(change.id);
     return {};
 }
 
@@ -174,12 +178,22 @@ std::optional<HeadChange> FileChanges::findAnnounced(const CddbID3Tag &tag, cons
     return takeAnnounced(tag, file);
 }
 
+// Nothing was begun yet, so there is nothing to put right.
+void FileChanges::requireUntouched(const FileChange &change)
+{
+    if (stampOfOrdinaryFile(change.path) == change.before)
+        return;
+    mJournal.drop(change.id);
+    if (change.way == FileChange::Way::Through)
+        QFile::remove(change.other);
+    notAccessible(change.path);
+}
+
 void FileChanges::performOrMend(const HeadChange &head, SystemFile &file)
 {
     const FileChange &change = head.change;
+    requireUntouched(change);
     try {
-        if (stampOf(change.path) != change.before)
-            notAccessible(change.path);
         performHead(head, file);
     } catch (...) {
         // The name may be there, and only its folder not be synced.
@@ -187,7 +201,12 @@ void FileChanges::performOrMend(const HeadChange &head, SystemFile &file)
             throw;
         return;
     }
-    mJournal.done(change.id, stampOf(change.path));
+    const auto after = stampOfOrdinaryFile(change.path);
+    if (!after) { // gone in this moment, with its medium perhaps
+        mJournal.leave(change.id);
+        return;
+    }
+    mJournal.done(change.id, *after);
     if (change.way == FileChange::Way::Through)
         QFile::remove(change.other);
 }
@@ -226,10 +245,11 @@ void FileChanges::saveTag(const CddbID3Tag &tag, const QString &path)
     }
 }
 
-void FileChanges::replaceHead(const QString &path, const QByteArray &before, const QByteArray &head)
+void FileChanges::replaceHead(const QString &path, const FileStamp &stamp, const QByteArray &before,
+                              const QByteArray &head)
 {
     SystemFile file = lockedToChange(path);
-    HeadChange change = plannedHead(file, before, head);
+    HeadChange change = plannedHead(file, stamp, before, head);
     begin();
     tell(change, file);
     mJournal.sync();
@@ -247,6 +267,7 @@ void FileChanges::move(const QString &from, const QString &to)
         return;
     try {
         begin();
+        change.batch = mBatch;
         mJournal.announce(change, {});
         mJournal.sync();
     } catch (const Error &error) {

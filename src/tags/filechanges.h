@@ -34,8 +34,10 @@ public:
     /// is one. Throws Error (errFileNotMoved, errNameRefused, errChangeNotKept).
     void move(const QString &from, const QString &to);
 
-    /// Gives a file another beginning, `before` being what it begins with now.
-    void replaceHead(const QString &path, const QByteArray &before, const QByteArray &head);
+    /// Gives a file another beginning, `before` being what it began with when it was as `stamp`
+    /// says.
+    void replaceHead(const QString &path, const FileStamp &stamp, const QByteArray &before,
+                     const QByteArray &head);
 
 private:
     struct Prepared {
@@ -46,6 +48,7 @@ private:
     void begin();
     static std::optional<HeadChange> planned(const CddbID3Tag &tag, const SystemFile &file);
     void tell(HeadChange &head, const SystemFile &file);
+    void requireUntouched(const FileChange &change);
     void perform(const HeadChange &head, SystemFile &file);
     void performOrMend(const HeadChange &head, SystemFile &file);
     void announceSome();
@@ -56,7 +59,7 @@ private:
 
     FileJournal &mJournal;
     const About mAbout;
-    bool mBegun = false;
+    qint64 mBatch = 0; // 0: not begun
     // By path without links; nothing: looked at, and not told to the journal.
     std::map<QString, std::optional<Prepared>> mAnnounced;
     Tags mToCome; // those from mNext on are not looked at yet

@@ -8,6 +8,7 @@
 
 #include <QDir>
 #include <QFileInfo>
+#include <QScopeGuard>
 #include <algorithm>
 #include <unistd.h>
 
@@ -52,7 +53,8 @@ void FileJournal::take(Read &into, const QByteArray &entry, const JournalStore::
         ChangeBatch batch;
         in >> batch;
         // It is told again where a part begins.
-        if (into.batches.empty() || into.batches.back().number != batch.number)
+        if (std::none_of(into.batches.rbegin(), into.batches.rend(),
+                         [&](const ChangeBatch &b) { return b.number == batch.number; }))
             into.batches.push_back(batch);
         break;
     }
@@ -80,6 +82,19 @@ void FileJournal::take(Read &into, const QByteArray &entry, const JournalStore::
     }
 }
 
+// Two processes in one folder would write over each other's entries. Where the file system knows no
+// locks there is none.
+void FileJournal::requireOwn()
+{
+    if (mIsLocked)
+        return;
+    const QString name = mStore.folder() + "/lock"_L1;
+    const auto outcome = mLock.takeWithin(name, 0);
+    if (outcome == FileLock::Outcome::Held)
+        throw makeError(errFileFailed, name);
+    mIsLocked = outcome == FileLock::Outcome::Taken;
+}
+
 // The last part alone is read: what is not done is told again where a part begins. Unless that was
 // cut off.
 void FileJournal::open()
@@ -102,22 +117,27 @@ void FileJournal::open()
             mLastId = std::max(mLastId, read.entries.rbegin()->first);
     };
     mStore.openLast(take);
-    if (!isWhole)
-        mStore.readAll(take);
+    const bool allRead = isWhole || mStore.readAll(take);
     for (const ChangeBatch &batch : read.batches)
         mLastBatch = std::max(mLastBatch, batch.number);
     std::erase_if(read.entries, [](const auto &entry) { return entry.second.isDone; });
     mPending = std::move(read.entries);
     mIsOpen = true;
-    removeForgottenCopies();
+    if (allRead)
+        removeForgottenCopies();
 }
 
+// What is done counts, told or not.
 FileJournal::Read FileJournal::readAll() const
 {
     Read read;
     mStore.readAll([&](const QByteArray &entry, const JournalStore::Place &place) {
         take(read, entry, place);
     });
+    for (const auto &[id, entry] : mPending) {
+        if (const auto found = read.entries.find(id); entry.isDone && found != read.entries.end())
+            found->second = entry;
+    }
     return read;
 }
 
@@ -140,42 +160,87 @@ std::vector<FileJournal::Batch> FileJournal::batches() const
     return all;
 }
 
-// Where a part is full: the next one begins with what is not done, so that it is found there. The
-// numbers come last: a part that has them is whole in that.
+// Not while a command is at something: what it has told would be told again.
 void FileJournal::makeRoom()
 {
-    if (!mStore.isPartFull())
-        return;
-    tellDone();
-    std::vector<std::pair<qint64, QByteArray>> kept;
-    for (const auto &[id, entry] : mPending)
-        kept.emplace_back(id, mStore.bytes(entry.place).value_or(QByteArray()));
+    const bool isLive = std::any_of(mPending.begin(), mPending.end(), [](const auto &entry) {
+        return entry.second.isLive && !entry.second.isDone;
+    });
+    if (mStore.mustBegin() || (mStore.isFull() && !isLive))
+        beginPart();
+}
+
+// The next part begins with what is not done, so that it is found there; the one before must tell
+// what is. The numbers come last: a part that has them is whole in that.
+void FileJournal::beginPart()
+{
+    if (!mStore.mustBegin()) {
+        const Entries before = mPending;
+        writeDone();
+        try {
+            mStore.sync();
+        } catch (const Error &) {
+            mPending = before;
+        }
+    }
+    std::map<qint64, QByteArray> kept;
+    for (const auto &[id, entry] : mPending) {
+        if (auto bytes = mStore.bytes(entry.place))
+            kept[id] = *bytes;
+    }
+    std::erase_if(mPending, [&](const auto &entry) { return !kept.contains(entry.first); });
     mStore.beginPart();
-    if (mBatch.number > 0)
-        mStore.append(words(Word::Batch, mBatch));
+    for (const auto &[number, batch] : mBegun)
+        mStore.append(words(Word::Batch, batch));
     for (const auto &[id, bytes] : kept)
         mPending[id].place = mStore.append(words(Word::Change, mPending[id].change), bytes);
+    writeDone();
     mStore.append(words(Word::Numbers, mLastId, mLastBatch));
     mStore.sync();
+    mStore.begun();
 }
 
 qint64 FileJournal::beginBatch(ChangeBatch batch)
 {
-    open();
+    requireOwn();
     mend();
     makeRoom();
+    requireOwn(); // the folder may be new
     batch.number = ++mLastBatch;
-    mBatch = batch;
-    mStore.append(words(Word::Batch, mBatch));
-    return mBatch.number;
+    mBegun[batch.number] = batch;
+    mStore.append(words(Word::Batch, batch));
+    return batch.number;
 }
 
+void FileJournal::endBatch(qint64 number)
+{
+    tellDone();
+    for (auto &[id, entry] : mPending)
+        entry.isLive = entry.isLive && entry.change.batch != number;
+    mBegun.erase(number);
+}
+
+// What follows a change of the same file says that it has happened: the journal must tell it first.
 void FileJournal::announce(FileChange &change, const QByteArray &kept)
 {
+    const auto isOfSameFile = [&](const Entry &entry) {
+        return entry.after.isSameFile(change.before) || entry.change.path == change.path ||
+               entry.change.other == change.path;
+    };
+    if (std::any_of(mPending.begin(), mPending.end(), [&](const auto &entry) {
+            return entry.second.isDone && isOfSameFile(entry.second);
+        }))
+        tellDone();
     makeRoom();
     change.id = ++mLastId;
-    change.batch = mBatch.number;
-    mPending[change.id] = {change, mStore.append(words(Word::Change, change), kept), false, {}};
+    const auto place = mStore.append(words(Word::Change, change), kept);
+    mPending[change.id] = {change, place, false, {}, true};
+}
+
+// Not where the folder of the journal has gone since.
+bool FileJournal::holds(qint64 id) const
+{
+    return mPending.contains(id) && !mStore.mustBegin();
 }
 
 void FileJournal::done(qint64 id, const FileStamp &after)
@@ -190,29 +255,44 @@ void FileJournal::done(qint64 id, const FileStamp &after)
 // Nothing is lost where the journal cannot be told: the files themselves tell at the next look.
 void FileJournal::tellDone()
 {
+    if (mUntold == 0)
+        return;
+    try {
+        makeRoom();
+        writeDone();
+    } catch (const Error &) {
+    }
+}
+
+void FileJournal::writeDone()
+{
     std::vector<QByteArray> told;
     for (const auto &[id, entry] : mPending) {
         if (entry.isDone)
             told.push_back(words(Word::Done, id, entry.after));
     }
-    mUntold = 0;
     if (told.empty())
         return;
-    try {
-        mStore.append(told);
-        std::erase_if(mPending, [](const auto &entry) { return entry.second.isDone; });
-    } catch (const Error &) {
-    }
+    mStore.append(told);
+    mUntold = 0;
+    std::erase_if(mPending, [](const auto &entry) { return entry.second.isDone; });
 }
 
 void FileJournal::drop(qint64 id)
 {
+    leave(id);
     try {
         makeRoom();
         mStore.append(words(Word::Dropped, id));
         mPending.erase(id);
     } catch (const Error &) {
     }
+}
+
+void FileJournal::leave(qint64 id)
+{
+    if (const auto found = mPending.find(id); found != mPending.end())
+        found->second.isLive = false;
 }
 
 QString FileJournal::copyName()
@@ -234,13 +314,15 @@ Mended FileJournal::mendOne(qint64 id, bool back)
                            : mendHead(change, kept.value_or(QByteArray()), back);
     switch (end) {
     case Mended::New:
-        done(id, stampOf(change.way == FileChange::Way::Move ? change.other : change.path));
+        done(id, change.way == FileChange::Way::Move ? stampOfName(change.other)
+                                                     : stampOf(change.path));
         break;
     case Mended::Old:
     case Mended::Foreign:
         drop(id);
         break;
     case Mended::NotNow:
+        leave(id);
         break;
     }
     return end;
@@ -260,10 +342,15 @@ void FileJournal::removeForgottenCopies() const
 
 void FileJournal::mend()
 {
+    try {
+        requireOwn();
+    } catch (const Error &) { // whose they are now
+        return;
+    }
     open();
     std::vector<qint64> ids;
     for (const auto &[id, entry] : mPending) {
-        if (!entry.isDone)
+        if (!entry.isDone && !entry.isLive)
             ids.push_back(id);
     }
     std::reverse(ids.begin(), ids.end());
@@ -284,5 +371,7 @@ FileJournal::Undone FileJournal::undo(qint64 batch, const QDateTime &when, const
     const auto found = std::find_if(read.batches.begin(), read.batches.end(),
                                     [batch](const ChangeBatch &b) { return b.number == batch; });
     const QString where = found == read.batches.end() ? QString() : found->where;
+    mStore.keepFrom(undo.firstPart());
+    const auto free = qScopeGuard([this] { mStore.keepFrom({}); });
     return undo.run({0, when, what, where, batch}, step);
 }

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "platform/files/filelock.h"
 #include "tags/headchange.h"
 #include "tags/journalstore.h"
 
@@ -33,7 +34,8 @@ public:
                 const std::function<bool(int done, int all)> &step);
 
     /// Puts right what a crash, or a medium that was taken away, has left. At the start of the
-    /// program, and before files are read; next to nothing to do where nothing is left.
+    /// program, and before files are changed; next to nothing to do where nothing is left, and
+    /// nothing where another process has the journal.
     void mend();
 
 private:
@@ -45,6 +47,7 @@ private:
         JournalStore::Place place;
         bool isDone = false;
         FileStamp after;
+        bool isLive = false; // a command of this run is at it
     };
     using Entries = std::map<qint64, Entry>; // by id
     struct Read {
@@ -56,21 +59,29 @@ private:
     Read readAll() const;
     static void take(Read &into, const QByteArray &words, const JournalStore::Place &place);
 
+    // Several can be begun at a time.
     qint64 beginBatch(ChangeBatch batch);
+    void endBatch(qint64 number);
     void announce(FileChange &change, const QByteArray &kept); // gives it its id
+    bool holds(qint64 id) const;
     void sync() { mStore.sync(); }
     void done(qint64 id, const FileStamp &after);
     void tellDone(); // the journal; after a crash before that mend() finds it out
     void drop(qint64 id);
+    void leave(qint64 id); // to the next mend()
     Mended mendOne(qint64 id, bool back);
     void removeForgottenCopies() const;
     QString copyName(); // of a Through
     void makeRoom();
+    void beginPart();
+    void writeDone();
+    void requireOwn();
 
     JournalStore mStore;
+    FileLock mLock;
     Entries mPending; // announced, neither dropped nor told to be done
     int mUntold = 0;
-    ChangeBatch mBatch;
+    std::map<qint64, ChangeBatch> mBegun; // by number
     qint64 mLastId = 0, mLastBatch = 0;
-    bool mIsOpen = false;
+    bool mIsOpen = false, mIsLocked = false;
 };

@@ -1,6 +1,7 @@
 #include "tags/headchange.h"
 
 #include "platform/error/error.h"
+#include "platform/files/filelock.h"
 #include "platform/files/nativename.h"
 #include "platform/files/ordinaryfile.h"
 #include "platform/files/wholefile.h"
@@ -125,7 +126,8 @@ void through(const FileChange &change, SystemFile &file)
     file.sync();
 }
 
-// The same of one sector, which a write that fell short may have begun.
+// A write of ours that fell short ends anywhere; one that the end of the program or of the power
+// cut off, between two sectors.
 bool isBegun(QByteArrayView part, QByteArrayView oldPart, QByteArrayView newPart)
 {
     const auto written = std::mismatch(part.begin(), part.end(), newPart.begin()).first;
@@ -134,31 +136,45 @@ bool isBegun(QByteArrayView part, QByteArrayView oldPart, QByteArrayView newPart
 }
 
 // Whether each sector is that of the old or of the new bytes.
-bool isMixture(QByteArrayView bytes, qint64 from, QByteArrayView oldBytes, QByteArrayView newBytes)
+bool isMixture(QByteArrayView bytes, qint64 from, QByteArrayView oldBytes, QByteArrayView newBytes,
+               bool ofThisRun)
 {
     if (bytes.size() != oldBytes.size())
         return false;
     for (qsizetype at = 0; at < bytes.size();) {
         const qsizetype size =
             std::min<qsizetype>(bytes.size() - at, sector - (from + at) % sector);
-        if (!isBegun(bytes.sliced(at, size), oldBytes.sliced(at, size), newBytes.sliced(at, size)))
+        const QByteArrayView now = bytes.sliced(at, size), before = oldBytes.sliced(at, size),
+                             after = newBytes.sliced(at, size);
+        if (now != before && now != after && !(ofThisRun && isBegun(now, before, after)))
             return false;
         at += size;
     }
     return true;
 }
 
+// Who changes the file now has it; `ofThisRun` that is who asks.
+bool isTaken(const SystemFile &file, bool ofThisRun)
+{
+    return !ofThisRun && FileLock::takeFor(file.handle()) == FileLock::Outcome::Held;
+}
+
 Mended mendInPlace(const FileChange &change, const QByteArray &kept, bool back)
 {
     SystemFile file(change.path, SystemFile::Mode::Write);
+    if (isTaken(file, back))
+        return Mended::NotNow;
     const QByteArray oldBytes = kept.first(kept.size() / 2),
                      newBytes = kept.sliced(kept.size() / 2);
     const QByteArray bytes = file.read(change.from, oldBytes.size());
-    if (file.size() != change.before.size || !isMixture(bytes, change.from, oldBytes, newBytes))
+    if (file.size() != change.before.size ||
+        !isMixture(bytes, change.from, oldBytes, newBytes, back))
         return Mended::Foreign;
+    if (bytes == oldBytes && !back) // nobody has begun
+        return Mended::Old;
+    // Once more, since the disk may not have taken what is read now.
     const bool isNew = bytes == newBytes && !back;
-    if (!isNew)
-        file.write(change.from, oldBytes);
+    file.write(change.from, isNew ? newBytes : oldBytes);
     file.sync();
     return isNew ? Mended::New : Mended::Old;
 }
@@ -180,35 +196,86 @@ Mended mendBeside(const FileChange &change)
                : Mended::Foreign;
 }
 
-// Within a run the file is written from its beginning on; the two heads differ in their first
-// bytes, which tell their size. After the power has failed nobody knows which part of it has come
-// first.
-bool hasBegun(const SystemFile &file, const FileChange &change)
+// What a file that goes through a copy held before: its head was kept, the rest is in the copy.
+QByteArray oldPiece(const FileChange &change, const QByteArray &kept, const SystemFile &copy,
+                    qint64 at, qint64 count)
 {
-    const SystemFile copy(change.other, SystemFile::Mode::Read);
-    return file.read(0, sector) == copy.read(0, sector);
+    QByteArray bytes = kept.mid(at, count);
+    const qint64 rest = std::min(count, change.before.size - at) - bytes.size();
+    if (rest > 0)
+        bytes += copy.read(at + bytes.size() - change.oldHead + change.newHead, rest);
+    return bytes.leftJustified(count, '\0'); // the room behind it
 }
 
-Mended mendThrough(const FileChange &change, bool back)
+struct Progress {
+    bool hasOld = false, hasNew = false, hasOther = false; // sectors that are that alone
+};
+
+// The sectors of the file beside those of the old and of the new one.
+Progress progressOf(const SystemFile &file, const SystemFile &copy, const FileChange &change,
+                    const QByteArray &kept)
+{
+    Progress progress;
+    const qint64 size = file.size();
+    for (qint64 at = 0; at < size; at += piece) {
+        const QByteArray now = file.read(at, piece),
+                         before = oldPiece(change, kept, copy, at, now.size()),
+                         after = copy.read(at, now.size()).leftJustified(now.size(), '\0');
+        for (qsizetype i = 0; i < now.size(); i += sector) {
+            const qsizetype count = std::min<qsizetype>(sector, now.size() - i);
+            const auto is = [&](QByteArrayView bytes) {
+                return QByteArrayView(now).sliced(i, count) == bytes.sliced(i, count);
+            };
+            const bool isOld = is(before), isNew = is(after);
+            progress.hasOld |= isOld && !isNew;
+            progress.hasNew |= isNew && !isOld;
+            progress.hasOther |= !isNew && !isOld;
+        }
+    }
+    return progress;
+}
+
+// The copy is the only place where the sound stands for sure, until all of the file was compared.
+Mended mendFromCopy(const FileChange &change, const QByteArray &kept, SystemFile &file, bool back)
+{
+    const SystemFile copy(change.other, SystemFile::Mode::Read);
+    const qint64 size = file.size();
+    if (copy.size() != change.newSize() || kept.size() != change.oldHead)
+        return Mended::NotNow;
+    if (size != change.before.size && size != change.newSize())
+        return Mended::Foreign;
+    const Progress progress = progressOf(file, copy, change, kept);
+    if (progress.hasOther && progress.hasNew && !back)
+        return Mended::NotNow; // begun, and then changed by somebody: nobody knows what is whole
+    if (!progress.hasNew && !(back && progress.hasOther)) {
+        if (!progress.hasOther)
+            file.resize(change.before.size);
+        file.sync();
+        return progress.hasOther ? Mended::Foreign : Mended::Old;
+    }
+    through(change, file);
+    return Mended::New;
+}
+
+Mended mendThrough(const FileChange &change, const QByteArray &kept, bool back)
 {
     SystemFile file(change.path, SystemFile::Mode::Write);
-    const FileStamp now = file.stamp();
-    const bool isOurs = now.isSameFile(change.before) &&
-                        (now.size == change.before.size || now.size == change.newSize());
+    if (isTaken(file, back))
+        return Mended::NotNow;
     Mended end = hasNewHead(file, change) ? Mended::New : Mended::Foreign;
-    if (isOurs && isThere(change.other)) {
-        const bool isOld = back && !hasBegun(file, change);
-        if (isOld)
-            file.resize(change.before.size);
-        else
-            through(change, file);
-        file.sync();
-        end = isOld ? Mended::Old : Mended::New;
-    } else if (isOurs && end == Mended::Foreign && now.size == change.before.size) {
-        end = Mended::Old;
-    }
-    ::unlink(nativeName(change.other).constData());
+    if (isThere(change.other))
+        end = mendFromCopy(change, kept, file, back);
+    if (end != Mended::NotNow)
+        ::unlink(nativeName(change.other).constData());
     return end;
+}
+
+// Not so where its medium is not there: the folder is then another one, or empty.
+bool isGone(const FileChange &change)
+{
+    struct stat folder = {};
+    return ::stat(nativeName(folderOf(change.path)).constData(), &folder) == 0 &&
+           folder.st_dev == change.before.device && !isThere(change.path);
 }
 
 } // namespace
@@ -224,11 +291,12 @@ QByteArray HeadChange::kept() const
     return change.way == FileChange::Way::InPlace ? oldBytes + newBytes : oldBytes;
 }
 
-HeadChange plannedHead(const SystemFile &file, const QByteArray &oldHead, const QByteArray &newHead)
+HeadChange plannedHead(const SystemFile &file, const FileStamp &before, const QByteArray &oldHead,
+                       const QByteArray &newHead)
 {
     FileChange change;
     change.path = file.path();
-    change.before = file.stamp();
+    change.before = before;
     change.oldHead = oldHead.size();
     change.newHead = newHead.size();
     change.newHeadIs = headChecksum(newHead);
@@ -282,11 +350,10 @@ Mended mendHead(const FileChange &change, const QByteArray &kept, bool back)
         case FileChange::Way::Beside:
             return mendBeside(change);
         default:
-            return mendThrough(change, back);
+            return mendThrough(change, kept, back);
         }
     } catch (const Error &) {
         // A file that was deleted needs nothing; a medium that is not there comes back.
-        const bool isGone = isThere(folderOf(change.path)) && !isThere(change.path);
-        return isGone ? Mended::Foreign : Mended::NotNow;
+        return isGone(change) ? Mended::Foreign : Mended::NotNow;
     }
 }

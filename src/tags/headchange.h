@@ -17,10 +17,10 @@ struct HeadChange {
     QByteArray kept() const;
 };
 
-/// `file` has no links in its name. The way follows from the lengths of the heads, and from what
-/// the file is: one with several names, in a folder that cannot be written, or of another owner,
-/// keeps its place.
-HeadChange plannedHead(const SystemFile &file, const QByteArray &oldHead,
+/// `file` has no links in its name, and began with `oldHead` when it was as `before` says. The way
+/// follows from the lengths of the heads, and from what the file is: one with several names, in a
+/// folder that cannot be written, or of another owner, keeps its place.
+HeadChange plannedHead(const SystemFile &file, const FileStamp &before, const QByteArray &oldHead,
                        const QByteArray &newHead);
 
 /// For a change that goes Through: writes the copy of the new file, synced, before the journal is

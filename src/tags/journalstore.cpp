@@ -7,6 +7,8 @@
 #include <QDataStream>
 #include <QDir>
 #include <QFileInfo>
+#include <algorithm>
+#include <sys/stat.h>
 
 using namespace Qt::StringLiterals;
 
@@ -80,6 +82,44 @@ private:
     qint64 mFrom = 0;
 };
 
+struct Entry {
+    QByteArray words;
+    qint64 bytes = 0, end = 0;
+};
+
+std::optional<Entry> entryAt(Ahead &ahead, qint64 at, qint64 size)
+{
+    const auto head = headIn(ahead.read(at, headSize));
+    if (!head)
+        return {};
+    const qint64 bytesAt = at + headSize + head->words;
+    if (bytesAt > size || head->bytes > quint64(size - bytesAt))
+        return {};
+    const QByteArray words = ahead.read(at + headSize, head->words);
+    if (checksumOfWords(head->words, head->bytes, words) != head->ofWords)
+        return {};
+    return Entry{words, qint64(head->bytes), bytesAt + qint64(head->bytes)};
+}
+
+// Where the next entry may begin; the end where there is none.
+qint64 nextMark(Ahead &ahead, qint64 from, qint64 size)
+{
+    constexpr qint64 piece = qint64(64) << 10;
+    QByteArray wanted;
+    QDataStream(&wanted, QIODevice::WriteOnly) << mark;
+    for (qint64 at = from; at < size; at += piece) {
+        const auto found = ahead.read(at, piece + wanted.size() - 1).indexOf(wanted);
+        if (found >= 0)
+            return at + found;
+    }
+    return size;
+}
+
+int numberOf(const QString &name)
+{
+    return name.section(u'-', 1).toInt();
+}
+
 } // namespace
 
 JournalStore::JournalStore(QString folder, JournalSizes sizes)
@@ -96,52 +136,65 @@ std::map<int, qint64> JournalStore::parts() const
 {
     std::map<int, qint64> all;
     for (const QFileInfo &file : QDir(mFolder).entryInfoList({u"changes-*"_s}, QDir::Files)) {
-        if (const int part = file.fileName().section(u'-', 1).toInt(); part > 0)
+        if (const int part = numberOf(file.fileName()); part > 0)
             all[part] = file.size();
     }
     return all;
 }
 
-// Gives where the last whole entry ends.
-qint64 JournalStore::readPart(int part, const Reader &reader) const
+// Of all that has such a name, even if it is no file.
+int JournalStore::lastNumber() const
+{
+    int last = 0;
+    for (const QString &name :
+         QDir(mFolder).entryList({u"changes-*"_s}, QDir::AllEntries | QDir::Hidden | QDir::System))
+        last = std::max(last, numberOf(name));
+    return last;
+}
+
+// False: not all of it.
+bool JournalStore::readPart(int part, const Reader &reader) const
 {
     const SystemFile file(nameOf(part), SystemFile::Mode::Read);
     const qint64 size = file.size();
     Ahead ahead(file);
-    qint64 at = 0;
-    while (const auto head = headIn(ahead.read(at, headSize))) {
-        const qint64 bytesAt = at + headSize + head->words;
-        if (bytesAt > size || qint64(head->bytes) > size - bytesAt)
-            break;
-        const QByteArray words = ahead.read(at + headSize, head->words);
-        if (checksumOfWords(head->words, head->bytes, words) != head->ofWords)
-            break;
-        reader(words, {part, at, qint64(head->bytes)});
-        at = bytesAt + qint64(head->bytes);
+    bool isWhole = true;
+    for (qint64 at = 0; at < size;) {
+        const auto entry = entryAt(ahead, at, size);
+        isWhole = isWhole && entry;
+        if (entry)
+            reader(entry->words, {part, at, entry->bytes});
+        at = entry ? entry->end : nextMark(ahead, at + 1, size);
     }
-    return at;
+    return isWhole;
 }
 
-void JournalStore::readAll(const Reader &reader) const
+bool JournalStore::readAll(const Reader &reader) const
 {
-    for (const auto &[part, size] : parts())
-        readPart(part, reader);
+    bool isWhole = true;
+    for (const auto &[part, size] : parts()) {
+        try {
+            isWhole = readPart(part, reader) && isWhole;
+        } catch (const Error &) { // the others are there
+            isWhole = false;
+        }
+    }
+    return isWhole;
 }
 
+// Into a file that was not read whole nothing is written: what stands behind the damage is kept.
 void JournalStore::openLast(const Reader &reader)
 {
     const auto all = parts();
     if (all.empty())
         return;
     mPart = all.rbegin()->first;
-    mEnd = readPart(mPart, reader);
-}
-
-// What was cut off at the end is written over.
-void JournalStore::openForWriting()
-{
-    mFile.emplace(nameOf(mPart), SystemFile::Mode::Write);
-    mFile->resize(mEnd);
+    mEnd = all.rbegin()->second;
+    try {
+        mIsDoubtful = !readPart(mPart, reader);
+    } catch (const Error &) {
+        mIsDoubtful = true;
+    }
 }
 
 void JournalStore::beginPart()
@@ -149,20 +202,27 @@ void JournalStore::beginPart()
     const bool isNew = !QFileInfo::exists(mFolder);
     if (isNew && !QDir().mkpath(mFolder))
         throw makeError(errFileFailed, mFolder);
-    auto all = parts();
-    const int last = all.empty() ? 0 : all.rbegin()->first;
+    const auto all = parts();
+    const int part = lastNumber() + 1;
     mFile.reset();
-    mFile.emplace(nameOf(last + 1), SystemFile::Mode::Create);
-    mPart = last + 1;
-    mEnd = 0;
+    mFile.emplace(nameOf(part), SystemFile::Mode::Create);
+    mPart = part;
+    mEnd = mBeginning = 0;
     mIsDoubtful = false;
     syncFolder(mFolder);
     if (isNew)
         syncFolder(QFileInfo(mFolder).path());
+    removeOldest(all);
+}
+
+void JournalStore::removeOldest(const std::map<int, qint64> &all) const
+{
     qint64 sum = 0;
     for (const auto &[part, size] : all)
         sum += size;
     for (auto oldest = all.begin(); oldest != all.end() && sum > mSizes.all; ++oldest) {
+        if (mKeptFrom && oldest->first >= *mKeptFrom)
+            break;
         QFile::remove(nameOf(oldest->first));
         sum -= oldest->second;
     }
@@ -171,7 +231,7 @@ void JournalStore::beginPart()
 void JournalStore::write(const QByteArray &entries)
 {
     if (!mFile)
-        openForWriting();
+        mFile.emplace(nameOf(mPart), SystemFile::Mode::Write);
     mFile->write(mEnd, entries);
     mEnd += entries.size();
 }
@@ -219,7 +279,15 @@ std::optional<QByteArray> JournalStore::bytes(const Place &place) const
     }
 }
 
-bool JournalStore::isPartFull() const
+bool JournalStore::mustBegin() const
 {
-    return mEnd == 0 || mIsDoubtful || mEnd >= mSizes.part;
+    struct stat about = {};
+    const bool isThere = mFile ? ::fstat(mFile->handle(), &about) == 0 && about.st_nlink > 0
+                               : mEnd > 0 && QFileInfo::exists(nameOf(mPart));
+    return mEnd == 0 || mIsDoubtful || !isThere;
+}
+
+bool JournalStore::isFull() const
+{
+    return mEnd - mBeginning >= mSizes.part;
 }

@@ -14,8 +14,8 @@ struct JournalSizes {
 
 /// Entries one behind the other in files of a folder, "changes-1" and on: some words about each,
 /// and bytes. What was synced is read again after any end of the program; an entry that was cut
-/// off, and what stands behind it, is not there. Only what an entry says is read to find it, not
-/// its bytes. Throws Error (errFileFailed) where the disk fails.
+/// off or damaged is not there. Only what an entry says is read to find it, not its bytes. Throws
+/// Error (errFileFailed) where the disk fails.
 class JournalStore
 {
 public:
@@ -32,8 +32,8 @@ public:
     using Reader = std::function<void(const QByteArray &words, const Place &place)>;
     void openLast(const Reader &reader);
 
-    /// The same of all files.
-    void readAll(const Reader &reader) const;
+    /// The same of all files. False: one could not be read, or not all of it.
+    bool readAll(const Reader &reader) const;
 
     Place append(const QByteArray &words, const QByteArray &bytes = {});
     void append(const std::vector<QByteArray> &words); // with one write
@@ -42,22 +42,33 @@ public:
     /// Nothing where they are gone, or are not those that were written.
     std::optional<QByteArray> bytes(const Place &place) const;
 
-    /// Whether the next entry has to begin a file: there is none, or so much is in it, or it is not
-    /// to be trusted any more. And that.
-    bool isPartFull() const;
+    /// Whether the next entry has to begin a file: there is none, it is gone, or it is not to be
+    /// trusted any more.
+    bool mustBegin() const;
+
+    /// Whether it should: so much is in it, behind what it began with.
+    bool isFull() const;
+
+    /// Begins a file. What is appended until begun() it begins with.
     void beginPart();
+    void begun() { mBeginning = mEnd; }
+
+    /// This file and those behind it do not go for want of room, as long as they are needed.
+    void keepFrom(std::optional<int> part) { mKeptFrom = part; }
 
 private:
     QString nameOf(int part) const;
+    int lastNumber() const;
     std::map<int, qint64> parts() const; // sizes by number
-    qint64 readPart(int part, const Reader &reader) const;
-    void openForWriting();
+    bool readPart(int part, const Reader &reader) const;
     void write(const QByteArray &entries);
+    void removeOldest(const std::map<int, qint64> &all) const;
 
     const QString mFolder;
     const JournalSizes mSizes;
     std::optional<SystemFile> mFile;
     int mPart = 0;
-    qint64 mEnd = 0;
-    bool mIsDoubtful = false; // a sync has failed
+    qint64 mEnd = 0, mBeginning = 0;
+    std::optional<int> mKeptFrom;
+    bool mIsDoubtful = false; // not read whole, or a sync has failed
 };

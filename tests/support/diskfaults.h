@@ -78,15 +78,17 @@ template <typename File> bool fails(File file, bool needsRoom, bool isWrite = fa
 }
 
 // A write. The one that fills the disk takes what there is room for, as one does in which the
-// process ends.
-template <typename Write> ssize_t part(int handle, size_t size, const Write &write)
+// process ends; a system takes whole sectors.
+template <typename Write> ssize_t part(int handle, size_t size, off_t at, const Write &write)
 {
+    constexpr off_t sector = 512;
     const int before = gState ? gState->calls : 0;
     if (!fails(handle, true, true))
         return write(size);
     const bool isFirst = before + 1 == gState->failing;
-    const bool takes = gState->kind != diskfaults::Kind::Broken && isFirst && size > 1;
-    const ssize_t taken = takes ? write(size / 2) : -1;
+    const off_t room = (at + off_t(size / 2)) / sector * sector - at;
+    const bool takes = gState->kind != diskfaults::Kind::Broken && isFirst && room > 0;
+    const ssize_t taken = takes ? write(size_t(room)) : -1;
     if (gState->kind == diskfaults::Kind::Killed)
         ::_exit(diskfaults::killed);
     return taken;
@@ -133,26 +135,27 @@ int open64(const char *path, int flags, ...)
 ssize_t write(int handle, const void *data, size_t size)
 {
     static const auto system = next(&::write, "write");
-    return part(handle, size, [&](size_t some) { return system(handle, data, some); });
+    return part(handle, size, 0, [&](size_t some) { return system(handle, data, some); });
 }
 
 ssize_t pwrite(int handle, const void *data, size_t size, off_t at)
 {
     static const auto system = next(&::pwrite, "pwrite");
-    return part(handle, size, [&](size_t some) { return system(handle, data, some, at); });
+    return part(handle, size, at, [&](size_t some) { return system(handle, data, some, at); });
 }
 
 ssize_t pwrite64(int handle, const void *data, size_t size, off64_t at)
 {
     static const auto system = next(&::pwrite64, "pwrite64");
-    return part(handle, size, [&](size_t some) { return system(handle, data, some, at); });
+    return part(handle, size, at, [&](size_t some) { return system(handle, data, some, at); });
 }
 
 ssize_t copy_file_range(int from, off64_t *fromAt, int to, off64_t *toAt, size_t size,
                         unsigned flags)
 {
     static const auto system = next(&::copy_file_range, "copy_file_range");
-    return part(to, size, [&](size_t some) { return system(from, fromAt, to, toAt, some, flags); });
+    return part(to, size, toAt ? *toAt : 0,
+                [&](size_t some) { return system(from, fromAt, to, toAt, some, flags); });
 }
 
 int posix_fallocate(int handle, off_t at, off_t size)

@@ -51,6 +51,10 @@ private:
         tag.setTitle(title);
         return tag;
     }
+    void link(const QString &name, const QString &other) const
+    {
+        QCOMPARE(::link(path(name).toUtf8().constData(), path(other).toUtf8().constData()), 0);
+    }
     void save(const QString &name, const QString &title)
     {
         FileChanges(*mJournal, {{}, title, {}}).saveTag(tagWith(title), path(name));
@@ -199,6 +203,142 @@ private slots:
             QCOMPARE(readFile(path(name)), before);
     }
 
+    // One program ends in the middle of a batch, another one corrects what it has written.
+    void whatOthersWroteAfterACrash_data()
+    {
+        const DataRows<bool> row("through");
+        row("in place", false);
+        row("through", true);
+    }
+    void whatOthersWroteAfterACrash()
+    {
+        QFETCH(bool, through);
+        const QString wanted(through ? 2000 : 5, u'n');
+        for (int call = 1; call < 40; ++call) {
+            init();
+            make(u"a"_s);
+            make(u"b"_s);
+            if (through)
+                link(u"a"_s, u"link"_s);
+            killedIn(
+                [&] {
+                    FileChanges changes(*mJournal, {});
+                    changes.announce({{path(u"a"_s), tagWith(wanted)}, {path(u"b"_s), {}}});
+                    changes.saveTag(tagWith(wanted), path(u"a"_s));
+                    _exit(0);
+                },
+                call);
+            QByteArray now = readFile(path(u"a"_s));
+            if (through && now != before)
+                continue;
+            now.replace("Album", "Other").replace("nnnnn", "nnnnx");
+            QFile file(path(u"a"_s));
+            QVERIFY(file.open(QIODevice::ReadWrite) && file.write(now) == now.size());
+            file.close();
+            reopen();
+            mJournal->mend();
+            QCOMPARE(readFile(path(u"a"_s)), now);
+        }
+    }
+
+    void oneFileTwiceInABatch()
+    {
+        make(u"a"_s);
+        link(u"a"_s, u"link"_s);
+        const auto change = [&] {
+            FileChanges changes(*mJournal, {});
+            changes.saveTag(tagWith(u"One"_s), path(u"a"_s));
+            changes.saveTag(tagWith(u"Two"_s), path(u"link"_s));
+            _exit(diskfaults::killed);
+        };
+        QVERIFY(killedIn(change, std::numeric_limits<int>::max()));
+        reopen();
+        mJournal->mend();
+        QCOMPARE(title(u"a"_s), u"Two"_s);
+        QCOMPARE(undoLast().files, 2);
+        QCOMPARE(readFile(path(u"a"_s)), before);
+    }
+
+    void twoCommandsAtOnce()
+    {
+        FileChanges::Tags tags;
+        for (const QString &name : {u"a"_s, u"b"_s, u"c"_s})
+            tags.emplace_back(make(name), tagWith(QString(2000, u'n')));
+        {
+            FileChanges first(*mJournal, {{}, u"first"_s, {}});
+            first.announce({tags[0], tags[1]});
+            first.saveTag(tags[0].second, tags[0].first);
+            save(u"c"_s, u"second"_s);
+            first.saveTag(tags[1].second, tags[1].first);
+        }
+        const auto all = mJournal->batches();
+        QCOMPARE(all.size(), 2U);
+        QCOMPARE(all[0].what + QString::number(all[0].files), u"second1"_s);
+        QCOMPARE(all[1].what + QString::number(all[1].files), u"first2"_s);
+        QCOMPARE(mJournal->undo(all[1].number, {}, {}, always).left, QStringList());
+        QCOMPARE(readFile(path(u"a"_s)) + readFile(path(u"b"_s)), before + before);
+        // Another program's own changes are its own to mend.
+        FileJournal other(path(u"Changes"_s));
+        QCOMPARE(numberOf([&] { FileChanges(other, {}).saveTag(tagWith(u"x"_s), path(u"a"_s)); }),
+                 int(errTagNotWritten));
+    }
+
+    // It takes the room of its own tags, and takes away no other batch.
+    void aBatchThatIsLargerThanAPart()
+    {
+        reopen({3000, 60000});
+        make(u"a"_s);
+        save(u"a"_s, u"New"_s);
+        FileChanges::Tags tags;
+        for (int i = 0; i < 20; ++i)
+            tags.emplace_back(make(QString::number(i)), tagWith(QString(2000, u'n')));
+        {
+            FileChanges changes(*mJournal, {});
+            changes.announce(tags);
+            for (const auto &[name, tag] : tags)
+                changes.saveTag(tag, name);
+        }
+        qint64 size = 0;
+        for (const QFileInfo &part : QDir(path(u"Changes"_s)).entryInfoList({u"changes*"_s}))
+            size += part.size();
+        QVERIFY2(size < 20 * 1500, qPrintable(QString::number(size)));
+        QCOMPARE(undoLast().files, 20);
+        QCOMPARE(mJournal->batches().back().files, 1);
+    }
+
+    void damageOfTheJournal_data()
+    {
+        const DataRows<QString, int> row("damage", "batches");
+        row("flipped byte", "flip", 3);
+        row("a part that cannot be read", "folder", 1);
+        row("removed while in use", "gone", 1);
+    }
+    void damageOfTheJournal()
+    {
+        QFETCH(QString, damage);
+        QFETCH(int, batches);
+        make(u"a"_s);
+        for (const QString &text : {u"One"_s, u"Two"_s, u"Three"_s})
+            save(u"a"_s, text);
+        const QString part = path(u"Changes/changes-1"_s);
+        if (damage == "flip"_L1) {
+            QByteArray bytes = readFile(part);
+            bytes[85] = char(~bytes[85]); // of the first batch
+            writeFile(part, bytes);
+            reopen();
+        } else {
+            QVERIFY(QDir(path(u"Changes"_s)).removeRecursively());
+        }
+        if (damage == "folder"_L1) {
+            QVERIFY(QDir().mkpath(part));
+            reopen();
+        }
+        save(u"a"_s, u"Four"_s);
+        QCOMPARE(mJournal->batches().size(), size_t(batches));
+        QCOMPARE(undoLast().files, 1);
+        QCOMPARE(title(u"a"_s), u"Three"_s);
+    }
+
     void theOldestGo()
     {
         reopen({2000, 8000});
@@ -269,7 +409,7 @@ private slots:
         QFETCH(QString, what);
         QFETCH(int, kind);
         const bool isMove = what == "move"_L1;
-        const QString text = what == "in place"_L1 ? u"New"_s : QString(2000, u'n');
+        const QString text(what == "in place"_L1 ? 800 : 2000, u'n');
         const auto change = [&] {
             if (isMove)
                 FileChanges(*mJournal, {}).move(path(u"a"_s), path(u"b"_s));
@@ -282,9 +422,7 @@ private slots:
             init();
             make(u"a"_s);
             if (what == "through"_L1)
-                QCOMPARE(
-                    ::link(path(u"a"_s).toUtf8().constData(), path(u"link"_s).toUtf8().constData()),
-                    0);
+                link(u"a"_s, u"link"_s);
             bool failed = false;
             if (diskfaults::Kind(kind) == diskfaults::Kind::Killed) {
                 came = killedIn(change, calls + 1);
