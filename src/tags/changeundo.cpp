@@ -22,8 +22,18 @@ ChangeUndo::ChangeUndo(FileJournal &journal, const FileJournal::Entries &entries
 {
     for (const auto &[id, entry] : mEntries) {
         if (entry.isDone)
-            mByName[{entry.change.path, id}] = &entry;
+            mByName[{withoutLinks(entry.change.path), id}] = &entry;
     }
+}
+
+// A folder may be reached through a link.
+QString ChangeUndo::withoutLinks(const QString &path) const
+{
+    const auto name = path.lastIndexOf(u'/') + 1;
+    QString &folder = mFolders[path.first(name)];
+    if (folder.isEmpty())
+        folder = realPath(path.first(name)) + u'/';
+    return folder + path.sliced(name);
 }
 
 std::optional<int> ChangeUndo::firstPart() const
@@ -39,10 +49,11 @@ std::optional<int> ChangeUndo::firstPart() const
 // The change of a name behind another one; nullptr: it was the last.
 const FileJournal::Entry *ChangeUndo::next(const QString &path, qint64 behind) const
 {
-    auto found = mByName.upper_bound({path, behind});
+    const QString name = withoutLinks(path);
+    auto found = mByName.upper_bound({name, behind});
     while (found != mByName.end() && mTakenBack.contains(found->first.second))
         ++found;
-    return found != mByName.end() && found->first.first == path ? found->second : nullptr;
+    return found != mByName.end() && found->first.first == name ? found->second : nullptr;
 }
 
 // A file that was renamed since has its new name, and one that was written anew is another one to
@@ -56,7 +67,7 @@ ChangeUndo::Now ChangeUndo::now(const QString &path, const FileJournal::Entry &s
         if (entry->change.way == FileChange::Way::Move)
             now.name = entry->change.other;
     }
-    if (const auto touched = mTouched.find(now.name); touched != mTouched.end())
+    if (const auto touched = mTouched.find(withoutLinks(now.name)); touched != mTouched.end())
         now.stamp = touched->second;
     return now;
 }

@@ -2,6 +2,7 @@
 
 #include "tags/filejournal.h"
 
+#include <QHash>
 #include <set>
 
 class FileChanges;
@@ -20,6 +21,7 @@ private:
         QString name;
         FileStamp stamp; // as the journal knows it
     };
+    QString withoutLinks(const QString &path) const;
     const FileJournal::Entry *next(const QString &path, qint64 behind) const;
     Now now(const QString &path, const FileJournal::Entry &since) const;
     void takeBack(FileChanges &changes, const FileJournal::Entry &entry);
@@ -29,6 +31,7 @@ private:
     FileJournal &mJournal;
     const FileJournal::Entries &mEntries;
     const qint64 mBatch;
+    mutable QHash<QString, QString> mFolders;                                 // without links
     std::map<std::pair<QString, qint64>, const FileJournal::Entry *> mByName; // and id
     std::map<QString, FileStamp> mTouched;                                    // by this undo
     std::set<qint64> mTakenBack;                                              // the same

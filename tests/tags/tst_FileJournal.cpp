@@ -101,14 +101,26 @@ private slots:
         QVERIFY(!mJournal->batches()[2].isTakenBack);
     }
 
+    void undoFindsAFileThatWasRenamedSince_data()
+    {
+        const DataRows<QString> row("folder");
+        row("as it is", "");
+        row("through a link", "linked/");
+    }
     void undoFindsAFileThatWasRenamedSince()
     {
+        QFETCH(QString, folder);
+        QVERIFY(QFile::link(mFolder->path(), path(u"linked"_s)));
         make(u"a"_s);
-        save(u"a"_s, u"New"_s);
+        save(folder + u'a', u"New"_s);
         const qint64 batch = mJournal->batches().front().number;
-        FileChanges(*mJournal, {}).move(path(u"a"_s), path(u"b"_s));
+        FileChanges(*mJournal, {}).move(path(folder + u'a'), path(folder + u'b'));
+        save(folder + u'b', QString(3000, u'x'));
+        QCOMPARE(undoLast().files, 1);
         QCOMPARE(mJournal->undo(batch, {}, {}, always).files, 1);
         QCOMPARE(readFile(path(u"b"_s)), before);
+        QCOMPARE(mJournal->undo(batch + 1, {}, {}, always).files, 1);
+        QCOMPARE(readFile(path(u"a"_s)), before);
     }
 
     void whatChangedSinceIsLeft_data()
