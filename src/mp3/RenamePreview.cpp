@@ -35,6 +35,8 @@ QString remarkOn(const PreviewedName &name)
         return GetMessage("xRemarkTooLong");
     case NameObstacle::OfAnotherRow:
         return GetMessage("xRemarkRow") + QString::number(name.newName.otherRow);
+    case NameObstacle::OfAFolder:
+        return GetMessage("xRemarkFolder");
     case NameObstacle::IsThere:
         return GetMessage(hasItAlready(name) ? "xRemarkSame" : "xRemarkIsThere");
     case NameObstacle::FileGone:

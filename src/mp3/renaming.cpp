@@ -76,6 +76,8 @@ bool Renaming::mayTake(const CollectionRow &row, const NewName &name) const
     case NameObstacle::OfAnotherRow:
         return tell(GetMessage("xNameOfRowPart1") + QString::number(name.otherRow) +
                     GetMessage("xNameOfRowPart2"));
+    case NameObstacle::OfAFolder:
+        return tell(GetMessage("xNameOfFolder"));
     case NameObstacle::IsThere: // its own name counts too
         return askYesNo(name.name + u": "_s + GetMessage("FileAlreadyExists")) == vbYes;
     case NameObstacle::None:

@@ -4,6 +4,7 @@
 #include "platform/files/nativename.h"
 #include "platform/text/textrules.h"
 #include "services/fileutilities.h"
+#include "tags/movedfile.h"
 
 #include <QDir>
 #include <cerrno>
@@ -51,6 +52,12 @@ bool isTooLong(const QString &path)
 {
     struct stat about = {};
     return lstat(nativeName(path).constData(), &about) != 0 && errno == ENAMETOOLONG;
+}
+
+bool isFolder(const QString &path)
+{
+    struct stat about = {};
+    return stat(nativeName(path).constData(), &about) == 0 && S_ISDIR(about.st_mode);
 }
 
 qsizetype endOfFolder(const QString &path)
@@ -124,6 +131,8 @@ NameObstacle RenamingPlan::obstacleTo(const CollectionRow &row, const NewName &n
         return NameObstacle::MovedAlready;
     if (name.otherRow != 0)
         return NameObstacle::OfAnotherRow;
+    if (isFolder(name.newPath))
+        return NameObstacle::OfAFolder;
     if (isThere(name.newPath))
         return NameObstacle::IsThere;
     return FileExists(name.oldPath) ? NameObstacle::None : NameObstacle::FileGone;
@@ -141,9 +150,10 @@ int RenamingPlan::otherRowWith(const CollectionRow &row, const NewName &name) co
     return found == to ? 0 : found->row;
 }
 
+// A link that leads nowhere has its name as well, and would be replaced.
 bool RenamingPlan::isThere(const QString &path) const
 {
-    return !mPretendedFree.contains(path) && FileExists(path);
+    return !mPretendedFree.contains(path) && (isNameTaken(path) || FileExists(path));
 }
 
 void RenamingPlan::take(const CollectionRow &row, const NewName &name)

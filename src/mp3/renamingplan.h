@@ -15,6 +15,7 @@ enum class NameObstacle {
     LetterRefused,    // no file can have such a name
     TooLong,          // for the file system
     OfAnotherRow,     // whose file would be lost
+    OfAFolder,        // with all that is in it
     IsThere,          // a file has this name; it may be the row's own
     FileGone,         // the row's own
     MovedAlready      // by another row that stands for the same file

@@ -46,6 +46,21 @@ private:
         return names;
     }
 
+    // "new name: remark" of each row, "! " before what stands bold.
+    QStringList preview(const std::vector<CollectionRow> &rows)
+    {
+        QStringList lines;
+        mDesktop->expectModal(u"RenamePreview"_s, [&](Form &screen) {
+            auto items = screen.findChild<DBListViewCTL *>()->ListItems();
+            for (int i = 1; i <= items.Count(); ++i)
+                lines.append((items.Item(i).Bold() ? u"! "_s : QString()) +
+                             items.Item(i).SubItems(2) + u": "_s + items.Item(i).SubItems(3));
+            screen.findChild<QPushButton *>(u"cmdClose"_s)->click();
+        });
+        previewRenaming(*mScreen, folder(), rows, rows);
+        return lines;
+    }
+
 private slots:
     void init()
     {
@@ -118,6 +133,29 @@ private slots:
             QCOMPARE(readFile(mCatalogue->path("data/Trash/files/01-A-B.mp3")), "other");
     }
 
+    // One that leads nowhere is not seen by who follows it.
+    void aLinkThatNoRowHas()
+    {
+        const auto rows = rowsOf(u"x.mp3|A|B|1"_s);
+        makeFiles(rows);
+        const QString there = folder() + u"/01-A-B.mp3"_s;
+        QVERIFY(QFile::link(folder() + u"/nowhere"_s, there));
+        QCOMPARE(preview(rows), texts("! 01-A-B.mp3: Another file has it; you will be asked"));
+        QCOMPARE(rename(rows, {u"already exists=No"_s}), texts("x.mp3"));
+        QVERIFY(QFileInfo(there).isSymLink());
+    }
+
+    void aFolder()
+    {
+        const auto rows = rowsOf(u"x.mp3|A|B|1"_s);
+        makeFiles(rows);
+        makeFiles(rowsOf(u"01-A-B.mp3/inside"_s));
+        QCOMPARE(preview(rows), texts("! 01-A-B.mp3: A folder has this name"));
+        QCOMPARE(rename(rows, {u"error [Songcase] 01-A-B.mp3: There is a folder"_s}),
+                 texts("x.mp3"));
+        QCOMPARE(contentOf(u"01-A-B.mp3/inside"_s), "01-A-B.mp3/inside");
+    }
+
     // Another name for the very file, as on a disk that makes no difference between cases.
     void aLinkToTheFileItself()
     {
@@ -150,23 +188,14 @@ private slots:
         QCOMPARE(contentOf(u"x.mp3"_s), "x.mp3");
     }
 
-    void preview()
+    void previewed()
     {
         const auto rows = rowsOf(u"a.mp3|A|B|1\nb.mp3|A|B|1\nc.mp3|A||\n02-C-D.mp3|C|D|2\n"
                                  "e.mp3|E|F|3\n03-E-F.mp3|G|H|4\ngone.mp3|I|J|5"_s);
         makeFiles(rows);
         QVERIFY(QFile::remove(folder() + u"/gone.mp3"_s));
         const QStringList before = QDir(folder()).entryList(QDir::Files);
-        QStringList lines;
-        mDesktop->expectModal(u"RenamePreview"_s, [&](Form &screen) {
-            auto items = screen.findChild<DBListViewCTL *>()->ListItems();
-            for (int i = 1; i <= items.Count(); ++i)
-                lines.append((items.Item(i).Bold() ? u"! "_s : QString()) +
-                             items.Item(i).SubItems(2) + u": "_s + items.Item(i).SubItems(3));
-            screen.findChild<QPushButton *>(u"cmdClose"_s)->click();
-        });
-        previewRenaming(*mScreen, folder(), rows, rows);
-        QCOMPARE(lines,
+        QCOMPARE(preview(rows),
                  texts("01-A-B.mp3: ", "! 01-A-B.mp3: Name of the file in row 1",
                        "! : No artist or no title in the tag", "02-C-D.mp3: Has this name already",
                        "! 03-E-F.mp3: Name of the file in row 6",
