@@ -6,6 +6,7 @@
 #include "platform/desktop/openaddress.h"
 #include "platform/desktop/programfolder.h"
 #include "platform/desktop/sentkey.h"
+#include "platform/desktop/typedahead.h"
 #include "platform/text/textrules.h"
 
 #include <QApplication>
@@ -130,6 +131,7 @@ BoxAnswer QtDesktop::messageBox(BoxKind kind, BoxButtons buttons, const QString 
     if (buttons == BoxButtons::YesNo)
         box.onlyButtons();
     box.setDefaultButton(buttons == BoxButtons::Ok ? QMessageBox::Ok : QMessageBox::Yes);
+    ignoreTypedAhead(&box, *this);
     setModalAnswered();
     return answerOf(run(box));
 }

@@ -265,6 +265,44 @@ private slots:
         QCOMPARE(text, u"<b>\nnext"_s);
     }
 
+    void lettersTypedAheadAnswerNoBox_data()
+    {
+        const DataRows<QString, qint64, int> row("keys", "after", "answer");
+        row("letter", "N", 699, vbYes);
+        row("capital", "Shift+N", 0, vbYes);
+        row("blank", "Space,Alt+N", 0, vbNo);
+        row("at once", "Esc", 0, vbCancel);
+        row("moved", "Right,Return", 0, vbNo);
+        row("later", "N", 700, vbNo);
+        row("later blank", "Space", 700, vbYes);
+    }
+
+    void lettersTypedAheadAnswerNoBox()
+    {
+        struct Clocked : QtDesktop {
+            QDateTime now() override { return time; }
+            QDateTime time{QDate(2026, 11, 22), QTime(12, 0)};
+        } real;
+        QFETCH(QString, keys);
+        QFETCH(qint64, after);
+        inNextBox([&](QMessageBox &box) {
+            QVERIFY(QTest::qWaitForWindowActive(&box)); // Alt+letter goes to that alone
+            real.time = real.time.addMSecs(after);
+            const QKeySequence sequence(keys);
+            for (uint i = 0; i < uint(sequence.count()); ++i) {
+                const QKeyCombination key = sequence[i];
+                QTest::keyClick(box.focusWidget(), key.key(), key.keyboardModifiers());
+            }
+            const auto buttons = box.buttons(); // a letter holds one down for a while
+            if (box.isVisible() && std::none_of(buttons.begin(), buttons.end(),
+                                                [](auto *button) { return button->isDown(); }))
+                QTest::keyClick(&box, Qt::Key_Return);
+            QTRY_VERIFY(!box.isVisible());
+        });
+        QTEST(int(real.messageBox(BoxKind::Question, BoxButtons::YesNoCancel, u"?"_s, u"t"_s)),
+              "answer");
+    }
+
     // A box is open over its form, and the form is unloaded below it.
     void nothingGoesUnderARoutineThatWaits()
     {
