@@ -105,6 +105,8 @@ void frmCDRootMP3::connectControls()
 void frmCDRootMP3::connectList()
 {
     DBListViewCTL *list = mUi->TheMP3Collection;
+    list->setMayBeUnselected(true);
+    connect(list, &DBListViewCTL::SelectionCleared, this, &frmCDRootMP3::SyncSelection);
     connect(list, &DBListViewCTL::ItemClick, this, &frmCDRootMP3::list_ItemClick);
     connect(list, &DBListViewCTL::DblClick, this, &frmCDRootMP3::cmdUpdateID3_Click);
     connect(list, &DBListViewCTL::KeyUp, this, &frmCDRootMP3::list_KeyUp);

@@ -112,10 +112,10 @@ void frmCDRootMP3::cmdImportAsCD_Click()
 
 void frmCDRootMP3::cmdUpdateID3_Click()
 {
-    if (!mUi->cmdUpdateID3->isEnabled() || !LongWork::mayBegin(*this))
+    const ListItem item = mUi->TheMP3Collection->SelectedItem();
+    if (!mUi->cmdUpdateID3->isEnabled() || !item.Selected() || !LongWork::mayBegin(*this))
         return;
     const Hourglass hourglass(this);
-    const ListItem item = mUi->TheMP3Collection->SelectedItem();
     const QString path = pathInFolder(folder(), item.SubItems(int(CollectionField::FileName)));
     if (FileExists(path)) {
         EditMP3Tags::edit(path);

@@ -116,6 +116,7 @@ void frmCDRootMP3::list_MouseDown(int button, int x, int y)
     if (button != rightButton || isBusy())
         return;
     list.selectionModel()->clearSelection();
+    SyncSelection();
     DragItem = list.HitTest(x, y);
     if (!DragItem)
         return;
@@ -260,8 +261,8 @@ void frmCDRootMP3::moveRow(int from, int to)
 
 void frmCDRootMP3::moveCurrentBy(int step)
 {
-    const int from = mUi->TheMP3Collection->SelectedItem().Index();
-    const int to = from + step;
-    if (from >= 1 && to >= 1 && to <= mRows.count())
+    const ListItem item = mUi->TheMP3Collection->SelectedItem();
+    const int from = item.Index(), to = from + step;
+    if (item.Selected() && to >= 1 && to <= mRows.count())
         command([&] { moveRow(from, to); });
 }

@@ -274,6 +274,45 @@ private slots:
         QCOMPARE(usable(), u"Add Scan"_s);
     }
 
+    void withNoRowSelected_data()
+    {
+        const DataRows<int, int, QString> row("button", "modifiers", "place");
+        row("right press below", int(Qt::RightButton), 0, "below");
+        row("click below", int(Qt::LeftButton), 0, "below");
+        row("taken out again", int(Qt::LeftButton), int(Qt::ControlModifier), "row");
+        row("drag given up", int(Qt::RightButton), 0, "row");
+    }
+
+    // Nothing is done then, and nothing said.
+    void withNoRowSelected()
+    {
+        QFETCH(int, button);
+        QFETCH(int, modifiers);
+        QFETCH(QString, place);
+        store({u"a.mp3"_s, u"b.mp3"_s});
+        show(u"U"_s);
+        QTest::mouseClick(list()->viewport(), Qt::LeftButton, {}, at(2));
+        if (modifiers == 0)
+            QTest::keyClick(list(), Qt::Key_A, Qt::ControlModifier);
+        const QPoint to = place == u"row" ? at(2) : QPoint(9, list()->viewport()->height() - 9);
+        const Qt::KeyboardModifiers with(modifiers);
+        QTest::mousePress(list()->viewport(), Qt::MouseButton(button), with, to);
+        if (place == u"row" && modifiers == 0)
+            QTest::keyClick(list(), Qt::Key_Escape);
+        QTest::mouseRelease(list()->viewport(), Qt::MouseButton(button), with, to);
+        QCOMPARE(selected(), QString());
+        QVERIFY(!control<QPushButton>("cmdUpdateID3")->isEnabled());
+        QVERIFY(control<QPushButton>("cmdTagWizard")->isEnabled());
+        press("cmdRename");
+        emit list()->DblClick();
+        QTest::keyClick(list(), Qt::Key_Up, Qt::AltModifier);
+        QCOMPARE(selected(), u"2"_s); // by the key, not by a move
+        list()->selectionModel()->clearSelection();
+        QTest::keyClick(list(), Qt::Key_Delete);
+        QCOMPARE(files(), u"1a.mp3 2b.mp3"_s);
+        QVERIFY(!mEditor->HasRecordSetChanged());
+    }
+
     void anotherFolder()
     {
         store({u"a"_s});

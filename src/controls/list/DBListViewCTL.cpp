@@ -151,10 +151,10 @@ int DBListViewCTL::selectedRowNear(int row) const
     return nearest;
 }
 
-// No click and no key of a person leaves the list without a highlighted row.
+// No click and no key of a person leaves such a list without a highlighted row.
 void DBListViewCTL::keepOneSelected()
 {
-    if (currentIndex().isValid() && !selectionModel()->hasSelection())
+    if (!mMayBeUnselected && currentIndex().isValid() && !selectionModel()->hasSelection())
         selectionModel()->select(currentIndex(),
                                  QItemSelectionModel::Select | QItemSelectionModel::Rows);
 }

@@ -54,6 +54,10 @@ public:
     bool CheckBoxes() const;
     void setCheckBoxes(bool on); // in the first visible column
 
+    /// Whether a person may leave no row selected. Else the last one stays so, since the commands
+    /// of most screens act on SelectedItem(), and that must be highlighted.
+    void setMayBeUnselected(bool may) { mMayBeUnselected = may; }
+
     /// 1 begins to drag: from the press of a mouse button on, DragOver follows the pointer, and
     /// its release over the list is a DragDrop. 2 ends it; so does Esc, without a drop.
     void Drag(int action);
@@ -64,6 +68,7 @@ public:
 
 signals:
     void ItemClick(ListItem item); // and once more if the button, going up, selects other rows
+    void SelectionCleared();       // a press beside the rows has left none selected
     void ItemCheck(ListItem item); // the user has changed a check mark
     void ColumnClick(int index);   // from 1; by mouse, or Ctrl+1 to 9 for those that show
     void DblClick();
@@ -129,6 +134,7 @@ private:
     ADODB::RecordsetPtr mRecordset;
     bool mSorted = false;
     int mSortKey = 0;
+    bool mMayBeUnselected = false;
     bool mCheckPressed = false;
     bool mSelectionMoved = false; // since the button of the mouse went down
     ListItem mDropHighlight;

@@ -181,6 +181,8 @@ void DBListViewCTL::mousePressEvent(QMouseEvent *event)
     mSelectionMoved = false;
     if (index.isValid())
         emit ItemClick(itemAt(index.row()));
+    else if (!selectionModel()->hasSelection())
+        emit SelectionCleared();
 }
 
 void DBListViewCTL::mouseMoveEvent(QMouseEvent *event)
