@@ -162,6 +162,22 @@ private slots:
         QVERIFY(item(2).Bold() && !list()->isEnabled());
     }
 
+    void buttonsBelowTheListAreEven()
+    {
+        gLanguage = languageDutch;
+        showNew();
+        int widest = 0, needed = 0, narrowest = INT_MAX;
+        for (const QPushButton *button : mEditor->findChildren<QPushButton *>()) {
+            if (button->parentWidget() != mEditor)
+                continue; // beside the folder
+            widest = std::max(widest, button->width());
+            narrowest = std::min(narrowest, button->width());
+            needed = std::max(needed, button->sizeHint().width());
+        }
+        QVERIFY(widest - narrowest <= 1);
+        QVERIFY(narrowest >= needed);
+    }
+
     void aMediumThatGivesNoAnswer()
     {
         store({u"a.mp3"_s});
