@@ -445,7 +445,8 @@ void DBListViewCTL::paintEvent(QPaintEvent *event)
         painter.setBrush(shade);
         painter.drawRect(rowRect(row).adjusted(0, 0, -1, -1));
     }
-    if (hasFocus() && currentIndex().isValid()) {
+    // The frame is filled in some styles: a drag would have two rows that look marked.
+    if (hasFocus() && currentIndex().isValid() && !mDrag->running()) {
         QStyleOptionFocusRect option;
         option.initFrom(this);
         option.rect = rowRect(currentIndex().row());

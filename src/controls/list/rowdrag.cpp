@@ -28,6 +28,7 @@ void RowDrag::begin()
     mRunning = true;
     mInside = false;
     mList->viewport()->setCursor(mCursor);
+    mList->viewport()->update();
     mScroll->start();
 }
 

@@ -445,6 +445,22 @@ private slots:
         QCOMPARE(shown(list), u"11 9 30*< 4 5"_s);
     }
 
+    void aDragMarksTheDropRowAlone()
+    {
+        ShownList list;
+        list.selectionModel()->clearSelection();
+        const auto picture = [&] { return list.viewport()->grab().toImage(); };
+        const QImage withCursor = picture();
+        list.clearFocus();
+        const QImage plain = picture();
+        list.setFocus();
+        QVERIFY(picture() == withCursor && withCursor != plain);
+        list.Drag(1);
+        QVERIFY(picture() == plain);
+        list.Drag(2);
+        QVERIFY(picture() == withCursor);
+    }
+
     void dragEndsWithoutDrop()
     {
         for (const bool byEsc : {false, true}) {
