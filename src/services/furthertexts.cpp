@@ -291,7 +291,7 @@ const Message furtherTexts[] = {
     {"xUndoForgotten", "what stood in it before is no longer known", "de vorige inhoud is niet meer bekend"},
     {"xMP3Collection", "MP3 collection", "MP3-collectie"},
     {"xMP3Files", "MP3 files", "MP3-bestanden"},
-    {"xPreviewNames", "Pre&view", "V&oorbeeld"},
+    {"xPreviewNames", "Pre&view", "Voo&rbeeld"},
     {"xReadingTags", "Reading the tags of the files...", "De tags van de bestanden worden gelezen..."},
     {"xLookingForFolder", "Looking for the folder...", "De map wordt gezocht..."},
     {"xScanning", "Looking for MP3 files...", "Er wordt naar MP3-bestanden gezocht..."},

@@ -3,11 +3,13 @@
 #include "mp3/frmCDRootMP3.h"
 #include "platform/work/longwork.h"
 #include "services/clsRegistry.h"
+#include "services/messages.h"
 #include "support/countingbrowser.h"
 #include "support/madesound.h"
 #include "support/screentest.h"
 
 #include <QDir>
+#include <QKeySequence>
 #include <QLineEdit>
 #include <QPushButton>
 #include <QTimer>
@@ -406,6 +408,25 @@ private slots:
             mEditor, [this] { QVERIFY(!mEditor->Unload()); }, Qt::QueuedConnection);
         press("cmdDelete");
         QCOMPARE(files(), u"1b 2c"_s);
+    }
+
+    // By design others share one. The menu bar is seen with the editor.
+    void thePreviewHasAKeyOfItsOwn()
+    {
+        const auto keyOf = [](const QString &text) { return QKeySequence::mnemonic(text); };
+        const auto keyFor = [&](const char *text, int language) {
+            return keyOf(GetMessage(QLatin1String(text), language));
+        };
+        for (const int language : {languageEnglish, languageDutch}) {
+            QList<QKeySequence> others = {keyOf(u"Inf&o"_s), keyOf(u"&Scan"_s)};
+            for (const char *key :
+                 {"File", "mnuLiedkist", "mnuInstellingen", "mnuTaal", "AddFile", "BrowseFolder",
+                  "CancelMP3collection", "MP3CollectionGereed", "UpdateID3Tag", "TagWizard",
+                  "ImportAsCD", "DeleteMP3FileFromCollection", "RefreshList", "Rename"})
+                others.append(keyFor(key, language));
+            const QKeySequence own = keyFor("xPreviewNames", language);
+            QVERIFY(!own.isEmpty() && !others.contains(own));
+        }
     }
 };
 
