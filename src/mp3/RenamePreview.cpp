@@ -17,13 +17,11 @@ const std::vector<ListColumn> columns = {{ListColumn::Number, "Volgnummer"},
                                          {ListColumn::Text, "xNewName", 8},
                                          {ListColumn::Text, "xRemark", 6}};
 
-bool hasItAlready(const PreviewedName &name)
-{
-    return name.newName.oldPath == name.newName.newPath;
-}
-
 QString remarkOn(const PreviewedName &name)
 {
+    if (name.isFolderClosed)
+        return GetMessage("xRemarkClosed");
+    const bool hasItAlready = name.newName.oldPath == name.newName.newPath;
     switch (name.newName.obstacle) {
     case NameObstacle::TagMissing:
         return GetMessage("xRemarkNoTag");
@@ -38,7 +36,7 @@ QString remarkOn(const PreviewedName &name)
     case NameObstacle::OfAFolder:
         return GetMessage("xRemarkFolder");
     case NameObstacle::IsThere:
-        return GetMessage(hasItAlready(name) ? "xRemarkSame" : "xRemarkIsThere");
+        return GetMessage(hasItAlready ? "xRemarkSame" : "xRemarkIsThere");
     case NameObstacle::FileGone:
         return GetMessage("xRemarkGone");
     case NameObstacle::None:
@@ -48,10 +46,9 @@ QString remarkOn(const PreviewedName &name)
     return {};
 }
 
-// A file that has its name already is no conflict.
-bool isConflict(const PreviewedName &name)
+bool hasRemark(const PreviewedName &name)
 {
-    return !hasItAlready(name) && !remarkOn(name).isEmpty();
+    return !remarkOn(name).isEmpty();
 }
 
 } // namespace
@@ -98,14 +95,20 @@ void RenamePreview::fillList(const std::vector<PreviewedName> &names)
     (new ListColumns(mUi->NameList, columns))->show(rows);
     auto items = mUi->NameList->ListItems();
     for (size_t place = 0; place < names.size(); ++place)
-        items.Item(int(place) + 1).setBold(isConflict(names[place]));
+        items.Item(int(place) + 1).setBold(hasRemark(names[place]));
 }
 
 void RenamePreview::countNames(const std::vector<PreviewedName> &names)
 {
-    const auto conflicts = std::count_if(names.begin(), names.end(), isConflict);
-    mUi->lblCount->setText(names.empty() ? GetMessage("xNoRowsSelected")
-                           : conflicts == 0
-                               ? GetMessage("xNoConflicts")
-                               : GetMessage("xConflicts") + QString::number(conflicts));
+    const auto remarks = std::count_if(names.begin(), names.end(), hasRemark);
+    const auto closed = std::count_if(names.begin(), names.end(),
+                                      [](const auto &name) { return name.isFolderClosed; });
+    QString text = GetMessage(names.empty()  ? "xNoRowsSelected"
+                              : remarks == 0 ? "xNoConflicts"
+                                             : "xConflicts");
+    if (remarks > 0)
+        text += QString::number(remarks);
+    if (closed > 0)
+        text += u'\n' + GetMessage("xClosedFolder") + QString::number(closed);
+    mUi->lblCount->setText(text);
 }

@@ -12,9 +12,10 @@ class RenamePreview;
 
 /// A row whose file is to be renamed.
 struct PreviewedName {
-    int row;
+    int row = 0;
     QString oldName;
     NewName newName;
+    bool isFolderClosed = false; // the file cannot have another name
 };
 
 /// Shows which names files are to get, before anything is touched; what will not go by itself

@@ -9,6 +9,8 @@
 #include "tags/filechanges.h"
 #include "tags/tagerrors.h"
 
+#include <algorithm>
+
 using namespace Qt::StringLiterals;
 
 namespace
@@ -29,11 +31,13 @@ public:
     {
     }
 
-    void rename(const CollectionRow &row);
+    bool rename(const CollectionRow &row); // false: another row has its name
+    void tell(const CollectionRow &row) const { mayTake(row, mPlan.nameFor(row)); }
     bool isStopped() const { return mIsStopped || mScreen.isUnloaded(); }
 
 private:
     bool mayTake(const CollectionRow &row, const NewName &name) const;
+    void take(const CollectionRow &row, const NewName &name);
     bool move(const NewName &name);
 
     Form &mScreen;
@@ -43,11 +47,18 @@ private:
     bool mIsStopped = false;
 };
 
-void Renaming::rename(const CollectionRow &row)
+bool Renaming::rename(const CollectionRow &row)
 {
     const NewName name = mPlan.nameFor(row);
-    if (!mayTake(row, name) || mScreen.isUnloaded())
-        return;
+    if (name.obstacle == NameObstacle::OfAnotherRow)
+        return false;
+    if (mayTake(row, name) && !mScreen.isUnloaded())
+        take(row, name);
+    return true;
+}
+
+void Renaming::take(const CollectionRow &row, const NewName &name)
+{
     const Hourglass hourglass(&mScreen);
     if (name.obstacle != NameObstacle::MovedAlready && !move(name))
         return;
@@ -75,7 +86,7 @@ bool Renaming::mayTake(const CollectionRow &row, const NewName &name) const
         return tell(GetMessage("xNameTooLong"));
     case NameObstacle::OfAnotherRow:
         return tell(GetMessage("xNameOfRowPart1") + QString::number(name.otherRow) +
-                    GetMessage("xNameOfRowPart2"));
+                    GetMessage("xNameOfRowPart2") + row[CollectionField::FileName]);
     case NameObstacle::OfAFolder:
         return tell(GetMessage("xNameOfFolder"));
     case NameObstacle::IsThere: // its own name counts too
@@ -106,6 +117,32 @@ bool Renaming::move(const NewName &name)
     return true;
 }
 
+// Tries one row after the other. Those that are refused, since another row has their name, are
+// tried again, the last first, for as long as that helps: the other one may get another name later.
+// Gives what is left.
+std::vector<size_t> tryInTurn(size_t rows, const std::function<bool(size_t row)> &attempt)
+{
+    std::vector<size_t> left;
+    for (size_t row = 0; row < rows; ++row) {
+        if (!attempt(row))
+            left.insert(left.begin(), row);
+    }
+    while (std::erase_if(left, attempt) > 0) {
+    }
+    return {left.rbegin(), left.rend()};
+}
+
+// Every question is taken to be answered with Yes.
+PreviewedName previewOf(const CollectionRow &row, RenamingPlan &plan)
+{
+    const NewName name = plan.nameFor(row);
+    const bool goes = name.obstacle == NameObstacle::None || name.obstacle >= NameObstacle::IsThere;
+    const bool isClosed = goes && plan.isFolderClosed(name);
+    if (goes && !isClosed)
+        plan.pretend(row, name);
+    return {row.index, row[CollectionField::FileName], name, isClosed};
+}
+
 } // namespace
 
 void renameFiles(Form &screen, const QString &folder, const std::vector<CollectionRow> &rows,
@@ -115,11 +152,17 @@ void renameFiles(Form &screen, const QString &folder, const std::vector<Collecti
         return;
     LongWork work(screen, GetMessage("xRenaming"));
     Renaming renaming(screen, {folder, collection}, renamed);
-    for (size_t done = 0; done < rows.size() && !renaming.isStopped();) {
-        renaming.rename(rows[done]);
-        if (!work.step(qint64(++done), qint64(rows.size())))
-            return;
-    }
+    const auto isOver = [&] { return renaming.isStopped() || work.isCancelled(); };
+    const qint64 all = qint64(rows.size());
+    qint64 done = 0;
+    const auto left = tryInTurn(rows.size(), [&](size_t row) {
+        const bool settled = isOver() || renaming.rename(rows[row]);
+        if (!isOver())
+            work.step(std::min(++done, all), all);
+        return settled;
+    });
+    for (size_t row = 0; row < left.size() && !isOver(); ++row)
+        renaming.tell(rows[left[row]]);
 }
 
 void previewRenaming(Form &screen, const QString &folder, const std::vector<CollectionRow> &rows,
@@ -127,18 +170,21 @@ void previewRenaming(Form &screen, const QString &folder, const std::vector<Coll
 {
     if (!LongWork::mayBegin(screen))
         return;
-    std::vector<PreviewedName> names;
+    std::vector<PreviewedName> names(rows.size());
     {
         LongWork work(screen, GetMessage("xLookingAtNames"));
         RenamingPlan plan(folder, collection);
-        for (const CollectionRow &row : rows) {
-            const NewName name = plan.nameFor(row);
-            names.push_back({row.index, row[CollectionField::FileName], name});
-            if (name.obstacle == NameObstacle::None || name.obstacle >= NameObstacle::IsThere)
-                plan.pretend(row, name);
-            if (!work.step(qint64(names.size()), qint64(rows.size())))
-                return;
-        }
+        const qint64 all = qint64(rows.size());
+        qint64 done = 0;
+        tryInTurn(rows.size(), [&](size_t row) {
+            if (work.isCancelled())
+                return true;
+            names[row] = previewOf(rows[row], plan);
+            work.step(std::min(++done, all), all);
+            return names[row].newName.obstacle != NameObstacle::OfAnotherRow;
+        });
+        if (work.isCancelled())
+            return;
     }
     (new RenamePreview(names))->ShowModal();
 }

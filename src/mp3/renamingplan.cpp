@@ -8,7 +8,9 @@
 
 #include <QDir>
 #include <cerrno>
+#include <fcntl.h>
 #include <sys/stat.h>
+#include <unistd.h>
 
 using namespace Qt::StringLiterals;
 
@@ -156,6 +158,14 @@ bool RenamingPlan::isThere(const QString &path) const
     return !mPretendedFree.contains(path) && (isNameTaken(path) || FileExists(path));
 }
 
+bool RenamingPlan::isFolderClosed(const NewName &name)
+{
+    const QByteArray folder = nativeName(name.oldPath.first(endOfFolder(name.oldPath)));
+    return name.oldPath != name.newPath &&
+           faccessat(AT_FDCWD, folder.constData(), W_OK, AT_EACCESS) != 0 &&
+           (errno == EACCES || errno == EROFS);
+}
+
 void RenamingPlan::take(const CollectionRow &row, const NewName &name)
 {
     const QString before = QDir::cleanPath(name.oldPath), now = QDir::cleanPath(name.newPath);
@@ -172,5 +182,6 @@ void RenamingPlan::pretend(const CollectionRow &row, const NewName &name)
 {
     take(row, name);
     mPretendedFree.remove(name.newPath);
-    mPretendedFree.insert(name.oldPath);
+    if (!isSameFile(name.oldPath, name.newPath)) // it stays there then
+        mPretendedFree.insert(name.oldPath);
 }

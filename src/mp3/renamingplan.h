@@ -43,6 +43,9 @@ public:
     QString folder() const { return mFolder; }
     NewName nameFor(const CollectionRow &row) const;
 
+    /// Whether its folder is write-protected, so that the file cannot have another name.
+    static bool isFolderClosed(const NewName &name);
+
     /// The row has this name from now on.
     void take(const CollectionRow &row, const NewName &name);
 

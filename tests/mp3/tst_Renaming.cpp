@@ -1,9 +1,11 @@
 // Label: screen
 #include "controls/list/DBListViewCTL.h"
 #include "mp3/renaming.h"
+#include "support/ordinaryuser.h"
 #include "support/rowstest.h"
 
 #include <QDir>
+#include <QLabel>
 #include <QPushButton>
 #include <QStorageInfo>
 #include <unistd.h>
@@ -47,7 +49,7 @@ private:
     }
 
     // "new name: remark" of each row, "! " before what stands bold.
-    QStringList preview(const std::vector<CollectionRow> &rows)
+    QStringList preview(const std::vector<CollectionRow> &rows, QString *heading = nullptr)
     {
         QStringList lines;
         mDesktop->expectModal(u"RenamePreview"_s, [&](Form &screen) {
@@ -55,6 +57,8 @@ private:
             for (int i = 1; i <= items.Count(); ++i)
                 lines.append((items.Item(i).Bold() ? u"! "_s : QString()) +
                              items.Item(i).SubItems(2) + u": "_s + items.Item(i).SubItems(3));
+            if (heading)
+                *heading = screen.findChild<QLabel *>(u"lblCount"_s)->text();
             screen.findChild<QPushButton *>(u"cmdClose"_s)->click();
         });
         previewRenaming(*mScreen, folder(), rows, rows);
@@ -95,12 +99,17 @@ private slots:
             texts(
                 "yes-no [Songcase] 01-A-B.mp3: A file with the same name already exists! Would=Yes"),
             texts("01-A-B.mp3"));
-        row("of another row", "x.mp3|A|B|1\n01-A-B.mp3|C|D|2",
-            texts("error [Songcase] 01-A-B.mp3: This is the name of the file in row 2 of the list"),
-            texts("x.mp3", "02-C-D.mp3"));
-        row("of a row before", "y.mp3|A|B|1\nx.mp3|A|B|1",
-            texts("error [Songcase] 01-A-B.mp3: This is the name of the file in row 1 of the list"),
-            texts("01-A-B.mp3", "x.mp3"));
+        row("of a row before", "y.mp3|A|B|1\nx.mp3|A|B|1\nz.mp3||B|1",
+            texts("error [Songcase] Unable to rename file z.mp3",
+                  "error [Songcase] 01-A-B.mp3: This is the name of the file in row 1 of the list, "
+                  "so this file keeps its own name: x.mp3"),
+            texts("01-A-B.mp3", "x.mp3", "z.mp3"));
+        row("that a later row leaves", "02-C-D.mp3|E|F|3\nx.mp3|C|D|2\n03-E-F.mp3|G|H|4", none,
+            texts("03-E-F.mp3", "02-C-D.mp3", "04-G-H.mp3"));
+        row("two that want each other's", "01-A-B.mp3|C|D|2\n02-C-D.mp3|A|B|1",
+            texts("02-C-D.mp3: This is the name of the file in row 2",
+                  "01-A-B.mp3: This is the name of the file in row 1"),
+            texts("01-A-B.mp3", "02-C-D.mp3"));
         row("that a row before leaves", "01-A-B.mp3|C|D|2\nx.mp3|A|B|1", none,
             texts("02-C-D.mp3", "01-A-B.mp3"));
         row("one file twice in the list", "x.mp3|A|B|1\nx.mp3|A|B|1", none,
@@ -191,15 +200,30 @@ private slots:
     void previewed()
     {
         const auto rows = rowsOf(u"a.mp3|A|B|1\nb.mp3|A|B|1\nc.mp3|A||\n02-C-D.mp3|C|D|2\n"
-                                 "e.mp3|E|F|3\n03-E-F.mp3|G|H|4\ngone.mp3|I|J|5"_s);
+                                 "02-C-D.mp3|C|D|2\ne.mp3|E|F|3\n03-E-F.mp3|G|H|4\n"
+                                 "gone.mp3|I|J|5\nclosed/k.mp3|K|L|6"_s);
         makeFiles(rows);
         QVERIFY(QFile::remove(folder() + u"/gone.mp3"_s));
+        for (const QString &open : {mCatalogue->path(""), folder()})
+            QVERIFY(QFile::setPermissions(open, QFile::Permissions(0x7777)));
+        const QString closed = folder() + u"/closed"_s;
+        QVERIFY(QFile::setPermissions(closed, QFile::ReadUser | QFile::ExeUser | QFile::ReadOther |
+                                                  QFile::ExeOther));
         const QStringList before = QDir(folder()).entryList(QDir::Files);
-        QCOMPARE(preview(rows),
-                 texts("01-A-B.mp3: ", "! 01-A-B.mp3: Name of the file in row 1",
-                       "! : No artist or no title in the tag", "02-C-D.mp3: Has this name already",
-                       "! 03-E-F.mp3: Name of the file in row 6",
-                       "04-G-H.mp3: ", "! 05-I-J.mp3: The file is not found"));
+        QString heading;
+        {
+            const OrdinaryUser user;
+            QCOMPARE(preview(rows, &heading),
+                     texts("01-A-B.mp3: ", "! 01-A-B.mp3: Name of the file in row 1",
+                           "! : No artist or no title in the tag",
+                           "! 02-C-D.mp3: Has this name already; you will be asked",
+                           "! 02-C-D.mp3: Has this name already; you will be asked",
+                           "03-E-F.mp3: ", "04-G-H.mp3: ", "! 05-I-J.mp3: The file is not found",
+                           "! closed/06-K-L.mp3: Not possible: the folder is write-protected"));
+        }
+        QVERIFY(heading.contains(u"in bold: 6\nFiles that cannot be renamed"_s));
+        QVERIFY(heading.endsWith(u": 1"_s));
+        QVERIFY(QFile::setPermissions(closed, QFile::Permissions(0x7777)));
         QCOMPARE(QDir(folder()).entryList(QDir::Files), before);
     }
 };
