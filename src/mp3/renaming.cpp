@@ -7,6 +7,7 @@
 #include "platform/work/longwork.h"
 #include "services/messages.h"
 #include "tags/filechanges.h"
+#include "tags/movedfile.h"
 #include "tags/tagerrors.h"
 
 #include <algorithm>
@@ -37,8 +38,9 @@ public:
 
 private:
     bool mayTake(const CollectionRow &row, const NewName &name) const;
-    void take(const CollectionRow &row, const NewName &name);
-    bool move(const NewName &name);
+    using Over = std::optional<FileStamp>; // a file that the user has been asked about
+    void take(const CollectionRow &row, const NewName &name, const Over &over);
+    bool move(const NewName &name, const Over &over);
 
     Form &mScreen;
     RenamingPlan mPlan;
@@ -52,15 +54,16 @@ bool Renaming::rename(const CollectionRow &row)
     const NewName name = mPlan.nameFor(row);
     if (name.obstacle == NameObstacle::OfAnotherRow)
         return false;
+    const Over over = name.obstacle == NameObstacle::IsThere ? findName(name.newPath) : Over();
     if (mayTake(row, name) && !mScreen.isUnloaded())
-        take(row, name);
+        take(row, name, over);
     return true;
 }
 
-void Renaming::take(const CollectionRow &row, const NewName &name)
+void Renaming::take(const CollectionRow &row, const NewName &name, const Over &over)
 {
     const Hourglass hourglass(&mScreen);
-    if (name.obstacle != NameObstacle::MovedAlready && !move(name))
+    if (name.obstacle != NameObstacle::MovedAlready && !move(name, over))
         return;
     mPlan.take(row, name);
     mRenamed(row, name.name);
@@ -101,18 +104,22 @@ bool Renaming::mayTake(const CollectionRow &row, const NewName &name) const
 
 // By design: a move that fails says nothing, and the row takes the new name; it shows as missing
 // when the list is read again. A name that the disk cannot have is told, and leaves the row; so is
-// that the move could not be taken back, which ends all.
-bool Renaming::move(const NewName &name)
+// one that another file keeps, and that the move could not be taken back, which ends all.
+bool Renaming::move(const NewName &name, const Over &over)
 {
     try {
-        mChanges.move(name.oldPath, name.newPath);
+        mChanges.move(name.oldPath, name.newPath, over);
     } catch (const Error &error) {
         mIsStopped = error.Number == errChangeNotKept;
+        const bool isRefused = error.Number == errNameRefused;
         if (mIsStopped)
             errorBox(error.Description);
-        else if (error.Number == errNameRefused)
-            errorBox(name.name + u": "_s + GetMessage("xNameLetterRefused"));
-        return !mIsStopped && error.Number != errNameRefused;
+        else if (isRefused || error.Number == errNotReplaced)
+            errorBox(name.name + u": "_s +
+                     (isRefused ? GetMessage("xNameLetterRefused") : error.Description));
+        else
+            return true;
+        return false;
     }
     return true;
 }

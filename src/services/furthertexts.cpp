@@ -248,6 +248,8 @@ const Message furtherTexts[] = {
     {"xNameOfRowPart1", "This is the name of the file in row ", "Dit is de naam van het bestand op regel "},
     {"xNameOfRowPart2", " of the list, so this file keeps its own name: ", " van de lijst. Dit bestand houdt daarom zijn eigen naam: "},
     {"xNameOfFolder", "There is a folder with this name. The file keeps its name.", "Er is al een map met deze naam. Het bestand houdt zijn naam."},
+    {"xNameTakenNow", "Another file has this name meanwhile. Both files stay as they are.", "Een ander bestand heeft intussen deze naam. Beide bestanden blijven zoals ze zijn."},
+    {"xNotIntoWastebasket", "The file that has this name cannot be moved to the wastebasket. Both files stay as they are.", "Het bestand met deze naam kan niet naar de prullenbak worden verplaatst. Beide bestanden blijven zoals ze zijn."},
     {"xRenamePreviewCaption", "Preview of the new names", "Voorbeeld van de nieuwe namen"},
     {"xOldName", "Name now", "Naam nu"},
     {"xNewName", "New name", "Nieuwe naam"},

@@ -79,9 +79,13 @@ void ChangeUndo::takeBackMove(FileChanges &changes, const FileJournal::Entry &en
         leave("xUndoGone");
     if (!stampOfName(name).isSameFile(stamp))
         leave("xUndoChanged");
-    if (isNameTaken(entry.change.path) && !stampOfName(entry.change.path).isSameFile(stamp))
-        leave("xUndoNameTaken");
-    changes.move(name, entry.change.path);
+    try {
+        changes.move(name, entry.change.path);
+    } catch (const Error &error) {
+        if (error.Number == errNotReplaced)
+            leave("xUndoNameTaken");
+        throw;
+    }
 }
 
 void ChangeUndo::takeBackHead(FileChanges &changes, const FileJournal::Entry &entry)

@@ -256,7 +256,7 @@ void FileChanges::replaceHead(const QString &path, const FileStamp &stamp, const
     perform(change, file);
 }
 
-void FileChanges::move(const QString &from, const QString &to)
+void FileChanges::move(const QString &from, const QString &to, const std::optional<FileStamp> &over)
 {
     FileChange change;
     change.way = FileChange::Way::Move;
@@ -274,7 +274,7 @@ void FileChanges::move(const QString &from, const QString &to)
         throw Error(errChangeNotKept, error.Source, error.Description);
     }
     try {
-        moveFile(from, to);
+        moveFile(from, to, over);
     } catch (const Error &) {
         if (mJournal.mendOne(change.id, true) != Mended::New)
             throw;

@@ -30,9 +30,8 @@ public:
     /// as it is. Throws Error: errTagNotAccessible, errTagDamaged, errTagTooLong, errTagNotWritten.
     void saveTag(const CddbID3Tag &tag, const QString &path);
 
-    /// Gives a file another name, and what has that name to the desktop's wastebasket where there
-    /// is one. Throws Error (errFileNotMoved, errNameRefused, errChangeNotKept).
-    void move(const QString &from, const QString &to);
+    /// Gives a file another name; as moveFile(), and throws errChangeNotKept too.
+    void move(const QString &from, const QString &to, const std::optional<FileStamp> &over = {});
 
     /// Gives a file another beginning, `before` being what it began with when it was as `stamp`
     /// says.

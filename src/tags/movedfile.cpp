@@ -2,16 +2,13 @@
 
 #include "platform/error/error.h"
 #include "platform/files/nativename.h"
+#include "platform/files/wastebasket.h"
 #include "platform/files/wholefile.h"
 #include "tags/tagerrors.h"
 
-#include <QDir>
-#include <QFile>
 #include <QFileInfo>
-#include <QStandardPaths>
 #include <cerrno>
 #include <cstdio>
-#include <fcntl.h>
 #include <sys/stat.h>
 
 using namespace Qt::StringLiterals;
@@ -40,64 +37,65 @@ void syncNames(const QString &from, const QString &to)
         syncFolder(QFileInfo(from).path());
 }
 
-bool find(const QString &path, struct stat &about)
+[[noreturn]] void notReplaced(const char *key)
 {
-    return ::lstat(nativeName(path).constData(), &about) == 0;
+    throw Error(errNotReplaced, u"Files"_s, errorText(key, {}));
 }
 
-// Where the desktop has no wastebasket the toolkit would take the current folder for it. So the
-// one of the user has to be there first; on another disk it may still use one of that disk.
-bool hasWastebasket()
+// Its name in the wastebasket.
+QString putAway(const QString &path, const FileStamp &wanted)
 {
-    const QString data = QStandardPaths::writableLocation(QStandardPaths::GenericDataLocation);
-    const QString wastebasket = data + u"/Trash"_s;
-    if (!QFileInfo::exists(wastebasket) && QDir().mkpath(data) && QDir().mkdir(wastebasket))
-        QFile::setPermissions(wastebasket, QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner);
-    return !data.isEmpty() && QFileInfo(wastebasket).isDir();
+    QString there = wastebasket::take(path);
+    if (there.isEmpty())
+        notReplaced("xNotIntoWastebasket");
+    if (!stampOfName(there).isSameFile(wanted)) { // came in this moment
+        wastebasket::giveBack(there, path);
+        notReplaced("xNameTakenNow");
+    }
+    return there;
 }
 
 } // namespace
 
-bool isNameTaken(const QString &path)
+std::optional<FileStamp> findName(const QString &path)
 {
     struct stat about = {};
-    return find(path, about);
+    if (::lstat(nativeName(path).constData(), &about) != 0)
+        return {};
+    return FileStamp{about.st_dev, about.st_ino, about.st_size, 0, 0};
+}
+
+bool isNameTaken(const QString &path)
+{
+    return findName(path).has_value();
 }
 
 FileStamp stampOfName(const QString &path)
 {
-    struct stat about = {};
-    if (!find(path, about))
+    const auto stamp = findName(path);
+    if (!stamp)
         notMoved(path, errno);
-    return {about.st_dev, about.st_ino, about.st_size, 0, 0};
+    return *stamp;
 }
 
-void moveFile(const QString &from, const QString &to)
+void moveFile(const QString &from, const QString &to, const std::optional<FileStamp> &over)
 {
-    const FileStamp moved = stampOfName(from);
-    QString inWastebasket;
-    if (isNameTaken(to) && !stampOfName(to).isSameFile(moved) && hasWastebasket())
-        QFile::moveToTrash(to, &inWastebasket);
-    if (!rename(from, to)) {
+    const auto there = findName(to);
+    // By a link, or on a disk that makes no difference between cases.
+    const bool isItself = stampOfName(from).isSameFile(there.value_or(FileStamp()));
+    const bool replaces = there && !isItself;
+    if (replaces && !(over && over->isSameFile(*there)))
+        notReplaced("xNameTakenNow");
+    const QString away = replaces && wastebasket::exists() ? putAway(to, *there) : QString();
+    const bool isFree = !there || !away.isEmpty();
+    if (!(isFree ? renameWhereFree(from, to) : rename(from, to))) {
         const int error = errno;
-        if (!inWastebasket.isEmpty() && !isNameTaken(to))
-            rename(inWastebasket, to);
+        if (!away.isEmpty())
+            wastebasket::giveBack(away, to);
+        if (isFree && error == EEXIST)
+            notReplaced("xNameTakenNow");
         notMoved(from, error);
     }
-    syncNames(from, to);
-}
-
-void moveBack(const QString &from, const QString &to)
-{
-    const QByteArray one = nativeName(from), other = nativeName(to);
-    const int result =
-        ::renameat2(AT_FDCWD, one.constData(), AT_FDCWD, other.constData(), RENAME_NOREPLACE);
-    // Not every disk knows how to look and rename in one.
-    const bool isUnknown = result != 0 && (errno == EINVAL || errno == ENOSYS);
-    if (isUnknown && isNameTaken(to))
-        notMoved(to, EEXIST);
-    if (result != 0 && !(isUnknown && rename(from, to)))
-        notMoved(from, errno);
     syncNames(from, to);
 }
 

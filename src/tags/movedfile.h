@@ -2,17 +2,18 @@
 
 #include "tags/headchange.h"
 
-/// Gives a file another name, and what has that name to the desktop's wastebasket where there is
-/// one; where there is none it goes. The name is on the disk then. Throws Error (errFileNotMoved,
-/// errNameRefused) with everything as it was.
-void moveFile(const QString &from, const QString &to);
-
-/// The same, but only while nothing has the new name.
-void moveBack(const QString &from, const QString &to);
+/// Gives a file another name, and what has that name to the desktop's wastebasket; where the
+/// desktop has none it goes. That is done to the file `over` alone, which the user has looked at:
+/// without it the name has to be free. A second name of the file itself is free. The name is on the
+/// disk then. Throws Error (errFileNotMoved, errNameRefused, errNotReplaced) with everything as it
+/// was.
+void moveFile(const QString &from, const QString &to, const std::optional<FileStamp> &over);
 
 /// Whether a move that was begun has happened.
 Mended mendMove(const FileChange &change);
 
-/// Of the name itself, be it a link; throws Error where there is nothing.
+/// Of the name itself, be it a link. Where there is nothing the one gives nothing, the other throws
+/// Error (errFileNotMoved).
+std::optional<FileStamp> findName(const QString &path);
 FileStamp stampOfName(const QString &path);
 bool isNameTaken(const QString &path);

@@ -11,6 +11,7 @@ enum TagError : int {
     errFileNotMoved = int(0x82FC1004),
     errNameRefused = int(0x82FC1005),   // not moved: the disk cannot have such a name
     errChangeNotKept = int(0x82FC1006), // not done: the journal cannot be written
+    errNotReplaced = int(0x82FC1007),   // not moved: another file has the name, and keeps it
 };
 
 /// The text of a key of the message table, the name of the file behind it.

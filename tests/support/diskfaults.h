@@ -8,9 +8,11 @@
 #include <cstdlib>
 #include <dlfcn.h>
 #include <fcntl.h>
+#include <functional>
 #include <string>
 #include <sys/stat.h>
 #include <unistd.h>
+#include <utility>
 
 /// Makes one call to the disk fail, whichever part of the program or of its libraries makes it:
 /// the test program's own write(), fsync(), rename() and so on stand before those of the system. To
@@ -48,6 +50,13 @@ struct State {
     int failing = 0, calls = 0;
 };
 State *gState = nullptr;
+std::function<void()> gAtRename; // called once, before the next file gets another name
+
+void beforeRename()
+{
+    if (gAtRename)
+        std::exchange(gAtRename, nullptr)();
+}
 
 bool concerns(const char *path)
 {
@@ -197,6 +206,7 @@ int fdatasync(int handle)
 int rename(const char *from, const char *to) noexcept
 {
     static const auto system = next(&::rename, "rename");
+    beforeRename();
     return fails(to, false) ? -1 : system(from, to);
 }
 
@@ -204,6 +214,7 @@ int renameat2(int fromFolder, const char *from, int toFolder, const char *to,
               unsigned flags) noexcept
 {
     static const auto system = next(&::renameat2, "renameat2");
+    beforeRename();
     return fails(to, false) ? -1 : system(fromFolder, from, toFolder, to, flags);
 }
 

@@ -1,10 +1,12 @@
 // Label: unit
 #include "platform/error/error.h"
+#include "platform/files/nativename.h"
 #include "support/datarows.h"
 #include "support/diskfaults.h"
 #include "support/madetag.h"
 #include "support/testcatalogue.h"
 #include "tags/filechanges.h"
+#include "tags/movedfile.h"
 #include "tags/tagerrors.h"
 
 #include <QTemporaryDir>
@@ -68,6 +70,7 @@ private slots:
     void init()
     {
         mFolder = std::make_unique<QTemporaryDir>();
+        qputenv("XDG_DATA_HOME", path(u"data"_s).toUtf8()); // wastebasket
         reopen();
     }
 
@@ -385,19 +388,12 @@ private slots:
         QCOMPARE(readFile(path(u"a"_s)), before);
     }
 
-    void aMoveReplacesThroughTheWastebasket()
+    void aMoveThatFails()
     {
         make(u"a"_s);
-        writeFile(path(u"b"_s), "other");
-        QVERIFY(QDir(mFolder->path()).mkdir(u"data"_s));
-        qputenv("XDG_DATA_HOME", path(u"data"_s).toUtf8());
-        FileChanges(*mJournal, {}).move(path(u"a"_s), path(u"b"_s));
-        QCOMPARE(readFile(path(u"b"_s)), before);
-        QVERIFY(!QFile::exists(path(u"a"_s)));
-        QCOMPARE(readFile(path(u"data/Trash/files/b"_s)), "other");
         // A second name of the same file is no other file.
-        QCOMPARE(::link(path(u"b"_s).toUtf8().constData(), path(u"c"_s).toUtf8().constData()), 0);
-        FileChanges(*mJournal, {}).move(path(u"b"_s), path(u"c"_s));
+        link(u"a"_s, u"c"_s);
+        FileChanges(*mJournal, {}).move(path(u"a"_s), path(u"c"_s));
         QCOMPARE(readFile(path(u"c"_s)), before);
         const QString tooLong = path(QString(300, u'x'));
         QCOMPARE(numberOf([&] { FileChanges(*mJournal, {}).move(path(u"c"_s), tooLong); }),
@@ -409,7 +405,8 @@ private slots:
     void everyCallThatFails_data()
     {
         const DataRows<QString, int> row("what", "kind");
-        for (const QString &what : {u"in place"_s, u"beside"_s, u"through"_s, u"move"_s}) {
+        for (const QString &what :
+             {u"in place"_s, u"beside"_s, u"through"_s, u"move"_s, u"move over"_s}) {
             row(qPrintable(what + u", full"_s), what, int(diskfaults::Kind::Full));
             row(qPrintable(what + u", broken"_s), what, int(diskfaults::Kind::Broken));
             row(qPrintable(what + u", killed"_s), what, int(diskfaults::Kind::Killed));
@@ -420,11 +417,11 @@ private slots:
     {
         QFETCH(QString, what);
         QFETCH(int, kind);
-        const bool isMove = what == "move"_L1;
+        const bool isOver = what == "move over"_L1, isMove = isOver || what == "move"_L1;
         const QString text(what == "in place"_L1 ? 800 : 2000, u'n');
         const auto change = [&] {
             if (isMove)
-                FileChanges(*mJournal, {}).move(path(u"a"_s), path(u"b"_s));
+                FileChanges(*mJournal, {}).move(path(u"a"_s), path(u"b"_s), findName(path(u"b"_s)));
             else
                 save(u"a"_s, text);
         };
@@ -435,6 +432,8 @@ private slots:
             make(u"a"_s);
             if (what == "through"_L1)
                 link(u"a"_s, u"link"_s);
+            if (isOver)
+                writeFile(path(u"b"_s), "other");
             bool failed = false;
             if (diskfaults::Kind(kind) == diskfaults::Kind::Killed) {
                 came = killedIn(change, calls + 1);
@@ -455,6 +454,9 @@ private slots:
             // What was begun through a copy is completed.
             QVERIFY2(!failed || isOld || what == "through"_L1, qPrintable(QString::number(calls)));
             QVERIFY2(came || !isOld, "nothing failed");
+            QVERIFY2(!isOver || readFile(path(u"b"_s)) == "other" ||
+                         (!failed && isInWastebasket(path(u"b"_s))),
+                     qPrintable(QString::number(calls)));
             if (isOld || isMove)
                 QCOMPARE(readFile(path(name)), before);
             else
@@ -470,7 +472,72 @@ private slots:
         QVERIFY2(calls > 5, qPrintable(QString::number(calls)));
     }
 
+    // The other file ends in the wastebasket, if there is one, or stays.
+    void whatAMoveReplaces_data()
+    {
+        const DataRows<QByteArray, QString, int> row("folder", "inTheWay", "number");
+        row("wastebasket", "Muse", "", 0);
+        row("a folder that is no UTF-8", "Mus\xE9 %", "", 0);
+        row("twice the same name", "Muse", "data/Trash/files/b", 0);
+        row("a wastebasket that takes nothing", "Muse", "data/Trash/info", int(errNotReplaced));
+        row("no wastebasket", "Muse", "data/Trash", 0);
+        row("not what was looked at", "Muse", "b", int(errNotReplaced));
+    }
+
+    void whatAMoveReplaces()
+    {
+        QFETCH(QByteArray, folder);
+        QFETCH(QString, inTheWay);
+        QFETCH(int, number);
+        const QString in = path(nameOfNative(folder)), a = in + u"/a"_s, b = in + u"/b"_s;
+        const auto isIn = [](const QString &name, const QByteArray &content) {
+            return SystemFile(name, SystemFile::Mode::Read).read(0, before.size() + 1) == content;
+        };
+        QCOMPARE(::mkdir(nativeName(in).constData(), 0700), 0);
+        SystemFile(a, SystemFile::Mode::Create).write(0, before);
+        SystemFile(b, SystemFile::Mode::Create).write(0, "other");
+        if (inTheWay.startsWith("data"_L1) && QDir().mkpath(QFileInfo(path(inTheWay)).path()))
+            writeFile(path(inTheWay), "x");
+        const auto over = findName(inTheWay == "b"_L1 ? a : b);
+        QCOMPARE(numberOf([&] { FileChanges(*mJournal, {}).move(a, b, over); }), number);
+        QVERIFY(isIn(number == 0 ? b : a, before));
+        QVERIFY(inTheWay == "data/Trash"_L1 ||
+                (number == 0 ? isInWastebasket(b) : isIn(b, "other")));
+    }
+
+    // Between the look and the move.
+    void aFileThatAppears()
+    {
+        const auto appears = [&](const QString &name) {
+            diskfaults::gAtRename = [=, this] { writeFile(path(name), "other"); };
+        };
+        make(u"a"_s);
+        appears(u"b"_s);
+        QCOMPARE(numberOf([&] { FileChanges(*mJournal, {}).move(path(u"a"_s), path(u"b"_s)); }),
+                 int(errNotReplaced));
+        QCOMPARE(readFile(path(u"b"_s)), "other");
+        QVERIFY(QFile::remove(path(u"b"_s)));
+        FileChanges(*mJournal, {}).move(path(u"a"_s), path(u"b"_s));
+        appears(u"a"_s);
+        QCOMPARE(undoLast().left.size(), 1);
+        QCOMPARE(readFile(path(u"a"_s)), "other");
+        QCOMPARE(readFile(path(u"b"_s)), before);
+    }
+
 private:
+    // The file of this name that held "other".
+    bool isInWastebasket(const QString &was) const
+    {
+        const QString trash = path(u"data/Trash/"_s);
+        const QByteArray origin = "\nPath=" + nativeName(was) + '\n';
+        const auto files = QDir(trash + u"files"_s).entryList(QDir::Files);
+        return std::ranges::any_of(files, [&](const QString &name) {
+            const QByteArray info = readFile(trash + u"info/"_s + name + u".trashinfo"_s);
+            return readFile(trash + u"files/"_s + name) == "other" &&
+                   QByteArray::fromPercentEncoding(info).contains(origin);
+        });
+    }
+
     // In a process of its own, which ends at that call; false: it came through.
     bool killedIn(const std::function<void()> &change, int call)
     {
