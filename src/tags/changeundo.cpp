@@ -77,7 +77,7 @@ void ChangeUndo::takeBackMove(FileChanges &changes, const FileJournal::Entry &en
     const auto [name, stamp] = now(entry.change.other, entry);
     if (!isNameTaken(name))
         leave("xUndoGone");
-    if (!stampOfName(name).isSameFile(stamp))
+    if (!isStill(name, stamp))
         leave("xUndoChanged");
     try {
         changes.move(name, entry.change.path);

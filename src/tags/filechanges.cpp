@@ -281,4 +281,5 @@ void FileChanges::move(const QString &from, const QString &to, const std::option
         return;
     }
     mJournal.done(change.id, stampOfName(to));
+    mJournal.tellDone(); // the file itself tells less of it than one with another tag
 }

@@ -62,7 +62,17 @@ std::optional<FileStamp> findName(const QString &path)
     struct stat about = {};
     if (::lstat(nativeName(path).constData(), &about) != 0)
         return {};
-    return FileStamp{about.st_dev, about.st_ino, about.st_size, 0, 0};
+    const qint64 modified = qint64(about.st_mtim.tv_sec) * 1'000'000'000 + about.st_mtim.tv_nsec;
+    return FileStamp{about.st_dev, about.st_ino, about.st_size, modified, 0};
+}
+
+bool isStill(const QString &path, const FileStamp &stamp)
+{
+    const auto now = findName(path);
+    if (!now || now->isSameFile(stamp))
+        return now.has_value();
+    const bool isAsOld = stamp.modified != 0 && now->modified == stamp.modified;
+    return now->size == stamp.size && (now->inode == stamp.inode || isAsOld);
 }
 
 bool isNameTaken(const QString &path)
@@ -99,14 +109,18 @@ void moveFile(const QString &from, const QString &to, const std::optional<FileSt
     syncNames(from, to);
 }
 
+// Where neither is there the medium may not be: the folder is then another one, or none.
 Mended mendMove(const FileChange &change)
 {
-    const auto isIt = [&](const QString &path) {
-        return isNameTaken(path) && stampOfName(path).isSameFile(change.before);
-    };
-    if (isIt(change.path)) // under both names by a link it is where it was
+    if (isStill(change.path, change.before)) // under both names by a link it is where it was
         return Mended::Old;
-    if (isIt(change.other))
+    if (isStill(change.other, change.before))
         return Mended::New;
-    return isNameTaken(QFileInfo(change.path).path()) ? Mended::Foreign : Mended::NotNow;
+    try {
+        const bool isSameDisk =
+            stampOf(QFileInfo(change.path).path()).device == change.before.device;
+        return isSameDisk ? Mended::Foreign : Mended::NotNow;
+    } catch (const Error &) {
+        return Mended::NotNow;
+    }
 }

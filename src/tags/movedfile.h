@@ -17,3 +17,7 @@ Mended mendMove(const FileChange &change);
 std::optional<FileStamp> findName(const QString &path);
 FileStamp stampOfName(const QString &path);
 bool isNameTaken(const QString &path);
+
+/// Whether a name has the file of a stamp still. Its medium may have come back with another number
+/// of its own, or of the file.
+bool isStill(const QString &path, const FileStamp &stamp);

@@ -126,6 +126,22 @@ private slots:
         QCOMPARE(readFile(path(u"a"_s)), before);
     }
 
+    // As it is to the system, when its medium was taken out and came back.
+    void undoFindsAFileWithAnotherNumber()
+    {
+        make(u"a"_s);
+        FileChanges(*mJournal, {}).move(path(u"a"_s), path(u"b"_s));
+        QFile copy(path(u"c"_s));
+        QVERIFY(QFile::copy(path(u"b"_s), copy.fileName()) && copy.open(QIODevice::ReadWrite));
+        struct stat about = {};
+        QCOMPARE(::stat(path(u"b"_s).toUtf8().constData(), &about), 0);
+        const timespec times[] = {about.st_atim, about.st_mtim};
+        QCOMPARE(::futimens(copy.handle(), times), 0);
+        QVERIFY(QFile::remove(path(u"b"_s)) && copy.rename(path(u"b"_s)));
+        QCOMPARE(undoLast().files, 1);
+        QVERIFY(QFile::exists(path(u"a"_s)));
+    }
+
     void whatChangedSinceIsLeft_data()
     {
         const DataRows<bool, QString> row("renamed", "since");
