@@ -1,7 +1,7 @@
 #include "mp3/RenamePreview.h"
 
 #include "controls/list/DBListViewCTL.h"
-#include "controls/list/listcolumns.h"
+#include "controls/list/fittedcolumns.h"
 #include "mp3/ui_RenamePreview.h"
 #include "services/captions.h"
 #include "services/frame.h"
@@ -13,9 +13,9 @@ namespace
 {
 
 const std::vector<ListColumn> columns = {{ListColumn::Number, "Volgnummer"},
-                                         {ListColumn::Text, "xOldName", 5},
-                                         {ListColumn::Text, "xNewName", 8},
-                                         {ListColumn::Text, "xRemark", 6}};
+                                         {ListColumn::Text, "xOldName", 1},
+                                         {ListColumn::Text, "xNewName", 1},
+                                         {ListColumn::Text, "xRemark"}};
 
 QString remarkOn(const PreviewedName &name)
 {
@@ -57,6 +57,7 @@ RenamePreview::RenamePreview(const std::vector<PreviewedName> &names)
     : Form(u"RenamePreview"_s), mUi(std::make_unique<Ui::RenamePreview>())
 {
     mUi->setupUi(this);
+    mColumns = new FittedColumns(mUi->NameList, columns);
     setDefaultButton(mUi->cmdClose);
     setCancelButton(mUi->cmdClose);
     applyCaptions(this, {{"RenamePreview", "xRenamePreviewCaption"}, {"cmdClose", "xClose"}});
@@ -70,6 +71,7 @@ RenamePreview::~RenamePreview() = default;
 
 void RenamePreview::Form_Load()
 {
+    mColumns->widen(this);
     placeInFrame(this, 0.1, 0.1);
 }
 
@@ -92,10 +94,11 @@ void RenamePreview::fillList(const std::vector<PreviewedName> &names)
         rows->Fields(2).setValue(hasName ? name.newName.name : QString());
         rows->Fields(3).setValue(remarkOn(name));
     }
-    (new ListColumns(mUi->NameList, columns))->show(rows);
+    mColumns->show(rows);
     auto items = mUi->NameList->ListItems();
     for (size_t place = 0; place < names.size(); ++place)
         items.Item(int(place) + 1).setBold(hasRemark(names[place]));
+    mColumns->fit();
 }
 
 void RenamePreview::countNames(const std::vector<PreviewedName> &names)

@@ -5,6 +5,7 @@
 
 #include <memory>
 
+class FittedColumns;
 namespace Ui
 {
 class RenamePreview;
@@ -37,4 +38,5 @@ private:
     void countNames(const std::vector<PreviewedName> &names);
 
     std::unique_ptr<Ui::RenamePreview> mUi;
+    FittedColumns *mColumns;
 };

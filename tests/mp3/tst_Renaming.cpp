@@ -52,7 +52,11 @@ private:
     {
         QStringList lines;
         mDesktop->expectModal(u"RenamePreview"_s, [&](Form &screen) {
-            auto items = screen.findChild<DBListViewCTL *>()->ListItems();
+            auto *list = screen.findChild<DBListViewCTL *>();
+            const QAbstractItemView *view = list;
+            for (int column = 0; column < 4; ++column)
+                QVERIFY(list->columnWidth(column) >= view->sizeHintForColumn(column));
+            auto items = list->ListItems();
             for (int i = 1; i <= items.Count(); ++i)
                 lines.append((items.Item(i).Bold() ? u"! "_s : QString()) +
                              items.Item(i).SubItems(2) + u": "_s + items.Item(i).SubItems(3));
