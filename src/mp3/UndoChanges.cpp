@@ -1,7 +1,7 @@
 #include "mp3/UndoChanges.h"
 
 #include "controls/list/DBListViewCTL.h"
-#include "controls/list/listcolumns.h"
+#include "controls/list/fittedcolumns.h"
 #include "discdata/changedfiles.h"
 #include "mp3/followednames.h"
 #include "mp3/ui_UndoChanges.h"
@@ -12,6 +12,7 @@
 #include "services/globals.h"
 #include "services/messages.h"
 
+#include <QFileInfo>
 #include <QLocale>
 #include <QScopedValueRollback>
 #include <QSet>
@@ -21,15 +22,33 @@ using namespace Qt::StringLiterals;
 namespace
 {
 
-const std::vector<ListColumn> columns = {
-    {ListColumn::Hidden},           {ListColumn::Text, "xWhen", 5},
-    {ListColumn::Text, "xWhat", 5}, {ListColumn::Text, "xFolder", 8},
-    {ListColumn::Number, "xFiles"}, {ListColumn::Text, "xRemark", 4}};
+const std::vector<ListColumn> columns = {{ListColumn::Hidden},
+                                         {ListColumn::Text, "xWhen"},
+                                         {ListColumn::Text, "xWhat"},
+                                         {ListColumn::Text, "xFolder", 1},
+                                         {ListColumn::Text, "xFiles", 1},
+                                         {ListColumn::Text, "xRemark"}};
 
 QString shown(const QDateTime &when)
 {
     const QLocale locale(gLanguage == languageDutch ? QLocale::Dutch : QLocale::English);
     return locale.toString(when, u"d MMM yyyy, HH:mm"_s);
+}
+
+QString filesShown(const FileJournal::Batch &batch)
+{
+    const QString first = QFileInfo(batch.first).fileName();
+    return batch.files < 2 ? first : first + GetMessage("xAndMore").arg(batch.files - 1);
+}
+
+// "path: path: why" comes from a reason that names its file itself.
+QString namedOnce(const QString &left)
+{
+    for (auto end = left.indexOf(u": "_s); end >= 0; end = left.indexOf(u": "_s, end + 1)) {
+        if (left.sliced(end + 2).startsWith(left.first(end + 2)))
+            return left.sliced(end + 2);
+    }
+    return left;
 }
 
 // What takes an undo back does it again.
@@ -54,7 +73,7 @@ int filesOf(const std::vector<FileJournal::Batch> &batches)
 UndoChanges::UndoChanges() : Form(u"UndoChanges"_s), mUi(std::make_unique<Ui::UndoChanges>())
 {
     mUi->setupUi(this);
-    mColumns = new ListColumns(mUi->ChangeList, columns);
+    mColumns = new FittedColumns(mUi->ChangeList, columns);
     setDefaultButton(mUi->cmdUndo);
     setCancelButton(mUi->cmdClose);
     setTexts();
@@ -80,8 +99,9 @@ void UndoChanges::setTexts()
 
 void UndoChanges::Form_Load()
 {
-    placeInFrame(this, 0.15, 0.1);
     showBatches();
+    mColumns->widen(this);
+    placeInFrame(this, 0.15, 0.1);
 }
 
 void UndoChanges::Form_Activate()
@@ -113,7 +133,7 @@ void UndoChanges::showBatches()
                                  shown(batch.when),
                                  batch.what,
                                  batch.where,
-                                 QString::number(batch.files),
+                                 filesShown(batch),
                                  batch.isTakenBack ? GetMessage("xTakenBack") : QString()};
         rows->AddNew();
         for (int column = 0; const QString &cell : cells)
@@ -193,7 +213,8 @@ FileJournal::Undone UndoChanges::undoAll(const Batches &batches, LongWork &work)
                 batch.number, Desktop::current().now(), undoOf(batch.what),
                 [&](int done, int /*all*/) { return work.step(before + done, files); });
             all.files += one.files;
-            all.left += one.left;
+            for (const QString &left : one.left)
+                all.left.append(namedOnce(left));
             all.moved.insert(all.moved.end(), one.moved.begin(), one.moved.end());
         } catch (const Error &error) {
             all.left.append(batch.what + u": "_s + error.Description);

@@ -5,7 +5,7 @@
 
 #include <memory>
 
-class ListColumns;
+class FittedColumns;
 class LongWork;
 namespace Ui
 {
@@ -42,6 +42,6 @@ private:
     void tell(const FileJournal::Undone &undone);
 
     std::unique_ptr<Ui::UndoChanges> mUi;
-    ListColumns *mColumns;
+    FittedColumns *mColumns;
     LongWork *mUndo = nullptr; // that runs
 };

@@ -276,6 +276,7 @@ const Message furtherTexts[] = {
     {"xWhat", "What", "Wat"},
     {"xFolder", "Folder", "Map"},
     {"xFiles", "Files", "Bestanden"},
+    {"xAndMore", " and %1 more", " en nog %1"},
     {"xTakenBack", "taken back", "ongedaan gemaakt"},
     {"xUndo", "&Undo", "&Ongedaan maken"},
     {"xUndoOf", "Undo: ", "Ongedaan maken: "},

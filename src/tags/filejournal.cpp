@@ -145,12 +145,16 @@ std::vector<FileJournal::Batch> FileJournal::batches() const
 {
     const Read read = readAll();
     std::map<qint64, int> files;
-    for (const auto &[id, entry] : read.entries)
+    std::map<qint64, QString> first;
+    for (const auto &[id, entry] : read.entries) {
         files[entry.change.batch] += entry.isDone ? 1 : 0;
+        if (entry.isDone)
+            first.try_emplace(entry.change.batch, entry.change.path);
+    }
     std::vector<Batch> all;
     for (auto each = read.batches.rbegin(); each != read.batches.rend(); ++each) {
         if (files[each->number] > 0)
-            all.push_back({*each, files[each->number]});
+            all.push_back({*each, files[each->number], first[each->number]});
     }
     // The newest first: one that was taken back itself takes nothing back.
     for (auto batch = all.begin(); batch != all.end(); ++batch) {

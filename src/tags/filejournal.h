@@ -18,6 +18,7 @@ public:
 
     struct Batch : ChangeBatch {
         int files = 0;            // that were changed
+        QString first;            // path of the one that was changed first, as it was then
         bool isTakenBack = false; // by a later one that was not taken back itself
     };
     std::vector<Batch> batches() const; // newest first

@@ -5,6 +5,7 @@
 #include "support/screentest.h"
 #include "tags/filechanges.h"
 
+#include <QDir>
 #include <QPlainTextEdit>
 #include <QPushButton>
 
@@ -68,7 +69,8 @@ private slots:
                          "insert into MP3Collections values (1,'"_s +
                          QFileInfo(path(u"c.mp3"_s)).path() + u"','All')"_s);
         show();
-        QCOMPARE(lines(), texts("23 Nov 2026, 12:00|c.mp3|1|", "22 Nov 2026, 12:00|b.mp3|1|"));
+        QCOMPARE(lines(),
+                 texts("23 Nov 2026, 12:00|c.mp3|b.mp3|", "22 Nov 2026, 12:00|b.mp3|a.mp3|"));
         list()->selectAll();
         mDesktop->expectBox(u"yes-no [Songcase] Do you want to take back what was changed? "
                             "Number of files: 2"_s,
@@ -79,10 +81,10 @@ private slots:
         QCOMPARE(mCatalogue->rows("select FileName from MP3Files order by ID"),
                  texts("a.mp3", "x.mp3"));
         QVERIFY(gTagsChanged);
-        QCOMPARE(lines(),
-                 texts("23 Nov 2026, 12:00|Undo: b.mp3|1|", "23 Nov 2026, 12:00|Undo: c.mp3|1|",
-                       "23 Nov 2026, 12:00|c.mp3|1|taken back",
-                       "22 Nov 2026, 12:00|b.mp3|1|taken back"));
+        QCOMPARE(lines(), texts("23 Nov 2026, 12:00|Undo: b.mp3|b.mp3|",
+                                "23 Nov 2026, 12:00|Undo: c.mp3|c.mp3|",
+                                "23 Nov 2026, 12:00|c.mp3|b.mp3|taken back",
+                                "22 Nov 2026, 12:00|b.mp3|a.mp3|taken back"));
     }
 
     void whatIsLeftIsTold()
@@ -96,6 +98,33 @@ private slots:
         QVERIFY(control<QPlainTextEdit>(u"txtLeft"_s)->toPlainText().contains(u".mp3: "_s));
         QCOMPARE(readFile(path(u"a.mp3"_s)), "another");
         QCOMPARE(readFile(path(u"b.mp3"_s)), "a");
+    }
+
+    // The reason of a failed move names its file by itself.
+    void whatIsLeftIsNamedOnce()
+    {
+        QVERIFY(QDir().mkpath(path(u"sub"_s)));
+        writeFile(path(u"sub/a.mp3"_s), "a");
+        change({u"sub/a.mp3"_s, u"b.mp3"_s});
+        QVERIFY(QDir().rmdir(path(u"sub"_s)));
+        show();
+        mDesktop->expectBox(u"Do you want"_s, vbYes);
+        mDesktop->expectBox(u"left as they are: 1"_s);
+        press(u"cmdUndo"_s);
+        const QString left = control<QPlainTextEdit>(u"txtLeft"_s)->toPlainText();
+        QVERIFY(left.startsWith(path(u"b.mp3"_s) + u": "_s));
+        QCOMPARE(left.count(u"b.mp3"_s), 1);
+    }
+
+    // As long as the texts of Dutch; the folder's column has room for all.
+    void linesAreShownWhole()
+    {
+        change({u"a.mp3"_s, u"b.mp3"_s, u"c.mp3"_s, u"Ongedaan maken: Bestanden hernoemen"_s});
+        show();
+        QCOMPARE(list()->ListItems().Item(1).SubItems(4), u"a.mp3 and 2 more"_s);
+        const QAbstractItemView *view = list();
+        for (int column = 1; column <= 5; ++column)
+            QVERIFY(list()->columnWidth(column) >= view->sizeHintForColumn(column));
     }
 
     void noneIsChosenOrWanted()
