@@ -145,7 +145,9 @@ PreviewedName previewOf(const CollectionRow &row, RenamingPlan &plan)
     const NewName name = plan.nameFor(row);
     const bool goes = name.obstacle == NameObstacle::None || name.obstacle >= NameObstacle::IsThere;
     const bool isClosed = goes && plan.isFolderClosed(name);
-    if (goes && !isClosed)
+    if (isClosed)
+        plan.take(row, name); // as the row does, whatever becomes of the file
+    else if (goes)
         plan.pretend(row, name);
     return {row.index, row[CollectionField::FileName], name, isClosed};
 }

@@ -217,7 +217,7 @@ private slots:
     {
         const auto rows = rowsOf(u"a.mp3|A|B|1\nb.mp3|A|B|1\nc.mp3|A||\n02-C-D.mp3|C|D|2\n"
                                  "02-C-D.mp3|C|D|2\ne.mp3|E|F|3\n03-E-F.mp3|G|H|4\n"
-                                 "gone.mp3|I|J|5\nclosed/k.mp3|K|L|6"_s);
+                                 "gone.mp3|I|J|5\nclosed/k.mp3|K|L|6\nclosed/l.mp3|K|L|6"_s);
         makeFiles(rows);
         QVERIFY(QFile::remove(folder() + u"/gone.mp3"_s));
         for (const QString &open : {mCatalogue->path(""), folder()})
@@ -235,9 +235,10 @@ private slots:
                            "! 02-C-D.mp3: Has this name already; you will be asked",
                            "! 02-C-D.mp3: Has this name already; you will be asked",
                            "03-E-F.mp3: ", "04-G-H.mp3: ", "! 05-I-J.mp3: The file is not found",
-                           "! closed/06-K-L.mp3: Not possible: the folder is write-protected"));
+                           "! closed/06-K-L.mp3: Not possible: the folder is write-protected",
+                           "! closed/06-K-L.mp3: Name of the file in row 9"));
         }
-        QVERIFY(heading.contains(u"in bold: 6\nFiles that cannot be renamed"_s));
+        QVERIFY(heading.contains(u"in bold: 7\nFiles that cannot be renamed"_s));
         QVERIFY(heading.endsWith(u": 1"_s));
         QVERIFY(QFile::setPermissions(closed, QFile::Permissions(0x7777)));
         QCOMPARE(QDir(folder()).entryList(QDir::Files), before);
