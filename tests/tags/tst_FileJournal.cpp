@@ -491,19 +491,24 @@ private slots:
     // The other file ends in the wastebasket, if there is one, or stays.
     void whatAMoveReplaces_data()
     {
-        const DataRows<QByteArray, QString, int> row("folder", "inTheWay", "number");
-        row("wastebasket", "Muse", "", 0);
-        row("a folder that is no UTF-8", "Mus\xE9 %", "", 0);
-        row("twice the same name", "Muse", "data/Trash/files/b", 0);
-        row("a wastebasket that takes nothing", "Muse", "data/Trash/info", int(errNotReplaced));
-        row("no wastebasket", "Muse", "data/Trash", 0);
-        row("not what was looked at", "Muse", "b", int(errNotReplaced));
+        const DataRows<QByteArray, QString, bool, int> row("folder", "inTheWay", "isLink",
+                                                           "number");
+        row("wastebasket", "Muse", "", false, 0);
+        row("a folder that is no UTF-8", "Mus\xE9 %", "", false, 0);
+        row("thirty times the same name", "Muse", "data/Trash/files/b", false, 0);
+        row("a wastebasket that takes nothing", "Muse", "data/Trash/info", false,
+            int(errNotReplaced));
+        row("a wastebasket that is away", "Muse", "data/Trash", true, int(errNotReplaced));
+        row("data that is away", "Muse", "data", true, int(errNotReplaced));
+        row("no wastebasket", "Muse", "data", false, 0);
+        row("not what was looked at", "Muse", "b", false, int(errNotReplaced));
     }
 
     void whatAMoveReplaces()
     {
         QFETCH(QByteArray, folder);
         QFETCH(QString, inTheWay);
+        QFETCH(bool, isLink);
         QFETCH(int, number);
         const QString in = path(nameOfNative(folder)), a = in + u"/a"_s, b = in + u"/b"_s;
         const auto isIn = [](const QString &name, const QByteArray &content) {
@@ -513,11 +518,14 @@ private slots:
         SystemFile(a, SystemFile::Mode::Create).write(0, before);
         SystemFile(b, SystemFile::Mode::Create).write(0, "other");
         if (inTheWay.startsWith("data"_L1) && QDir().mkpath(QFileInfo(path(inTheWay)).path()))
-            writeFile(path(inTheWay), "x");
+            QVERIFY(isLink ? QFile::link(u"away"_s, path(inTheWay))
+                           : !writeFile(path(inTheWay), "x").isEmpty());
+        for (int n = 2; inTheWay.endsWith("files/b"_L1) && n <= 30; ++n)
+            writeFile(path(u"data/Trash/files/%1-b"_s.arg(n)), "x");
         const auto over = findName(inTheWay == "b"_L1 ? a : b);
         QCOMPARE(numberOf([&] { FileChanges(*mJournal, {}).move(a, b, over); }), number);
         QVERIFY(isIn(number == 0 ? b : a, before));
-        QVERIFY(inTheWay == "data/Trash"_L1 ||
+        QVERIFY((inTheWay == "data"_L1 && !isLink) ||
                 (number == 0 ? isInWastebasket(b) : isIn(b, "other")));
     }
 

@@ -3,15 +3,16 @@
 #include "platform/error/error.h"
 #include "platform/files/nativename.h"
 #include "platform/files/systemfile.h"
+#include "platform/files/wholefile.h"
 
 #include <QDateTime>
 #include <QDir>
 #include <QFileInfo>
+#include <QRandomGenerator>
 #include <QStandardPaths>
 #include <cerrno>
 #include <cstdio>
 #include <fcntl.h>
-#include <filesystem>
 #include <optional>
 #include <sys/stat.h>
 #include <unistd.h>
@@ -22,10 +23,21 @@ namespace
 {
 
 constexpr qsizetype longestName = 200; // bytes; more is added to it
+constexpr quint32 mostInARow = 20;     // names that are tried one after the other
 
-bool makeFolder(const QString &path)
+void makeFolder(const QString &path)
 {
-    return ::mkdir(nativeName(path).constData(), 0700) == 0;
+    if (::mkdir(nativeName(path).constData(), 0700) == 0)
+        syncFolder(QFileInfo(path).path());
+}
+
+void makeFolders(const QString &path)
+{
+    const QString above = QFileInfo(path).path();
+    if (QFileInfo(path).isDir() || above == path)
+        return;
+    makeFolders(above);
+    makeFolder(path);
 }
 
 std::optional<struct stat> find(const QString &path)
@@ -80,8 +92,10 @@ QString freeNameIn(const QString &folder, const QString &path)
     const QByteArray name = nativeName(QFileInfo(path).fileName()).right(longestName);
     const QString files = folder + u"/files/"_s;
     QString there = files + nameOfNative(name);
-    for (int n = 2; find(there) || find(originOf(there)); ++n)
-        there = files + nameOfNative(QByteArray::number(n) + '-' + name);
+    for (quint32 n = 2; find(there) || find(originOf(there)); ++n) {
+        const quint32 number = n <= mostInARow ? n : QRandomGenerator::global()->generate();
+        there = files + nameOfNative(QByteArray::number(number) + '-' + name);
+    }
     return there;
 }
 
@@ -99,6 +113,7 @@ bool writeOrigin(const QString &there, const QString &origin)
         isMade = true;
         file.write(0, "[Trash Info]\nPath=" + nativeName(origin).toPercentEncoding("/") +
                           "\nDeletionDate=" + now.toLatin1() + '\n');
+        file.sync();
     } catch (const Error &) {
         if (isMade)
             forgetOrigin(there);
@@ -114,26 +129,27 @@ QString takeInto(const QString &folder, const QString &path, const QString &orig
     QString there = freeNameIn(folder, path);
     if (!writeOrigin(there, origin))
         return {};
-    if (renameWhereFree(path, there))
-        return there;
-    forgetOrigin(there);
-    return {};
+    if (!renameWhereFree(path, there)) {
+        forgetOrigin(there);
+        return {};
+    }
+    // A disk that cannot sync has taken the file all the same.
+    syncFolder(folder + u"/files"_s);
+    syncFolder(folder + u"/info"_s);
+    return there;
 }
 
 } // namespace
 
-// A disk that has no room for the folder is no desktop without a wastebasket.
+// A folder that cannot be made or entered now may be on a disk that is full, away or read-only.
+// Only where a file stands in place of a folder above it can there be none.
 bool wastebasket::exists()
 {
     const QString folder = ownFolder();
-    if (folder.isEmpty() || QFileInfo(folder).isDir())
-        return !folder.isEmpty();
-    std::error_code failure;
-    std::filesystem::create_directories(nativeName(QFileInfo(folder).path()).toStdString(),
-                                        failure);
-    const int error = failure ? failure.value() : makeFolder(folder) ? 0 : errno;
-    return error == 0 || error == ENOSPC || error == EDQUOT || error == EIO ||
-           QFileInfo(folder).isDir();
+    makeFolders(folder);
+    struct stat about = {};
+    return !folder.isEmpty() &&
+           (::lstat(nativeName(folder).constData(), &about) == 0 || errno != ENOTDIR);
 }
 
 // Not by the toolkit: it knows no names that are no UTF-8, and tries without an end where the disk

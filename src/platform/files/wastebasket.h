@@ -7,7 +7,8 @@
 namespace wastebasket
 {
 
-/// Whether the user has one; the first call may begin it.
+/// Whether the user has one; the first call may begin it. One that is only away, full or locked
+/// counts: take() refuses then, and nothing is lost.
 bool exists();
 
 /// The name that the file has there. Empty: no wastebasket can take it, it is where it was.
