@@ -93,11 +93,16 @@ void FileChanges::tell(HeadChange &head, const SystemFile &file)
     if (change.way == FileChange::Way::Beside)
         change.other = QFileInfo(change.path).path() + "/.songcase-"_L1 +
                        mJournal.copyName().section(u'-', -2) + ".tmp"_L1;
-    if (change.way == FileChange::Way::Through) {
+    if (change.way == FileChange::Way::Through)
         change.other = mJournal.copyName();
+    try {
         prepareHead(head, file);
+        mJournal.announce(change, head.kept());
+    } catch (const Error &) {
+        if (change.way == FileChange::Way::Through)
+            QFile::remove(change.other);
+        throw;
     }
-    mJournal.announce(change, head.kept());
 }
 
 void FileChanges::announce(const Tags &tags)
@@ -184,8 +189,7 @@ void FileChanges::requireUntouched(const FileChange &change)
     if (stampOfOrdinaryFile(change.path) == change.before)
         return;
     mJournal.drop(change.id);
-    if (change.way == FileChange::Way::Through)
-        QFile::remove(change.other);
+    mJournal.removeCopy(change);
     notAccessible(change.path);
 }
 
@@ -207,8 +211,7 @@ void FileChanges::performOrMend(const HeadChange &head, SystemFile &file)
         return;
     }
     mJournal.done(change.id, *after);
-    if (change.way == FileChange::Way::Through)
-        QFile::remove(change.other);
+    mJournal.removeCopy(change);
 }
 
 void FileChanges::perform(const HeadChange &head, SystemFile &file)

@@ -5,6 +5,7 @@
 #include "tags/changeundo.h"
 #include "tags/headchange.h"
 #include "tags/movedfile.h"
+#include "tags/tagerrors.h"
 
 #include <QDir>
 #include <QFileInfo>
@@ -26,6 +27,7 @@ enum class Word : quint8 {
 };
 
 constexpr int toldAtOnce = 100;
+constexpr qint64 unknownNumbers = qint64(1) << 32; // more than a part has
 
 template <typename... Values> QByteArray words(Word word, const Values &...values)
 {
@@ -53,8 +55,7 @@ void FileJournal::take(Read &into, const QByteArray &entry, const JournalStore::
         ChangeBatch batch;
         in >> batch;
         // It is told again where a part begins.
-        if (std::none_of(into.batches.rbegin(), into.batches.rend(),
-                         [&](const ChangeBatch &b) { return b.number == batch.number; }))
+        if (into.numbers.insert(batch.number).second)
             into.batches.push_back(batch);
         break;
     }
@@ -86,44 +87,57 @@ void FileJournal::take(Read &into, const QByteArray &entry, const JournalStore::
 // locks there is none.
 void FileJournal::requireOwn()
 {
-    if (mIsLocked)
-        return;
     const QString name = mStore.folder() + "/lock"_L1;
-    const auto outcome = mLock.takeWithin(name, 0);
-    if (outcome == FileLock::Outcome::Held)
+    if (mLock.isOf(name))
+        return;
+    mLock = FileLock(); // of a folder that has gone
+    if (mLock.takeWithin(name, 0) == FileLock::Outcome::Held)
         throw makeError(errFileFailed, name);
-    mIsLocked = outcome == FileLock::Outcome::Taken;
 }
 
 // The last part alone is read: what is not done is told again where a part begins. Unless that was
-// cut off.
+// cut off, or is damaged.
 void FileJournal::open()
 {
     if (mIsOpen)
         return;
     Read read;
-    bool isWhole = false;
+    bool hasNumbers = false;
     const auto take = [&](const QByteArray &entry, const JournalStore::Place &place) {
         QDataStream in(entry);
         in.setVersion(QDataStream::Qt_6_0);
         quint8 word = 0;
+        qint64 id = 0, batch = 0;
         in >> word;
         if (Word(word) == Word::Numbers) {
-            in >> mLastId >> mLastBatch;
-            isWhole = true;
+            in >> id >> batch;
+            hasNumbers = true;
         }
         FileJournal::take(read, entry, place);
-        if (!read.entries.empty())
-            mLastId = std::max(mLastId, read.entries.rbegin()->first);
+        if (!read.entries.empty()) {
+            const FileChange &last = read.entries.rbegin()->second.change;
+            id = std::max(id, last.id);
+            batch = std::max(batch, last.batch);
+        }
+        mLastId = std::max(mLastId, id);
+        mLastBatch = std::max(mLastBatch, batch);
     };
-    mStore.openLast(take);
-    const bool allRead = isWhole || mStore.readAll(take);
-    for (const ChangeBatch &batch : read.batches)
-        mLastBatch = std::max(mLastBatch, batch.number);
+    const bool isLastWhole = mStore.openLast(take);
+    mIsReadWhole = (hasNumbers && isLastWhole) || mStore.readAll(take);
+    if (!read.numbers.empty())
+        mLastBatch = std::max(mLastBatch, *read.numbers.rbegin());
+    if (!mIsReadWhole) { // nobody knows which were given
+        mLastId += unknownNumbers;
+        mLastBatch += unknownNumbers;
+    }
     std::erase_if(read.entries, [](const auto &entry) { return entry.second.isDone; });
     mPending = std::move(read.entries);
+    for (auto &[id, entry] : mPending) { // the folder may have had another name
+        if (entry.change.way == FileChange::Way::Through)
+            entry.change.other = mStore.folder() + u'/' + QFileInfo(entry.change.other).fileName();
+    }
     mIsOpen = true;
-    if (allRead)
+    if (mIsReadWhole)
         removeForgottenCopies();
 }
 
@@ -156,10 +170,14 @@ std::vector<FileJournal::Batch> FileJournal::batches() const
         if (files[each->number] > 0)
             all.push_back({*each, files[each->number], first[each->number]});
     }
+    std::map<qint64, Batch *> byNumber;
+    for (Batch &batch : all)
+        byNumber[batch.number] = &batch;
     // The newest first: one that was taken back itself takes nothing back.
-    for (auto batch = all.begin(); batch != all.end(); ++batch) {
-        for (auto other = batch; !batch->isTakenBack && other != all.end(); ++other)
-            other->isTakenBack |= batch->undoes != 0 && other->number == batch->undoes;
+    for (const Batch &batch : all) {
+        const auto undone = byNumber.find(batch.undoes);
+        if (!batch.isTakenBack && undone != byNumber.end())
+            undone->second->isTakenBack = true;
     }
     return all;
 }
@@ -199,7 +217,8 @@ void FileJournal::beginPart()
     for (const auto &[id, bytes] : kept)
         mPending[id].place = mStore.append(words(Word::Change, mPending[id].change), bytes);
     writeDone();
-    mStore.append(words(Word::Numbers, mLastId, mLastBatch));
+    if (mIsReadWhole)
+        mStore.append(words(Word::Numbers, mLastId, mLastBatch));
     mStore.sync();
     mStore.begun();
 }
@@ -211,8 +230,8 @@ qint64 FileJournal::beginBatch(ChangeBatch batch)
     makeRoom();
     requireOwn(); // the folder may be new
     batch.number = ++mLastBatch;
-    mBegun[batch.number] = batch;
     mStore.append(words(Word::Batch, batch));
+    mBegun[batch.number] = batch;
     return batch.number;
 }
 
@@ -225,15 +244,20 @@ void FileJournal::endBatch(qint64 number)
 }
 
 // What follows a change of the same file says that it has happened: the journal must tell it first.
+// One that could not be put right yet stands in the way.
 void FileJournal::announce(FileChange &change, const QByteArray &kept)
 {
-    const auto isOfSameFile = [&](const Entry &entry) {
-        return entry.after.isSameFile(change.before) || entry.change.path == change.path ||
-               entry.change.other == change.path;
-    };
-    if (std::any_of(mPending.begin(), mPending.end(), [&](const auto &entry) {
-            return entry.second.isDone && isOfSameFile(entry.second);
-        }))
+    bool isDone = false;
+    for (const auto &[id, entry] : mPending) {
+        const bool isOfSameFile = entry.after.isSameFile(change.before) ||
+                                  entry.change.before.isSameFile(change.before) ||
+                                  entry.change.path == change.path ||
+                                  entry.change.other == change.path;
+        isDone = isDone || (isOfSameFile && entry.isDone);
+        if (isOfSameFile && !entry.isDone && !entry.isLive)
+            throw tagError(errTagNotAccessible, "xTagNotAccessible", change.path);
+    }
+    if (isDone)
         tellDone();
     makeRoom();
     change.id = ++mLastId;
@@ -249,9 +273,11 @@ bool FileJournal::holds(qint64 id) const
 
 void FileJournal::done(qint64 id, const FileStamp &after)
 {
-    Entry &entry = mPending[id];
-    entry.isDone = true;
-    entry.after = after;
+    const auto found = mPending.find(id);
+    if (found == mPending.end())
+        return;
+    found->second.isDone = true;
+    found->second.after = after;
     if (++mUntold >= toldAtOnce)
         tellDone();
 }
@@ -307,8 +333,11 @@ QString FileJournal::copyName()
 
 Mended FileJournal::mendOne(qint64 id, bool back)
 {
-    const FileChange change = mPending[id].change;
-    const auto kept = mStore.bytes(mPending[id].place);
+    const auto found = mPending.find(id);
+    if (found == mPending.end())
+        return Mended::NotNow;
+    const FileChange change = found->second.change;
+    const auto kept = mStore.bytes(found->second.place);
     if (change.way == FileChange::Way::InPlace && !kept) {
         drop(id); // was not synced, so nothing was begun
         return Mended::Old;
@@ -329,7 +358,25 @@ Mended FileJournal::mendOne(qint64 id, bool back)
         leave(id);
         break;
     }
+    if (end != Mended::NotNow)
+        removeCopy(change);
     return end;
+}
+
+// Not before the disk knows that it is not needed any more: it can be the only place with all of
+// the sound.
+void FileJournal::removeCopy(const FileChange &change)
+{
+    if (change.way != FileChange::Way::Through)
+        return;
+    tellDone();
+    if (mPending.contains(change.id))
+        return;
+    try {
+        mStore.sync();
+        QFile::remove(change.other);
+    } catch (const Error &) { // at the next start
+    }
 }
 
 // A program that ended had made them, and not told the journal yet.
@@ -370,6 +417,7 @@ void FileJournal::mend()
 FileJournal::Undone FileJournal::undo(qint64 batch, const QDateTime &when, const QString &what,
                                       const std::function<bool(int done, int all)> &step)
 {
+    mend();
     const Read read = readAll();
     ChangeUndo undo(*this, read.entries, batch);
     const auto found = std::find_if(read.batches.begin(), read.batches.end(),

@@ -6,6 +6,7 @@
 
 #include <functional>
 #include <map>
+#include <set>
 #include <vector>
 
 /// What the program has changed in files of the user, kept in a folder of its own from before a
@@ -53,7 +54,8 @@ private:
     using Entries = std::map<qint64, Entry>; // by id
     struct Read {
         std::vector<ChangeBatch> batches;
-        Entries entries; // those that were dropped left out
+        std::set<qint64> numbers; // of those
+        Entries entries;          // those that were dropped left out
     };
 
     void open();
@@ -72,6 +74,7 @@ private:
     void leave(qint64 id); // to the next mend()
     Mended mendOne(qint64 id, bool back);
     void removeForgottenCopies() const;
+    void removeCopy(const FileChange &change);
     QString copyName(); // of a Through
     void makeRoom();
     void beginPart();
@@ -84,5 +87,5 @@ private:
     int mUntold = 0;
     std::map<qint64, ChangeBatch> mBegun; // by number
     qint64 mLastId = 0, mLastBatch = 0;
-    bool mIsOpen = false, mIsLocked = false;
+    bool mIsOpen = false, mIsReadWhole = false;
 };

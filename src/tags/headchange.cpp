@@ -122,6 +122,7 @@ void through(const FileChange &change, SystemFile &file)
         file.resize(copy.size());
     for (qint64 at = 0; at < copy.size(); at += piece)
         file.write(at, copy.read(at, piece));
+    file.sync(); // before what it had behind that goes
     file.resize(copy.size());
     file.sync();
 }
@@ -235,23 +236,40 @@ Progress progressOf(const SystemFile &file, const SystemFile &copy, const FileCh
     return progress;
 }
 
-// The copy is the only place where the sound stands for sure, until all of the file was compared.
+// Whether the file has all of the sound somewhere that it can be: behind the old head or the new
+// one, or as its end, perhaps before an old tag that was put behind it.
+bool hasSound(const SystemFile &file, const SystemFile &copy, const FileChange &change)
+{
+    constexpr qint64 endTag = 128;
+    const qint64 sound = change.before.size - change.oldHead, size = file.size();
+    const auto isAt = [&](qint64 from) {
+        bool isThere = from >= 0 && from + sound <= size;
+        for (qint64 at = 0; isThere && at < sound; at += piece) {
+            const qint64 count = std::min(piece, sound - at);
+            isThere = file.read(from + at, count) == copy.read(change.newHead + at, count);
+        }
+        return isThere;
+    };
+    return isAt(change.newHead) || isAt(change.oldHead) || isAt(size - sound) ||
+           isAt(size - sound - endTag);
+}
+
+// The copy is the only place where the sound stands for sure: it goes, once this is New, Old or
+// Foreign, and that needs a file with all of it.
 Mended mendFromCopy(const FileChange &change, const QByteArray &kept, SystemFile &file, bool back)
 {
     const SystemFile copy(change.other, SystemFile::Mode::Read);
-    const qint64 size = file.size();
-    if (copy.size() != change.newSize() || kept.size() != change.oldHead)
+    const qint64 before = change.before.size, after = change.newSize(), size = file.size();
+    if (copy.size() != after || kept.size() != change.oldHead)
         return Mended::NotNow;
-    if (size != change.before.size && size != change.newSize())
-        return Mended::Foreign;
-    const Progress progress = progressOf(file, copy, change, kept);
-    if (progress.hasOther && progress.hasNew && !back)
-        return Mended::NotNow; // begun, and then changed by somebody: nobody knows what is whole
-    if (!progress.hasNew && !(back && progress.hasOther)) {
-        if (!progress.hasOther)
-            file.resize(change.before.size);
+    const bool isBetween = size >= std::min(before, after) && size <= std::max(before, after);
+    const Progress progress = isBetween ? progressOf(file, copy, change, kept) : Progress();
+    if (!isBetween || (progress.hasOther && !back))
+        return hasSound(file, copy, change) ? Mended::Foreign : Mended::NotNow;
+    if (!progress.hasNew && !progress.hasOther && size >= before) {
+        file.resize(before);
         file.sync();
-        return progress.hasOther ? Mended::Foreign : Mended::Old;
+        return Mended::Old;
     }
     through(change, file);
     return Mended::New;
@@ -259,15 +277,14 @@ Mended mendFromCopy(const FileChange &change, const QByteArray &kept, SystemFile
 
 Mended mendThrough(const FileChange &change, const QByteArray &kept, bool back)
 {
+    if (!isThere(change.path) && isThere(change.other))
+        return Mended::NotNow; // it may have another name now
     SystemFile file(change.path, SystemFile::Mode::Write);
     if (isTaken(file, back))
         return Mended::NotNow;
-    Mended end = hasNewHead(file, change) ? Mended::New : Mended::Foreign;
     if (isThere(change.other))
-        end = mendFromCopy(change, kept, file, back);
-    if (end != Mended::NotNow)
-        ::unlink(nativeName(change.other).constData());
-    return end;
+        return mendFromCopy(change, kept, file, back);
+    return hasNewHead(file, change) ? Mended::New : Mended::Foreign;
 }
 
 // Not so where its medium is not there: the folder is then another one, or empty.
@@ -312,16 +329,11 @@ void prepareHead(const HeadChange &head, const SystemFile &file)
 {
     if (head.change.way != FileChange::Way::Through)
         return;
-    try {
-        SystemFile copy(head.change.other, SystemFile::Mode::Create);
-        writeNew(copy, head, file);
-        readBack(copy, head, file);
-        copy.sync();
-        requireUntouched(file, head.change.before);
-    } catch (...) {
-        ::unlink(nativeName(head.change.other).constData());
-        throw;
-    }
+    SystemFile copy(head.change.other, SystemFile::Mode::Create);
+    writeNew(copy, head, file);
+    readBack(copy, head, file);
+    copy.sync();
+    requireUntouched(file, head.change.before);
     if (!syncFolder(folderOf(head.change.other)))
         failWith(EIO, file);
 }

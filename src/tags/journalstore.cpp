@@ -101,6 +101,15 @@ std::optional<Entry> entryAt(Ahead &ahead, qint64 at, qint64 size)
     return Entry{words, qint64(head->bytes), bytesAt + qint64(head->bytes)};
 }
 
+// An entry that the end of the program or a full disk has cut off was never synced: nothing stands
+// on it.
+bool isCutOff(Ahead &ahead, qint64 at, qint64 size)
+{
+    const auto head = headIn(ahead.read(at, headSize));
+    const qint64 rest = size - at - headSize;
+    return rest < 0 || (head && (head->words > rest || head->bytes > quint64(rest - head->words)));
+}
+
 // Where the next entry may begin; the end where there is none.
 qint64 nextMark(Ahead &ahead, qint64 from, qint64 size)
 {
@@ -152,21 +161,24 @@ int JournalStore::lastNumber() const
     return last;
 }
 
-// False: not all of it.
-bool JournalStore::readPart(int part, const Reader &reader) const
+JournalStore::Condition JournalStore::readPart(int part, const Reader &reader) const
 {
     const SystemFile file(nameOf(part), SystemFile::Mode::Read);
     const qint64 size = file.size();
     Ahead ahead(file);
-    bool isWhole = true;
+    auto condition = Condition::Whole;
     for (qint64 at = 0; at < size;) {
         const auto entry = entryAt(ahead, at, size);
-        isWhole = isWhole && entry;
         if (entry)
             reader(entry->words, {part, at, entry->bytes});
-        at = entry ? entry->end : nextMark(ahead, at + 1, size);
+        const qint64 next = entry ? entry->end : nextMark(ahead, at + 1, size);
+        if (!entry && next == size && condition == Condition::Whole && isCutOff(ahead, at, size))
+            condition = Condition::CutOff;
+        else if (!entry)
+            condition = Condition::Damaged;
+        at = next;
     }
-    return isWhole;
+    return condition;
 }
 
 bool JournalStore::readAll(const Reader &reader) const
@@ -174,7 +186,7 @@ bool JournalStore::readAll(const Reader &reader) const
     bool isWhole = true;
     for (const auto &[part, size] : parts()) {
         try {
-            isWhole = readPart(part, reader) && isWhole;
+            isWhole = readPart(part, reader) != Condition::Damaged && isWhole;
         } catch (const Error &) { // the others are there
             isWhole = false;
         }
@@ -183,18 +195,20 @@ bool JournalStore::readAll(const Reader &reader) const
 }
 
 // Into a file that was not read whole nothing is written: what stands behind the damage is kept.
-void JournalStore::openLast(const Reader &reader)
+bool JournalStore::openLast(const Reader &reader)
 {
     const auto all = parts();
     if (all.empty())
-        return;
+        return true;
     mPart = all.rbegin()->first;
     mEnd = all.rbegin()->second;
+    auto condition = Condition::Damaged;
     try {
-        mIsDoubtful = !readPart(mPart, reader);
-    } catch (const Error &) {
-        mIsDoubtful = true;
+        condition = readPart(mPart, reader);
+    } catch (const Error &) { // so it is
     }
+    mIsDoubtful = condition != Condition::Whole;
+    return condition != Condition::Damaged;
 }
 
 void JournalStore::beginPart()
@@ -202,7 +216,6 @@ void JournalStore::beginPart()
     const bool isNew = !QFileInfo::exists(mFolder);
     if (isNew && !QDir().mkpath(mFolder))
         throw makeError(errFileFailed, mFolder);
-    const auto all = parts();
     const int part = lastNumber() + 1;
     mFile.reset();
     mFile.emplace(nameOf(part), SystemFile::Mode::Create);
@@ -212,16 +225,17 @@ void JournalStore::beginPart()
     syncFolder(mFolder);
     if (isNew)
         syncFolder(QFileInfo(mFolder).path());
-    removeOldest(all);
 }
 
-void JournalStore::removeOldest(const std::map<int, qint64> &all) const
+void JournalStore::begun()
 {
+    mBeginning = mEnd;
+    const auto all = parts();
     qint64 sum = 0;
     for (const auto &[part, size] : all)
         sum += size;
     for (auto oldest = all.begin(); oldest != all.end() && sum > mSizes.all; ++oldest) {
-        if (mKeptFrom && oldest->first >= *mKeptFrom)
+        if (oldest->first >= mKeptFrom.value_or(mPart))
             break;
         QFile::remove(nameOf(oldest->first));
         sum -= oldest->second;

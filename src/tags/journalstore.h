@@ -29,10 +29,11 @@ public:
     QString folder() const { return mFolder; }
 
     /// Tells what the entries of the last file say, oldest first. To be called before an append.
+    /// False: it could not be read, or not all of it.
     using Reader = std::function<void(const QByteArray &words, const Place &place)>;
-    void openLast(const Reader &reader);
+    bool openLast(const Reader &reader);
 
-    /// The same of all files. False: one could not be read, or not all of it.
+    /// The same of all files.
     bool readAll(const Reader &reader) const;
 
     Place append(const QByteArray &words, const QByteArray &bytes = {});
@@ -49,9 +50,9 @@ public:
     /// Whether it should: so much is in it, behind what it began with.
     bool isFull() const;
 
-    /// Begins a file. What is appended until begun() it begins with.
+    /// Begins a file. What is appended until begun() it begins with; then the oldest may go.
     void beginPart();
-    void begun() { mBeginning = mEnd; }
+    void begun();
 
     /// This file and those behind it do not go for want of room, as long as they are needed.
     void keepFrom(std::optional<int> part) { mKeptFrom = part; }
@@ -60,9 +61,9 @@ private:
     QString nameOf(int part) const;
     int lastNumber() const;
     std::map<int, qint64> parts() const; // sizes by number
-    bool readPart(int part, const Reader &reader) const;
+    enum class Condition { Whole, CutOff, Damaged };
+    Condition readPart(int part, const Reader &reader) const;
     void write(const QByteArray &entries);
-    void removeOldest(const std::map<int, qint64> &all) const;
 
     const QString mFolder;
     const JournalSizes mSizes;

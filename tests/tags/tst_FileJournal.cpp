@@ -272,6 +272,56 @@ private slots:
         }
     }
 
+    // The copy that a file goes through is then all that is left of the sound.
+    void aFileThatIsHalfWritten_data()
+    {
+        const DataRows<QString, bool> row("since", "isMended");
+        row("as it was left", "", true);
+        row("the folder of the journal was moved", "moved", true);
+        row("the journal was damaged", "flip", false);
+        row("another program wrote a byte", "byte", false);
+        row("another program made it longer", "longer", false);
+        row("another name", "named", false);
+    }
+    void aFileThatIsHalfWritten()
+    {
+        QFETCH(QString, since);
+        QFETCH(bool, isMended);
+        const QByteArray rest = QByteArray::number(rand()).repeated(50000);
+        const QString text(2000, u'n');
+        const auto half = [&] { return readFile(path(u"a"_s)).endsWith(rest) ? 0 : 1; };
+        for (int call = 1; call == 1 || !half(); ++call) {
+            QVERIFY(call < 60);
+            init();
+            writeFile(path(u"a"_s), before + rest);
+            link(u"a"_s, u"link"_s);
+            killedIn([&] { save(u"a"_s, text); }, call);
+        }
+        QString changes = path(u"Changes"_s);
+        if (since == "moved"_L1) {
+            QVERIFY(QFile::rename(changes, path(u"Moved"_s)));
+            changes = path(u"Moved"_s);
+        } else if (since == "flip"_L1) {
+            QByteArray bytes = readFile(changes + u"/changes-1"_s);
+            bytes[bytes.lastIndexOf("SCJ1") + 40] ^= 1; // of what was begun
+            writeFile(changes + u"/changes-1"_s, bytes);
+        } else if (since == "named"_L1) {
+            QVERIFY(QFile::rename(path(u"a"_s), path(u"b"_s)));
+        } else if (!since.isEmpty()) {
+            QFile file(path(u"a"_s));
+            QVERIFY(file.open(QIODevice::ReadWrite));
+            file.seek(since == "byte"_L1 ? 20 : file.size());
+            file.write("x");
+        }
+        mJournal = std::make_unique<FileJournal>(changes);
+        mJournal->mend();
+        const auto copies = QDir(changes).entryList({u"copy*"_s});
+        QCOMPARE(copies.size(), isMended ? 0 : 1);
+        QCOMPARE(half() == 0 && title(u"a"_s) == text, isMended);
+        if (!isMended && since != "flip"_L1 && since != "named"_L1)
+            QCOMPARE(numberOf([&] { save(u"a"_s, u"Other"_s); }), int(errTagNotAccessible));
+    }
+
     void oneFileTwiceInABatch()
     {
         make(u"a"_s);

@@ -63,6 +63,14 @@ FileLock::Outcome FileLock::take(const QString &file, int flags)
     return outcome;
 }
 
+bool FileLock::isOf(const QString &file) const
+{
+    struct stat held = {}, named = {};
+    return mHandle >= 0 && ::fstat(mHandle, &held) == 0 &&
+           ::stat(nativeName(file).constData(), &named) == 0 && held.st_dev == named.st_dev &&
+           held.st_ino == named.st_ino;
+}
+
 FileLock::Outcome FileLock::take(const QString &file)
 {
     return take(file, 0);

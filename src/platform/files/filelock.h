@@ -27,6 +27,9 @@ public:
     /// name that comes and goes can be locked by two. Waits for another to let go.
     Outcome takeWithin(const QString &lockFile, int milliseconds);
 
+    /// Whether it is taken, of the file that has this name now.
+    bool isOf(const QString &file) const;
+
     /// The same lock for a file that is open for writing already, until that is closed.
     static Outcome takeFor(int handle);
 
