@@ -15,7 +15,7 @@ namespace
 
 FileChanges::About aboutTags(const QString &where)
 {
-    return {Desktop::current().now(), GetMessage("xTagsOfFiles"), where};
+    return {Desktop::current().now(), u"xTagsOfFiles"_s, where};
 }
 
 const QString &firstOf(const QString &own, const QString &ofDisc)

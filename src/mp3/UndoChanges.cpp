@@ -51,13 +51,30 @@ QString namedOnce(const QString &left)
     return left;
 }
 
+// Batches keep the keys of texts, and are told in the language of now.
+constexpr QLatin1String undoKey("xUndoOf "), redoKey("xRedoOf ");
+
 // What takes an undo back does it again.
 QString undoOf(const QString &what)
 {
-    const QString undo = GetMessage("xUndoOf"), redo = GetMessage("xRedoOf");
-    if (what.startsWith(undo))
-        return redo + what.sliced(undo.size());
-    return undo + (what.startsWith(redo) ? what.sliced(redo.size()) : what);
+    if (what.startsWith(undoKey))
+        return redoKey + what.sliced(undoKey.size());
+    return undoKey + (what.startsWith(redoKey) ? what.sliced(redoKey.size()) : what);
+}
+
+bool isKey(const QString &text)
+{
+    return text.size() > 1 && text[0] == u'x' && text[1].isUpper() &&
+           std::all_of(text.begin(), text.end(), [](QChar c) { return c.isLetter(); });
+}
+
+QString told(const QString &what)
+{
+    for (const QLatin1String key : {undoKey, redoKey}) {
+        if (what.startsWith(key))
+            return GetMessage(key.chopped(1)) + told(what.sliced(key.size()));
+    }
+    return isKey(what) ? GetMessage(QLatin1String(what.toLatin1())) : what;
 }
 
 int filesOf(const std::vector<FileJournal::Batch> &batches)
@@ -131,7 +148,7 @@ void UndoChanges::showBatches()
     for (const FileJournal::Batch &batch : batches) {
         const QString cells[] = {QString::number(batch.number),
                                  shown(batch.when),
-                                 batch.what,
+                                 told(batch.what),
                                  batch.where,
                                  filesShown(batch),
                                  batch.isTakenBack ? GetMessage("xTakenBack") : QString()};
@@ -217,7 +234,7 @@ FileJournal::Undone UndoChanges::undoAll(const Batches &batches, LongWork &work)
                 all.left.append(namedOnce(left));
             all.moved.insert(all.moved.end(), one.moved.begin(), one.moved.end());
         } catch (const Error &error) {
-            all.left.append(batch.what + u": "_s + error.Description);
+            all.left.append(told(batch.what) + u": "_s + error.Description);
         }
         before += batch.files;
     }

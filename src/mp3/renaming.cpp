@@ -27,8 +27,7 @@ public:
         : mScreen(screen),
           mPlan(std::move(plan)),
           mRenamed(renamed),
-          mChanges(changedFiles(),
-                   {Desktop::current().now(), GetMessage("xRenameFiles"), mPlan.folder()})
+          mChanges(changedFiles(), {Desktop::current().now(), u"xRenameFiles"_s, mPlan.folder()})
     {
     }
 

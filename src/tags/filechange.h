@@ -31,8 +31,8 @@ struct FileChange {
 struct ChangeBatch {
     qint64 number = 0;
     QDateTime when;
-    QString what, where;
-    qint64 undoes = 0; // the batch that this one took back
+    QString what, where; // the key of a text; a folder or the name of a collection
+    qint64 undoes = 0;   // the batch that this one took back
 };
 
 QByteArray headChecksum(const QByteArray &head);

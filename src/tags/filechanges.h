@@ -11,7 +11,7 @@ class FileChanges
 public:
     struct About {
         QDateTime when;
-        QString what, where; // in the user's words; a folder or the name of a collection
+        QString what, where; // as in ChangeBatch
         qint64 undoes = 0;   // the batch that is taken back
     };
 

@@ -127,6 +127,17 @@ private slots:
             QVERIFY(list()->columnWidth(column) >= view->sizeHintForColumn(column));
     }
 
+    void whatWasDoneIsToldInTheLanguageOfNow()
+    {
+        change({u"a.mp3"_s, u"xRedoOf xRenameFiles"_s});
+        show();
+        QCOMPARE(list()->ListItems().Item(1).SubItems(2), u"Redo: Rename files"_s);
+        gLanguage = languageDutch;
+        mScreen->Unload();
+        show();
+        QCOMPARE(list()->ListItems().Item(1).SubItems(2), u"Opnieuw: Bestanden hernoemen"_s);
+    }
+
     void noneIsChosenOrWanted()
     {
         show();
