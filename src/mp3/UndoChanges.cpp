@@ -41,16 +41,6 @@ QString filesShown(const FileJournal::Batch &batch)
     return batch.files < 2 ? first : first + GetMessage("xAndMore").arg(batch.files - 1);
 }
 
-// "path: path: why" comes from a reason that names its file itself.
-QString namedOnce(const QString &left)
-{
-    for (auto end = left.indexOf(u": "_s); end >= 0; end = left.indexOf(u": "_s, end + 1)) {
-        if (left.sliced(end + 2).startsWith(left.first(end + 2)))
-            return left.sliced(end + 2);
-    }
-    return left;
-}
-
 // Batches keep the keys of texts, and are told in the language of now.
 constexpr QLatin1String undoKey("xUndoOf "), redoKey("xRedoOf ");
 
@@ -230,8 +220,7 @@ FileJournal::Undone UndoChanges::undoAll(const Batches &batches, LongWork &work)
                 batch.number, Desktop::current().now(), undoOf(batch.what),
                 [&](int done, int /*all*/) { return work.step(before + done, files); });
             all.files += one.files;
-            for (const QString &left : one.left)
-                all.left.append(namedOnce(left));
+            all.left += one.left;
             all.moved.insert(all.moved.end(), one.moved.begin(), one.moved.end());
         } catch (const Error &error) {
             all.left.append(told(batch.what) + u": "_s + error.Description);

@@ -103,7 +103,8 @@ bool Renaming::mayTake(const CollectionRow &row, const NewName &name) const
 
 // By design: a move that fails says nothing, and the row takes the new name; it shows as missing
 // when the list is read again. A name that the disk cannot have is told, and leaves the row; so is
-// one that another file keeps, and that the move could not be taken back, which ends all.
+// one that another file keeps, a file that a crash has left and that could not be put right yet,
+// and that the move could not be taken back, which ends all.
 bool Renaming::move(const NewName &name, const Over &over)
 {
     try {
@@ -111,9 +112,10 @@ bool Renaming::move(const NewName &name, const Over &over)
     } catch (const Error &error) {
         mIsStopped = error.Number == errChangeNotKept;
         const bool isRefused = error.Number == errNameRefused;
+        const bool isKept = error.Number == errNotReplaced || error.Number == errTagNotAccessible;
         if (mIsStopped)
             errorBox(error.Description);
-        else if (isRefused || error.Number == errNotReplaced)
+        else if (isRefused || isKept)
             errorBox(name.name + u": "_s +
                      (isRefused ? GetMessage("xNameLetterRefused") : error.Description));
         else

@@ -139,8 +139,9 @@ FileJournal::Undone ChangeUndo::run(const ChangeBatch &about,
                 undone.moved.emplace_back(before, change.path);
         } catch (const Error &error) {
             const bool isMove = change.way == FileChange::Way::Move;
-            undone.left.append((isMove ? before : now(change.path, *all[i]).name) + u": "_s +
-                               error.Description);
+            const QString name = (isMove ? before : now(change.path, *all[i]).name) + u": "_s;
+            const bool isNamed = error.Description.startsWith(name); // by the system's own words
+            undone.left.append(isNamed ? error.Description : name + error.Description);
         }
     }
     return undone;

@@ -95,8 +95,8 @@ void FileChanges::tell(HeadChange &head, const SystemFile &file)
                        mJournal.copyName().section(u'-', -2) + ".tmp"_L1;
     if (change.way == FileChange::Way::Through)
         change.other = mJournal.copyName();
+    prepareHead(head, file);
     try {
-        prepareHead(head, file);
         mJournal.announce(change, head.kept());
     } catch (const Error &) {
         if (change.way == FileChange::Way::Through)
@@ -274,6 +274,8 @@ void FileChanges::move(const QString &from, const QString &to, const std::option
         mJournal.announce(change, {});
         mJournal.sync();
     } catch (const Error &error) {
+        if (error.Number == errTagNotAccessible)
+            throw;
         throw Error(errChangeNotKept, error.Source, error.Description);
     }
     try {

@@ -209,7 +209,7 @@ QByteArray oldPiece(const FileChange &change, const QByteArray &kept, const Syst
 }
 
 struct Progress {
-    bool hasOld = false, hasNew = false, hasOther = false; // sectors that are that alone
+    bool hasNew = false, hasOther = false; // sectors that are new and not old, or neither
 };
 
 // The sectors of the file beside those of the old and of the new one.
@@ -228,7 +228,6 @@ Progress progressOf(const SystemFile &file, const SystemFile &copy, const FileCh
                 return QByteArrayView(now).sliced(i, count) == bytes.sliced(i, count);
             };
             const bool isOld = is(before), isNew = is(after);
-            progress.hasOld |= isOld && !isNew;
             progress.hasNew |= isNew && !isOld;
             progress.hasOther |= !isNew && !isOld;
         }
@@ -330,12 +329,17 @@ void prepareHead(const HeadChange &head, const SystemFile &file)
     if (head.change.way != FileChange::Way::Through)
         return;
     SystemFile copy(head.change.other, SystemFile::Mode::Create);
-    writeNew(copy, head, file);
-    readBack(copy, head, file);
-    copy.sync();
-    requireUntouched(file, head.change.before);
-    if (!syncFolder(folderOf(head.change.other)))
-        failWith(EIO, file);
+    try {
+        writeNew(copy, head, file);
+        readBack(copy, head, file);
+        copy.sync();
+        requireUntouched(file, head.change.before);
+        if (!syncFolder(folderOf(head.change.other)))
+            failWith(EIO, file);
+    } catch (...) {
+        ::unlink(nativeName(head.change.other).constData());
+        throw;
+    }
 }
 
 void performHead(const HeadChange &head, SystemFile &file)

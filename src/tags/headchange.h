@@ -24,7 +24,7 @@ HeadChange plannedHead(const SystemFile &file, const FileStamp &before, const QB
                        const QByteArray &newHead);
 
 /// For a change that goes Through: writes the copy of the new file, synced, before the journal is
-/// told. Where it throws a piece of it may be left.
+/// told.
 void prepareHead(const HeadChange &head, const SystemFile &file);
 
 /// Throws Error; mendHead() tells then what has become of the file. A Beside that finds it cannot
